@@ -1,0 +1,153 @@
+# Functions for scripts that run inside the lab: . "$LAB_DIR/lib.sh"
+# State of interface X is under /run/lab/X; an access point's radio lives in the
+# network namespace ap-X, so that only the air joins it to the station.
+
+phy_of() { cat "/sys/class/net/$1/phy80211/name"; }
+in_ap() { local dev=$1; shift; ip netns exec "ap-$dev" "$@"; }
+
+# wait_for SECONDS COMMAND...: until the command succeeds.
+wait_for() {
+    local end=$((SECONDS + $1)); shift
+    until "$@" > /dev/null 2>&1; do [ $SECONDS -lt $end ] || return 1; sleep 0.1; done
+}
+
+# fresh_radios N: N new radios, wlan0..., in a kernel that remembers no regulatory domain and no scan result.
+# A radio comes back from a finished network namespace only a moment later.
+no_radios() {
+    [ -d /sys/module/mac80211_hwsim ] || return 0
+    wait_for 10 modprobe -r mac80211_hwsim && wait_for 5 modprobe -r mac80211 cfg80211
+}
+fresh_radios() {
+    no_radios || return 1
+    [ "$1" = 0 ] && { modprobe cfg80211; return; }
+    # Without that option hwsim's radios under Debian's kernel scan 6 GHz too, see README.
+    local options=''; [ "$LAB_BACK" = uml ] || options=regtest=5
+    # shellcheck disable=SC2086
+    modprobe mac80211_hwsim radios="$1" $options && wait_for 5 test -e "/sys/class/net/wlan$(($1 - 1))"
+}
+
+# country CC: sets the regulatory domain and waits for it.
+is_country() { iw reg get | grep -q "^country $1"; }
+country() { iw reg set "$1"; wait_for 5 is_country "$1"; }
+
+# ap X ADDRESS/24|- < hostapd.conf: starts hostapd on X (give neither interface
+# nor driver) and, with an address, dnsmasq there: DHCP, and DNS answering that
+# address for every name.
+ap() {
+    local dev=$1 addr=$2 dir=/run/lab/$1 ns=ap-$1
+    mkdir -p "$dir"
+    { echo "interface=$dev"; echo driver=nl80211; echo "ctrl_interface=$dir/ctl"; cat; } > "$dir/hostapd.conf"
+    if ! ip netns list | grep -qw "$ns"; then
+        ip netns add "$ns"; ip -n "$ns" link set lo up
+        iw phy "$(phy_of "$dev")" set netns name "$ns"
+    fi
+    in_ap "$dev" hostapd -B -f "$dir/hostapd.log" -P "$dir/hostapd.pid" "$dir/hostapd.conf" > "$dir/hostapd.out" 2>&1 &&
+        wait_for "${AP_WAIT:-10}" grep -q AP-ENABLED "$dir/hostapd.log" ||
+        { echo "ap $dev did not start:"; cat "$dir/hostapd.out" "$dir/hostapd.log" | tail -n 8; return 1; }
+    [ "$addr" = - ] && return
+    ip -n "$ns" addr replace "$addr" dev "$dev"
+    local net=${addr%.*}
+    in_ap "$dev" dnsmasq --interface="$dev" --bind-interfaces --no-resolv --no-hosts --conf-file=/dev/null \
+        --dhcp-range="$net.50,$net.99,1h" --dhcp-leasefile="$dir/leases" --address="/#/${addr%/*}" \
+        --pid-file="$dir/dnsmasq.pid" --log-facility="$dir/dnsmasq.log" --log-dhcp --user=root
+}
+
+# ap_down X: stops what ap started; the radio stays in its namespace.
+ap_down() {
+    local f
+    for f in dnsmasq hostapd; do
+        [ ! -e "/run/lab/$1/$f.pid" ] || kill "$(cat "/run/lab/$1/$f.pid")" 2>/dev/null
+    done
+    wait_for 5 test ! -e "/run/lab/$1/hostapd.pid"; : > "/run/lab/$1/hostapd.log"
+}
+
+# ap_up_again X: after `rfkill block wifi`, which blocks every namespace's radios.
+ap_up_again() { wait_for 5 ip -n "ap-$1" link set "$1" up; }
+
+# sta X < network blocks: starts wpa_supplicant on X. sta_up X waits for it to
+# be associated and authorised; sta_down X stops it.
+sta() {
+    local dir=/run/lab/$1
+    mkdir -p "$dir"
+    { echo 'ctrl_interface=/run/wpa_supplicant'; cat; } > "$dir/wpa.conf"
+    wpa_supplicant -B -i "$1" -D nl80211 -c "$dir/wpa.conf" -f "$dir/wpa.log" -P "$dir/wpa.pid" > "$dir/wpa.out" 2>&1
+}
+sta_is_up() { wpa_cli -i "$1" status | grep -q wpa_state=COMPLETED; }
+sta_up() { wait_for "${2:-20}" sta_is_up "$1"; }
+sta_down() { wpa_cli -i "$1" terminate > /dev/null 2>&1; wait_for 5 test ! -e "/run/lab/$1/wpa.pid"; ip addr flush dev "$1"; }
+
+# enterprise_files: the users and the certificate that an access point with WPA-EAP needs (user / secret).
+enterprise_files() {
+    mkdir -p /run/lab
+    printf '%s\n' '"user" PEAP' '"user" MSCHAPV2 "secret" [2]' > /run/lab/users
+    openssl req -x509 -newkey rsa:2048 -nodes -subj /CN=lab -days 3650 \
+        -keyout /run/lab/key.pem -out /run/lab/ca.pem 2> /dev/null
+}
+
+# dhcp X: asks for an address once.
+dhcp() {
+    local dir=/run/lab/$1
+    mkdir -p "$dir"
+    cat > "$dir/udhcpc" <<'S'
+#!/bin/sh
+[ "$1" = bound ] || exit 0
+ip addr replace "$ip/$mask" dev "$interface"
+[ -z "$router" ] || ip route replace default via "$router" dev "$interface"
+[ -z "$dns" ] || { rm -f /etc/resolv.conf; for d in $dns; do echo "nameserver $d"; done > /etc/resolv.conf; }
+S
+    chmod +x "$dir/udhcpc"
+    busybox udhcpc -i "$1" -n -q -t 5 -s "$dir/udhcpc" > "$dir/udhcpc.log" 2>&1
+}
+
+# scan X [iw scan arguments]: a fresh scan, retried while the radio is busy.
+scan() {
+    local dev=$1 i; shift
+    ip link set "$dev" up
+    for i in 1 2 3 4 5; do iw dev "$dev" scan "$@" 2>/dev/null && return; sleep 0.5; done
+    return 1
+}
+
+# network_manager X: D-Bus, wpa_supplicant and NetworkManager, for interface X
+# only. There is no udev here: NetworkManager does without it where /sys is
+# read-only.
+nm_ready() { nmcli -t -f STATE general | grep -qv '^unknown' && nmcli -t -f DEVICE,STATE device | grep -q "^$1:\(disconnected\|conn\)"; }
+network_manager() {
+    mkdir -p /run/dbus /run/lab /etc/NetworkManager/conf.d
+    [ -s /etc/machine-id ] || dbus-uuidgen > /etc/machine-id
+    dbus-daemon --system --fork
+    printf '%s\n' '[main]' 'plugins=keyfile' 'dhcp=internal' 'auth-polkit=false' 'rc-manager=file' \
+        '[keyfile]' "unmanaged-devices=*,except:interface-name:$1" \
+        '[connectivity]' 'enabled=false' > /etc/NetworkManager/NetworkManager.conf
+    wpa_supplicant -B -u -f /run/lab/wpa-dbus.log > /dev/null
+    unshare -m sh -c 'mount -o remount,bind,ro /sys; exec NetworkManager --log-level=INFO' > /run/lab/nm.log 2>&1
+    wait_for 20 nm_ready "$1" || { tail -n 20 /run/lab/nm.log; return 1; }
+}
+
+# signal X DBM: the strength (-1 to -100) at which access point X is heard by
+# all: the simulated strength is rx_rssi, which takes only unsigned numbers, plus
+# the transmit power, here set to 0.
+signal() {
+    local phy; phy=phy$(in_ap "$1" iw dev "$1" info | sed -n 's/.*wiphy //p')
+    in_ap "$1" iw dev "$1" set txpower fixed 0
+    printf '%u\n' "$2" > "/sys/kernel/debug/ieee80211/$phy/hwsim/rx_rssi"
+}
+
+# portal X: a captive portal on access point X: every name leads to it (see ap),
+# and every page redirects to its login page. Needs python3.
+portal() {
+    local addr; addr=$(ip -n "ap-$1" -4 -o addr show dev "$1" | sed 's,.*inet \([0-9.]*\)/.*,\1,')
+    in_ap "$1" python3 - "$addr" > "/run/lab/$1/portal.log" 2>&1 <<'P' &
+import http.server, sys
+host = sys.argv[1]
+class Portal(http.server.BaseHTTPRequestHandler):
+    def do_GET(self):
+        login = self.path == '/login'
+        self.send_response(200 if login else 302)
+        if not login:
+            self.send_header('Location', 'http://%s/login' % host)
+        self.end_headers()
+        self.wfile.write(b'<html>log in</html>' if login else b'')
+http.server.ThreadingHTTPServer((host, 80), Portal).serve_forever()
+P
+    wait_for 10 in_ap "$1" busybox wget -q -O /dev/null "http://$addr/login"
+}

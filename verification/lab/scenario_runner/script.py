@@ -1,0 +1,62 @@
+"""Turns a scenario into the bash script that sets it up inside the lab's machine and runs the program there."""
+
+import shlex
+
+from .description import Scenario
+
+
+def _here_document(lines: list[str]) -> str:
+    return "<<'LINES'\n" + "\n".join(lines) + "\nLINES\n"
+
+
+def _ap(arguments: list[str], lines: list[str]) -> str:
+    device = arguments[0]
+    address = arguments[1] if len(arguments) > 1 else "-"
+    return f"ap {device} {address} {_here_document(lines)}"
+
+
+def _station(scenario: Scenario, arguments: list[str], lines: list[str]) -> str:
+    device = arguments[0]
+    text = f"sta {device} " + _here_document(["network={", *lines, "}"])
+    text += f"sta_up {device} 30 || {{ echo '{device} did not join:'; tail -n 5 /run/lab/{device}/wpa.log; false; }}\n"
+    if scenario.headers.get("address", "dhcp") == "dhcp":
+        text += f"dhcp {device} || {{ echo '{device} got no address'; false; }}\n"
+    return text
+
+
+def set_up(scenario: Scenario) -> str:
+    """The set-up alone: stops with a message at the first step that fails."""
+    text = '. "$LAB_DIR/lib.sh"\n'
+    text += "trap 'echo \"set-up failed at: $BASH_COMMAND\"; exit 99' ERR\nset -E\n"
+    text += f"fresh_radios {scenario.radios()}\n"
+    text += f"country {scenario.headers.get('country', 'US')}\n" if scenario.radios() else ""
+    for kind, arguments, lines in scenario.steps:
+        if kind == "ap":
+            text += _ap(arguments, lines)
+        elif kind == "station":
+            text += _station(scenario, arguments, lines)
+        else:
+            text += "\n".join(lines) + "\n"
+    return text + "trap - ERR\n"
+
+
+def run(scenario: Scenario, program: str, out: str) -> str:
+    """Runs the program as the scenario's user; leaves result, log and exit status beside `out`."""
+    command = [program, "run", "--screen", "none", *scenario.arguments]
+    user = scenario.headers.get("user")
+    if user:
+        command = ["setpriv", f"--reuid={user}", "--regid=nogroup", "--clear-groups", "env", "HOME=/tmp", *command]
+    return f"timeout 120 {shlex.join(command)} > {out}.json 2> {out}.log\necho $? > {out}.exit\n"
+
+
+def check_air(out: str) -> str:
+    """What iw sees of the set-up: beacons first, since a probe response has no DTIM period and names a hidden network."""
+    return (
+        "scan wlan0 flush passive > /dev/null; scan wlan0 passive > /dev/null\n"
+        f"{{ iw dev wlan0 scan dump -b; iw dev wlan0 link; iw reg get; ip -br addr show dev wlan0; }} > {out}.air 2>&1\n"
+        f"echo 0 > {out}.exit\n"
+    )
+
+
+def instead(command: str, out: str) -> str:
+    return f"SCENARIO_OUT={shlex.quote(out)}; export SCENARIO_OUT\n{command}\necho $? > {out}.exit\n"
