@@ -1,0 +1,360 @@
+#pragma once
+
+#include <atomic>
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "lifecycle/wifi_profile_inputs.h"
+#include "platform/diagnostic.h"
+#include "platform/diagnostics.h"
+#include "platform/extension.h"
+#include "platform/records.h"
+#include "platform/synchronized.h"
+#include "platform/wifi_manager.h"
+
+namespace wp {
+
+struct TestRow;
+
+/// The controller of the Wi-Fi diagnostic: one object lives for one run and owns all of its state.
+///
+/// A run: the host hands over the inputs (`setupWithInputs`) and starts it (`start`). Without the network
+/// list the tests begin at once; with it the Wi-Fi manager is asked for power, the list of networks is shown,
+/// and the tests begin when the user has confirmed one (`runTests`). The tests are one block on the
+/// background queue: the device, then the network that the device is joined to, then the selected network,
+/// one request after the other. Half a second after the last one the run ends with its status code and the
+/// result document
+/// (`endTestWithStatusCode`), and the host tears it down.
+///
+/// Threads. *Main*: the host's calls, alerts and rows, power callbacks, every view. *Background*: the block
+/// of the tests and the scans of the list. What both sides touch is atomic or a `Synchronized` value; a
+/// result section synchronises inside itself. Blocks keep the controller alive.
+///
+/// Failures are never exceptions. A test that fails writes one log line and leaves its keys unset, and the
+/// next one runs; only the conditions behind the status codes end a run.
+///
+/// Contents                                              source
+///   1. Life of a run                                    lifecycle/run.cpp
+///   2. Wi-Fi power                                      lifecycle/wifi_power.cpp
+///   3. Phases and result document                       lifecycle/phases.cpp
+///   4. Progress screen                                  lifecycle/progress_screen.cpp
+///   5. Test invocation                                  tests/test_invocation.cpp
+///   6. Device configuration tests                       tests/device_configuration_tests.cpp
+///   7. Current-network tests: properties                tests/network_property_tests.cpp
+///   8. Current-network tests: connectivity              tests/connectivity_tests.cpp
+///   9. Current-network tests: channel, signal, scan     tests/channel_tests.cpp
+///  10. Selected-network tests                           tests/selected_network_tests.cpp
+///  11. Network list                                     network_list/
+class WiFiProfileViewController final : public DiagnosticViewController {
+  public:
+    using Configuration = const DictionaryPointer&;
+    using Results = const DictionaryPointer&;
+
+    /// *Main*. The platform outlives the controller and every block of it.
+    explicit WiFiProfileViewController(Platform& platform) : platform_(platform) {}
+
+    // 1. Life of a run -- lifecycle/run.cpp
+    // ------------------------------------------------------------------
+
+    /// Keeps the inputs and makes the run's state: counters at 0, the configurations that do not depend on
+    /// the selection, three empty result sections. *Main*; the responder is not used.
+    void setupWithInputs(std::shared_ptr<DiagnosticInputs> inputs, DiagnosticResponder* responder) override;
+
+    /// Begins the run: straight with the tests, or with the list of networks; then builds the screen. *Main*.
+    void start() override;
+
+    /// Cleans up; the result is left as it is. *Main*.
+    void teardown() override;
+
+    /// Asks the service which network the device is joined to and keeps the answer as `wifiStatus`. When the
+    /// query fails it logs that and leaves `wifiStatus` as it was; an answer without a status makes it
+    /// absent. *Any* thread; blocks.
+    void determineCurrentNetwork();
+
+    /// What a "next" button calls: `runTests`. *Main*; the sender is ignored.
+    void nextTapped(const void* sender);
+
+    /// Shows the progress screen and submits the test run to the background queue. Does nothing while a test
+    /// run is under way or once the run is over. *Main*.
+    void runTests();
+
+    /// Ends the run: cleans up, seals the result with the code and the live result sections, and marks the
+    /// run finished. The first call counts; a later one does nothing. *Any* thread.
+    ///
+    /// 0 completed; -2 no Wi-Fi manager client; -3 no Wi-Fi device; -4 Wi-Fi off and the user declined to
+    /// turn it on; -5 Wi-Fi went off while the list was in use; -6, -7 the current, the selected network asks
+    /// by its name ("_nomap") not to be measured (-7 wins).
+    void endTestWithStatusCode(int statusCode);
+
+    /// Cancels the service's outstanding requests and releases the Wi-Fi handles, the power callback first.
+    /// Calling it again is harmless. *Any* thread.
+    void cleanUp();
+
+    /// Tells the host that the run is over. *Any* thread.
+    void finishTest();
+
+    const std::shared_ptr<WiFiProfileInputs>& inputs() const { return inputs_; }
+    /// {"MaxScanCacheAge": the inputs' value}; for every test of the current network.
+    const DictionaryPointer& currentNetworkConfiguration() const { return currentNetworkConfiguration_; }
+    /// {"MaxScanCacheAge": 0}; for the list's scans.
+    const DictionaryPointer& freshScanConfiguration() const { return freshScanConfiguration_; }
+    /// {"MaxScanCacheAge", "NetworkName": the selected name}, or the very `currentNetworkConfiguration` when
+    /// none is selected; for the device's and the selected network's tests. Null before the tests begin.
+    const DictionaryPointer& configuration() const { return configuration_; }
+    /// The network that the device is joined to, as the last successful query told; null before one.
+    WiFiStatusPointer wifiStatus() const { return wifiStatus_.get(); }
+    void setWifiStatus(WiFiStatusPointer status) { wifiStatus_.set(std::move(status)); }
+
+    // 2. Wi-Fi power -- lifecycle/wifi_power.cpp
+    // -------------------------------------------------------------
+
+    /// Gets the Wi-Fi manager client, its first device and the power state, and registers for power changes
+    /// on the caller's run loop. Without a client or a device it logs that, ends the run (-2, -3) and returns
+    /// false. *Main*.
+    bool setupWiFi();
+
+    /// Asks the user to turn Wi-Fi on. *Main*.
+    void presentWiFiPoweredOffAlert();
+
+    /// Wi-Fi power has changed: off ends the run (-5), on shows the list. Does nothing without a manager or
+    /// once the run is over. *Main*.
+    void powerChanged();
+
+    bool wifiPoweredOn() const { return wifiPoweredOn_; }
+
+    // 3. Phases and result document -- lifecycle/phases.cpp
+    // --------------------------------------------------
+
+    /// Each runs the tests of its phase in their fixed order, each followed by `updateProgress`, and never
+    /// stops early. *Background*; blocks.
+    void runDeviceConfigurationDiagnosticsTests();
+    void runCurrentNetworkDiagnosticsTests();
+    void runSelectedNetworkDiagnosticsTests();
+
+    /// The date as ISO 8601 text in UTC. *Any* thread.
+    std::string timestampFormattedInISO8601(Date date) const;
+
+    /// The result sections, empty at set-up, filled by the tests, part of the result document as they are.
+    const DictionaryPointer& deviceData() const { return deviceData_; }
+    const DictionaryPointer& currentNetworkData() const { return currentNetworkData_; }
+    const DictionaryPointer& selectedNetworkData() const { return selectedNetworkData_; }
+
+    // 4. Progress screen -- lifecycle/progress_screen.cpp
+    // ----------------------------------------------------
+
+    /// Turns the screen into the progress screen. *Main*; before the views exist it changes nothing visible.
+    void showProgress();
+
+    /// Counts one more test as done and lets the bar follow on the main queue. *Any* thread; returns at once.
+    void updateProgress();
+
+    bool progressScreenVisible() const { return progressScreenVisible_; }
+    /// Tests done so far, and tests that this run performs: 11, 27, 40 or 56. *Any* thread.
+    std::int32_t completedTests() const { return completedTests_; }
+    std::int32_t totalTests() const { return totalTests_; }
+
+    // 5. Test invocation -- tests/test_invocation.cpp
+    // --------------------------------------------------------
+
+    /// The first of the results; null, and a log line that says why, when there is none. *Any* thread.
+    DiagnosticsTestResultPointer testResultFromResults(
+        const std::optional<DiagnosticsTestResults>& results) const;
+
+    // 6. Device configuration tests -- tests/device_configuration_tests.cpp
+    // ---------------------------------- Each asks the service for one test with `configuration` and writes
+    // `deviceData`. *Background*; blocks.
+
+    void runDeviceConfigurationCustomIPv4();
+    void runDeviceConfigurationCustomIPv6();
+    void runDeviceConfigurationCustomDNS();
+    void runDeviceConfigurationCustomWebProxy();
+    void runDeviceConfigurationHalvoRealTimeMode();
+    void runDeviceConfigurationBluetoothConnected();
+    void runDeviceConfigurationBluetoothPaired();
+    void runDeviceConfigurationBTCoex();
+    void runDeviceConfigurationLargePNL();
+    void runDeviceConfigurationPNLContainsHidden();
+    void runDeviceConfigurationConflictingSecurityTypeInPNL();
+
+    // 7. Current-network tests: properties -- tests/network_property_tests.cpp
+    // ------------------------------- Each asks the service for one test with the configuration given and
+    // writes only the dictionary given, so that it serves the current and the selected network alike.
+    // *Background*; blocks.
+
+    void runCurrentNetworkDetectDoubleNATWithConfiguration(Configuration configuration,
+                                                           Results resultsDictionary);
+    void runCurrentNetworkLongBeaconIntervalWithConfiguration(Configuration configuration,
+                                                              Results resultsDictionary);
+    void runCurrentNetworkLongDTIMIntervalWithConfiguration(Configuration configuration,
+                                                            Results resultsDictionary);
+    void runCurrentNetworkNoSecurityWithConfiguration(Configuration configuration, Results resultsDictionary);
+    void runCurrentNetworkLegacySecurityWEPWithConfiguration(Configuration configuration,
+                                                             Results resultsDictionary);
+    void runCurrentNetworkLegacySecurityWPAWithConfiguration(Configuration configuration,
+                                                             Results resultsDictionary);
+    void runCurrentNetworkLegacyRates11bWithConfiguration(Configuration configuration,
+                                                          Results resultsDictionary);
+    void runCurrentNetworkAmbiguousNetworkNameWithConfiguration(Configuration configuration,
+                                                                Results resultsDictionary);
+    void runCurrentNetworkHiddenNetworkWithConfiguration(Configuration configuration,
+                                                         Results resultsDictionary);
+    void runCurrentNetworkPyloPersonalHotspotWithConfiguration(Configuration configuration,
+                                                               Results resultsDictionary);
+    void runCurrentNetworkCaptivePortalWithConfiguration(Configuration configuration,
+                                                         Results resultsDictionary);
+    void runCurrentNetworkPasspointWithConfiguration(Configuration configuration, Results resultsDictionary);
+    void runCurrentNetworkConflictingPHYMode11ACWithConfiguration(Configuration configuration,
+                                                                  Results resultsDictionary);
+    void runCurrentNetworkConflictingPHYMode11NWithConfiguration(Configuration configuration,
+                                                                 Results resultsDictionary);
+    void runCurrentNetworkMarlixBaseStationWithConfiguration(Configuration configuration,
+                                                             Results resultsDictionary);
+
+    // 8. Current-network tests: connectivity -- tests/connectivity_tests.cpp
+    // --------------------------------- As in section 7, for the current network only.
+
+    void runCurrentNetworkPingLANWithConfiguration(Configuration configuration, Results resultsDictionary);
+    void runCurrentNetworkPingWANWithConfiguration(Configuration configuration, Results resultsDictionary);
+    void runCurrentNetworkIPv4AssignedWithConfiguration(Configuration configuration,
+                                                        Results resultsDictionary);
+    void runCurrentNetworkIPv6AssignedWithConfiguration(Configuration configuration,
+                                                        Results resultsDictionary);
+    void runCurrentNetworkResolveDNSWithConfiguration(Configuration configuration, Results resultsDictionary);
+    void runCurrentNetworkReachVantorWithConfiguration(Configuration configuration,
+                                                       Results resultsDictionary);
+    void runCurrentNetworkRetrieveVantorWithConfiguration(Configuration configuration,
+                                                          Results resultsDictionary);
+
+    // 9. Current-network tests: channel, signal, scan -- tests/channel_tests.cpp
+    // ----------------------------- As in section 7. The no-scan-results test is the list's: it is no part of
+    // the current-network phase.
+
+    void runCurrentNetworkCongestedChannelWithConfiguration(Configuration configuration,
+                                                            Results resultsDictionary);
+    void runCurrentNetworkCongested2GHzWithConfiguration(Configuration configuration,
+                                                         Results resultsDictionary);
+    void runCurrentNetworkCongested5GHzWithConfiguration(Configuration configuration,
+                                                         Results resultsDictionary);
+    void runCurrentNetworkHT402GHzChannelWithConfiguration(Configuration configuration,
+                                                           Results resultsDictionary);
+    void runCurrentNetworkConflictingCountryCodeWithConfiguration(Configuration configuration,
+                                                                  Results resultsDictionary);
+    void runCurrentNetworkPoorSignalWithConfiguration(Configuration configuration, Results resultsDictionary);
+    void runCurrentNetworkNoScanResultsWithConfiguration(Configuration configuration,
+                                                         Results resultsDictionary);
+    void runCurrentNetworkHiddenScanResultsWithConfiguration(Configuration configuration,
+                                                             Results resultsDictionary);
+
+    /// The list of `WiFiScanResult` of the latest scan that passed, the very array that the service
+    /// delivered; null before one, and after one that passed without a list. *Any* thread.
+    ArrayPointer wifiScanResults() const { return wifiScanResults_.get(); }
+    void setWifiScanResults(ArrayPointer results) { wifiScanResults_.set(std::move(results)); }
+
+    // 10. Selected-network tests -- tests/selected_network_tests.cpp
+    // ----------------------------------------- Each calls the current-network test of its name with
+    // `configuration` and `selectedNetworkData`.
+
+    void runSelectedNetworkLongBeaconInterval();
+    void runSelectedNetworkNoSecurity();
+    void runSelectedNetworkLegacySecurityWEP();
+    void runSelectedNetworkLegacySecurityWPA();
+    void runSelectedNetworkLegacyRates11b();
+    void runSelectedNetworkAmbiguousNetworkName();
+    void runSelectedNetworkHiddenNetwork();
+    void runSelectedNetworkPyloPersonalHotspot();
+    void runSelectedNetworkCaptivePortal();
+    void runSelectedNetworkPasspoint();
+    void runSelectedNetworkConflictingPHYMode11AC();
+    void runSelectedNetworkConflictingPHYMode11N();
+    void runSelectedNetworkMarlixBaseStation();
+    void runSelectedNetworkCongestedChannel();
+    void runSelectedNetworkConflictingCountryCode();
+    void runSelectedNetworkPoorSignal();
+
+    // 11. Network list -- network_list/
+    // ----------------------------------------------------------------------
+
+    /// Marks a scan as under way, and as done.
+    void showSpinner();
+    void hideSpinner();
+    /// Runs the first scan in the background and shows the list. *Main*; returns at once.
+    void displayNetworkList();
+    /// Builds the screen's views. *Main*.
+    void setupViewWithNetworkList(bool withNetworkList);
+
+    bool scanFinished() const { return scanFinished_; }
+    bool refreshEnabled() const { return refreshEnabled_; }
+
+  private:
+    /// The controller as a block keeps it.
+    std::shared_ptr<WiFiProfileViewController> self();
+
+    // 1. Life of a run
+    /// What the test run does beyond the device's tests, and the code with which it ends.
+    struct Scope {
+        std::optional<std::string> selectedName;
+        bool runsCurrent = false;
+        bool runsSelected = false;
+        int statusCode = 0;
+    };
+    std::optional<std::string> currentNetworkName() const;
+    Scope determineScope() const;
+    DictionaryPointer makeConfiguration(const Scope& scope) const;
+    void performTestRun();
+
+    Platform& platform_;
+    std::shared_ptr<WiFiProfileInputs> inputs_;
+    DictionaryPointer currentNetworkConfiguration_;
+    DictionaryPointer freshScanConfiguration_;
+    DictionaryPointer configuration_;
+    Synchronized<WiFiStatusPointer> wifiStatus_;
+    std::atomic<bool> testRunStarted_ = false;
+    std::atomic<bool> ended_ = false;
+
+    // 2. Wi-Fi power
+    bool obtainDevice(WiFiManagerClient& manager);
+    void logWiFiManagerError(std::string_view message) const;
+
+    Synchronized<std::shared_ptr<WiFiManagerClient>> manager_;
+    Synchronized<std::shared_ptr<WiFiDeviceClient>> device_;
+    std::atomic<bool> wifiPoweredOn_ = false;
+
+    // 3. Phases and result document
+    static std::int32_t testCount(const Scope& scope);
+
+    DictionaryPointer deviceData_;
+    DictionaryPointer currentNetworkData_;
+    DictionaryPointer selectedNetworkData_;
+
+    // 4. Progress screen
+    std::atomic<std::int32_t> completedTests_ = 0;
+    std::atomic<std::int32_t> totalTests_ = 0;
+    bool progressScreenVisible_ = false;
+
+    // 5. Test invocation
+    DiagnosticsTestResultPointer resultOfTest(const TestRow& row, Configuration configuration) const;
+    DictionaryPointer infoOfResult(const TestRow& row, const DiagnosticsTestResult& result) const;
+    DictionaryPointer infoOfTest(const TestRow& row, Configuration configuration, Results results) const;
+    std::optional<Value> infoValue(const Dictionary& info, std::string_view key,
+                                   std::string_view missingName) const;
+    void storeInfoValue(const TestRow& row, const Dictionary& info, Results results) const;
+    void runTest(const TestRow& row, Configuration configuration, Results results) const;
+    void logTestError(std::string_view subject, std::string_view what) const;
+    void logTestError(std::string_view subject, const Error& error) const;
+
+    // 8. Current-network tests: connectivity
+    void runPing(const TestRow& row, Configuration configuration, Results results) const;
+
+    // 9. Current-network tests: channel, signal, scan
+    Synchronized<ArrayPointer> wifiScanResults_;
+
+    // 11. Network list
+    std::atomic<bool> scanFinished_ = false;
+    bool refreshEnabled_ = false;
+};
+
+}  // namespace wp
