@@ -1,0 +1,131 @@
+#include "service/access_point.h"
+
+#include <algorithm>
+#include <string_view>
+
+namespace wp {
+namespace {
+
+/// Values from here on tell what a station must support; they are no rates.
+constexpr std::uint8_t kFirstMembershipSelector = 120;
+constexpr std::uint8_t kFastestDirectSequenceRate = 22;
+
+bool isDirectSequence(std::uint8_t rate) {
+    return rate == 2 || rate == 4 || rate == 11 || rate == 22;
+}
+
+void readRates(Advertised& says, Bytes rates) {
+    for (const std::uint8_t entry : rates) {
+        const std::uint8_t rate = entry & 0x7F;  // the highest bit marks a basic rate
+        if (rate == 0 || rate >= kFirstMembershipSelector) continue;
+        says.fastestRate = std::max(says.fastestRate, rate);
+        (isDirectSequence(rate) && rate <= kFastestDirectSequenceRate ? says.directSequence
+                                                                      : says.orthogonal) = true;
+    }
+}
+
+std::optional<CountryCode> countryOf(Bytes element) {
+    if (element.size() < 2) return std::nullopt;
+    CountryCode code{};
+    for (std::size_t i = 0; i < code.size(); ++i) {
+        const char letter = static_cast<char>(element[i] & ~0x20);
+        if (element[i] >= 0x80 || letter < 'A' || letter > 'Z') return std::nullopt;
+        code[i] = letter;
+    }
+    // "XX" stands for no country at all.
+    return code == CountryCode{'X', 'X'} ? std::nullopt : std::optional(code);
+}
+
+std::optional<std::uint8_t> byteAt(const Element& element, std::size_t at) {
+    return element.size > at ? std::optional(element.data[at]) : std::nullopt;
+}
+
+NetworkName nameIn(const Elements& elements) {
+    const NetworkName name(elements.name.bytes());
+    return name.absent() ? NetworkName() : name;
+}
+
+/// A beacon of one blank only is taken for hidden when the access point answers a probe with another name.
+bool hides(const NetworkName& beacon, const NetworkName& answered) {
+    static constexpr std::uint8_t kBlank[] = {' '};
+    return beacon.absent() || (beacon == NetworkName(kBlank) && !answered.absent() && answered != beacon);
+}
+
+void readNames(Advertised& says, const Elements& latest, const std::optional<Elements>& beacon) {
+    says.name = nameIn(latest);
+    if (beacon) {
+        const NetworkName inBeacon = nameIn(*beacon);
+        says.hidesName = hides(inBeacon, says.name);
+        if (says.name.absent()) says.name = inBeacon;
+    } else if (says.name.absent()) {
+        says.hidesName = true;  // an answer without a name: its beacon has none either
+    }
+}
+
+}  // namespace
+
+std::string textOf(const MacAddress& address) {
+    static constexpr char kDigits[] = "0123456789abcdef";
+    std::string text;
+    for (const std::uint8_t byte : address) {
+        if (!text.empty()) text += ':';
+        text += kDigits[byte >> 4];
+        text += kDigits[byte & 15];
+    }
+    return text;
+}
+
+Advertised decodeAdvertised(std::uint16_t capability, Bytes latest, std::optional<Bytes> beacon) {
+    Elements elements = decodeElements(latest);
+    std::optional<Elements> inBeacon;
+    if (beacon) {
+        // The latest frame often is the beacon.
+        inBeacon = std::ranges::equal(*beacon, latest) ? elements : decodeElements(*beacon);
+    }
+    Advertised says;
+    readNames(says, elements, inBeacon);
+    if (inBeacon) {
+        says.dtimPeriod = byteAt(inBeacon->trafficMap, 1);
+        addMissingElements(elements, *inBeacon);
+        elements.malformed |= inBeacon->malformed;
+    }
+    readRates(says, elements.rates.bytes());
+    readRates(says, elements.extendedRates.bytes());
+    says.security = decodeSecurity(capability, elements);
+    says.country = countryOf(elements.country.bytes());
+    says.load = byteAt(elements.load, 2);
+    says.protection = byteAt(elements.protection, 0);
+    says.ht = elements.htCapabilities.present();
+    says.vht = elements.vhtCapabilities.present();
+    says.he = elements.heCapabilities.present();
+    says.eht = elements.ehtCapabilities.present();
+    says.htSecondary = byteAt(elements.htOperation, 1).value_or(0) & 3;
+    says.hotspot = elements.hotspot.present();
+    says.onlineSignUp = elements.onlineSignUp.present();
+    says.interworking = elements.interworking.present();
+    says.malformed = elements.malformed;
+    return says;
+}
+
+std::string phyModesOf(const AccessPoint& accessPoint) {
+    const Advertised& says = accessPoint.says;
+    const bool below5 = accessPoint.band() == Band::ghz2;
+    const std::pair<bool, std::string_view> modes[] = {
+        {!below5 && says.orthogonal && accessPoint.band() == Band::ghz5, "a"},
+        {below5 && says.directSequence, "b"},
+        {below5 && says.orthogonal, "g"},
+        {says.ht, "n"},
+        {!below5 && says.vht, "ac"},
+        {says.he, "ax"},
+        {says.eht, "be"},
+    };
+    std::string text;
+    for (const auto& [offered, name] : modes) {
+        if (!offered) continue;
+        if (!text.empty()) text += '/';
+        text += name;
+    }
+    return text;
+}
+
+}  // namespace wp

@@ -1,0 +1,75 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "service/access_point.h"
+#include "service/known.h"
+
+namespace wp {
+
+/// The Wi-Fi interface that is looked at, and what it is joined to.
+struct Link {
+    std::string interfaceName;
+    std::uint32_t interfaceIndex = 0;
+    std::uint32_t radio = 0;  ///< the kernel's number of the radio
+    bool up = false;
+    std::optional<AccessPoint> joined;  ///< the access point, as the kernel keeps it up to date
+};
+
+/// What the driver says of the link to the joined access point.
+struct Station {
+    std::vector<int> signals;                     ///< dBm, several within a second
+    std::optional<std::uint8_t> dtimPeriod;       ///< in beacons
+    std::optional<std::uint16_t> beaconInterval;  ///< in units of 1.024 ms
+};
+
+/// One channel of a survey.
+struct SurveyedChannel {
+    std::uint32_t frequency = 0;  ///< MHz
+    bool inUse = false;
+    std::optional<int> noise;  ///< dBm, only where the radio measures it
+};
+using Survey = std::vector<SurveyedChannel>;
+
+/// The regulatory domain in use on the radio.
+struct Regulation {
+    std::string country;  ///< two letters, or "00", "99", "98" for a world-wide or combined one
+};
+
+/// One address of the interface.
+struct Address {
+    enum class Family { ipv4, ipv6 };
+    Family family = Family::ipv4;
+    std::vector<std::uint8_t> bytes;  ///< 4 or 16
+    bool global = false;              ///< of universal scope
+    bool usable = true;               ///< neither being checked for duplicates nor found to be one
+};
+using Addresses = std::vector<Address>;
+
+/// The answers to a row of echo requests.
+struct Echo {
+    std::string interfaceName;
+    std::string target;                             ///< for the log
+    std::vector<std::optional<double>> roundTrips;  ///< ms, one for each request; absent: no answer
+    double startedAt = 0;                           ///< seconds since 2001-01-01 00:00:00 UTC
+};
+
+/// All that the tests of one phase go by. What was not gathered, or could not be, says why.
+struct Facts {
+    std::optional<NetworkName> named;  ///< the network asked about; absent: the one that is joined
+    Known<Link> link;
+    Known<std::vector<AccessPoint>> nearby;  ///< all access points of the scan, the joined one included
+    Known<Station> station;
+    Known<Survey> survey;
+    Known<Regulation> regulation;
+    Known<Addresses> addresses;
+    Known<Echo> gatewayEcho;
+};
+
+/// The kinds of facts, to say which ones a test needs. `judged` stands for where the judged access point is
+/// found: `link` for the joined network, `nearby` for a named one.
+enum class Fact { judged, link, nearby, station, survey, regulation, addresses, gatewayEcho };
+
+}  // namespace wp

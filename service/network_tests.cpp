@@ -1,0 +1,129 @@
+#include "service/network_tests.h"
+
+#include <algorithm>
+#include <set>
+#include <string_view>
+
+#include "service/judged.h"
+
+namespace wp {
+namespace {
+
+// 100 units are every maker's default. The slack is for controllers that are set in milliseconds and round.
+constexpr int kLongestBeaconInterval = 110;
+
+// Makers of access points advise 1 or 2; many home routers ship 3.
+constexpr int kLongestDtimPeriod = 3;
+
+/// Names that access points carry out of the box, and words that say nothing: two unrelated networks with one
+/// of them are likely to be in reach of each other. Lower case.
+constexpr std::string_view kCommonNames[] = {
+    "linksys",   "linksys-a", "linksys-g",  "default", "belkin54g", "netgear",
+    "o2dsl",     "wlan",      "alice-wlan", "dlink",   "d-link",    "speedport w 501v",
+    "turbonett", "tp-link",   "asus",       "home",    "wifi",      "wi-fi",
+    "wireless",  "guest",     "internet",   "router",  "network",   "setup",
+};
+
+std::string lowerCase(Bytes name) {
+    std::string text(name.begin(), name.end());
+    for (char& letter : text) {
+        if (letter >= 'A' && letter <= 'Z') letter = static_cast<char>(letter + ('a' - 'A'));
+    }
+    return text;
+}
+
+bool isCommonName(const NetworkName& name) {
+    return std::ranges::find(kCommonNames, lowerCase(name.bytes())) != std::end(kCommonNames);
+}
+
+/// Networks that are secured in different ways are different networks, though they have one name.
+bool differInSecurity(const std::vector<const AccessPoint*>& network) {
+    std::set<SecurityClass> classes;
+    for (const AccessPoint* each : network) classes.insert(classOf(securityOf(each->says.security)));
+    classes.erase(SecurityClass::unknown);
+    return classes.size() > 1;
+}
+
+Outcome securityProblem(const SecuritySuites& suites, bool found) {
+    // What was read before the element broke off proves a finding, not the lack of one.
+    if (suites.malformed && !found) return failure(Reason::malformed, "the security element ends too early");
+    return problem(found, {{"Security", nameOf(securityOf(suites))}});
+}
+
+bool usesWep(const SecuritySuites& suites) {
+    return securityOf(suites) == Security::wep || ((suites.pairwise | suites.group) & SecuritySuites::kWep);
+}
+
+}  // namespace
+
+Outcome beaconIntervalIsLong(const Facts& facts) {
+    const Known<const AccessPoint*> judged = judgedAccessPoint(facts);
+    if (!judged) return judged.error();
+    const std::optional<std::uint16_t> interval = (*judged)->beaconInterval;
+    if (!interval) return failure(Reason::unsupported, "the driver does not tell the beacon interval");
+    if (*interval == 0) return failure(Reason::malformed, "the access point names a beacon interval of 0");
+    return problem(*interval > kLongestBeaconInterval, {{"BeaconInterval", std::int64_t{*interval}}});
+}
+
+Outcome dtimIntervalIsLong(const Facts& facts) {
+    const Known<const AccessPoint*> judged = judgedAccessPoint(facts);
+    if (!judged) return judged.error();
+    std::optional<std::uint8_t> period;
+    if (!facts.named && facts.station) period = facts.station->dtimPeriod;
+    if (!period) period = (*judged)->says.dtimPeriod;
+    if (!period) return failure(Reason::unsupported, "no beacon with a DTIM period was heard");
+    if (*period == 0) return failure(Reason::malformed, "the access point names a DTIM period of 0");
+    return problem(*period > kLongestDtimPeriod, {{"DTIMInterval", std::int64_t{*period}}});
+}
+
+Outcome securityIsOpen(const Facts& facts) {
+    const Known<const AccessPoint*> judged = judgedAccessPoint(facts);
+    if (!judged) return judged.error();
+    const Security security = securityOf((*judged)->says.security);
+    return problem(classOf(security) == SecurityClass::open, {{"Security", nameOf(security)}});
+}
+
+Outcome securityIsWep(const Facts& facts) {
+    const Known<const AccessPoint*> judged = judgedAccessPoint(facts);
+    if (!judged) return judged.error();
+    const SecuritySuites& suites = (*judged)->says.security;
+    return securityProblem(suites, usesWep(suites));
+}
+
+Outcome securityIsWpa(const Facts& facts) {
+    const Known<const AccessPoint*> judged = judgedAccessPoint(facts);
+    if (!judged) return judged.error();
+    const SecuritySuites& suites = (*judged)->says.security;
+    return securityProblem(suites, suites.wpa || (suites.rsnPairwise & SecuritySuites::kTkip));
+}
+
+Outcome nameIsAmbiguous(const Facts& facts) {
+    const Known<const AccessPoint*> judged = judgedAccessPoint(facts);
+    if (!judged) return judged.error();
+    const NetworkName& name = (*judged)->says.name;
+    if (name.absent()) return failure(Reason::notFound, "no frame has told the network's name");
+    bool found = isCommonName(name);
+    if (!found) {
+        const Known<std::vector<const AccessPoint*>> network = judgedNetwork(facts);
+        if (!network) return network.error();
+        found = differInSecurity(*network);
+    }
+    return problem(found, {{"NetworkName", textFromName(name)}});
+}
+
+Outcome nameIsHidden(const Facts& facts) {
+    const Known<const AccessPoint*> judged = judgedAccessPoint(facts);
+    if (!judged) return judged.error();
+    const std::optional<bool> hides = (*judged)->says.hidesName;
+    if (!hides) return failure(Reason::unsupported, "no beacon was heard, and only a beacon tells");
+    return problem(*hides);
+}
+
+Outcome isPasspoint(const Facts& facts) {
+    const Known<const AccessPoint*> judged = judgedAccessPoint(facts);
+    if (!judged) return judged.error();
+    // The sign-up network beside a hotspot carries the same element and is not one.
+    return problem((*judged)->says.hotspot && !(*judged)->says.onlineSignUp);
+}
+
+}  // namespace wp
