@@ -93,8 +93,8 @@ bool choosesPresentation(char32_t c, std::optional<char32_t> before) {
 
 }  // namespace
 
-CodePoint takeCodePoint(std::string_view& text) {
-    CodePoint taken;
+Utf8Character takeCharacter(std::string_view& text) {
+    Utf8Character taken;
     auto length = static_cast<std::size_t>(lengthOfSequence(static_cast<unsigned char>(text[0])).value_or(0));
     if (length > 0 && length <= text.size()) taken.value = decoded(text.substr(0, length));
     taken.bytes = text.substr(0, taken.value ? length : 1);
@@ -115,7 +115,7 @@ std::string displayForm(std::string_view text) {
     form.reserve(text.size());
     std::optional<char32_t> before;
     while (!text.empty()) {
-        CodePoint next = takeCodePoint(text);
+        Utf8Character next = takeCharacter(text);
         if (!next.value) {
             form += byteEscape(static_cast<unsigned char>(next.bytes[0]));
         } else if (isControl(*next.value)) {

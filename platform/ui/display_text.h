@@ -7,7 +7,7 @@
 namespace wp::ui {
 
 /// One step through UTF-8 text.
-struct CodePoint {
+struct Utf8Character {
     /// Nothing where the byte belongs to no valid sequence; `bytes` is then that one byte.
     std::optional<char32_t> value;
     std::string_view bytes;
@@ -15,7 +15,7 @@ struct CodePoint {
 
 /// Takes the first code point off the text, which must not be empty. Overlong forms, surrogates and values
 /// beyond U+10FFFF are not valid. *Any* thread.
-CodePoint takeCodePoint(std::string_view& text);
+Utf8Character takeCharacter(std::string_view& text);
 
 /// The UTF-8 form of a code point.
 std::string encodeUtf8(char32_t codePoint);

@@ -40,7 +40,7 @@ constexpr long kLongestSleep = 24L * 60 * 60 * 1000;
 
 bool isUtf8(std::string_view text) {
     while (!text.empty())
-        if (!ui::takeCodePoint(text).value) return false;
+        if (!ui::takeCharacter(text).value) return false;
     return true;
 }
 

@@ -68,7 +68,7 @@ TEST(CodePoints, ComeBackFromTheirUtf8Form) {
         if (c >= 0xD800 && c <= 0xDFFF) continue;
         std::string encoded = encodeUtf8(c);
         std::string_view rest = encoded;
-        CodePoint taken = takeCodePoint(rest);
+        Utf8Character taken = takeCharacter(rest);
         ASSERT_EQ(taken.value, c);
         ASSERT_TRUE(rest.empty());
     }
