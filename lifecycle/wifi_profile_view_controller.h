@@ -335,21 +335,40 @@ class WiFiProfileViewController final : public DiagnosticViewController {
     std::atomic<std::int32_t> totalTests_ = 0;
     bool progressScreenVisible_ = false;
 
-    // 5. Test invocation
+    // 5. Test invocation: its steps, which the rows and the tests that are more than a row are made of
+    void runTest(const TestRow& row, Configuration configuration, Results resultsDictionary) const;
+    /// Stores the verdict; null where there is no information to be read.
+    DictionaryPointer infoOfTest(const TestRow& row, Configuration configuration,
+                                 Results resultsDictionary) const;
     DiagnosticsTestResultPointer resultOfTest(const TestRow& row, Configuration configuration) const;
     DictionaryPointer infoOfResult(const TestRow& row, const DiagnosticsTestResult& result) const;
-    DictionaryPointer infoOfTest(const TestRow& row, Configuration configuration, Results results) const;
-    std::optional<Value> infoValue(const Dictionary& info, std::string_view key,
-                                   std::string_view missingName) const;
-    void storeInfoValue(const TestRow& row, const Dictionary& info, Results results) const;
-    void runTest(const TestRow& row, Configuration configuration, Results results) const;
-    void logTestError(std::string_view subject, std::string_view what) const;
-    void logTestError(std::string_view subject, const Error& error) const;
+    void storeInfoValue(const TestRow& row, const Dictionary& info, Results resultsDictionary) const;
+    /// The array or the record under the row's key; a value of another kind counts as missing.
+    ArrayPointer infoArray(const TestRow& row, const Dictionary& info) const;
+    template <class RecordType>
+    std::shared_ptr<const RecordType> infoRecord(const TestRow& row, const Dictionary& info) const;
+    void logTestFailure(const TestRow& row, const Error& error) const;
+    void logNotFound(std::string_view name) const;
+
+    // 6. Device configuration tests
+    void runDeviceTest(const TestRow& row) const;
+
+    // 7. Current-network tests: properties
+    void runCaptivePortalTest(const TestRow& row, Configuration configuration,
+                              Results resultsDictionary) const;
+    DictionaryPointer preferredNetworkDictionary(const PreferredNetworkRecord& record) const;
 
     // 8. Current-network tests: connectivity
-    void runPing(const TestRow& row, Configuration configuration, Results results) const;
+    void runPingTest(const TestRow& row, Configuration configuration, Results resultsDictionary) const;
+    DictionaryPointer pingSummary(const PingStatistics& statistics) const;
 
     // 9. Current-network tests: channel, signal, scan
+    void runCongestionTest(const TestRow& row, Configuration configuration, Results resultsDictionary) const;
+    void runSignalTest(const TestRow& row, Configuration configuration, Results resultsDictionary) const;
+    void runNoScanResultsTest(const TestRow& row, Configuration configuration, Results resultsDictionary);
+    void runHiddenScanResultsTest(const TestRow& row, Configuration configuration,
+                                  Results resultsDictionary) const;
+
     Synchronized<ArrayPointer> wifiScanResults_;
 
     // 11. Network list
