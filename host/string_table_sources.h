@@ -1,0 +1,16 @@
+#pragma once
+
+#include <array>
+
+namespace wp::host {
+
+/// One file of `resources/strings/`, compiled in so that the program never runs without its texts.
+struct StringTableSource {
+    const char* name;
+    const char* text;
+};
+
+/// The default language first.
+extern const std::array<StringTableSource, 3> kStringTableSources;
+
+}  // namespace wp::host
