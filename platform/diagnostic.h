@@ -70,6 +70,8 @@ class DiagnosticViewController : public ui::ViewController {
     bool isFinished() const { return finished_; }
     /// Tells the host that the run is over. *Any* thread; the host's handler is called on that thread, once.
     void setFinished();
+    /// After the end of the run no key reaches the diagnostic any more. *Main*.
+    bool acceptsInput() const override { return !isFinished(); }
     /// *Main*, before `start`.
     void setFinishedHandler(std::function<void()> handler) { finishedHandler_ = std::move(handler); }
 
