@@ -1,0 +1,232 @@
+#include "linux/radio_messages.h"
+
+#include <linux/genetlink.h>
+#include <linux/nl80211.h>
+
+#include <algorithm>
+
+namespace wp {
+namespace {
+
+/// Calls `visit(attributes)` for each message of the command.
+template <class Visit>
+void forEachOf(std::uint8_t command, Bytes buffer, Visit visit) {
+    forEachContent(buffer, [&](const NetlinkMessage& message) {
+        if (message.payload.size() < GENL_HDRLEN || message.payload[0] != command) return;
+        visit(message.attributesAfter(GENL_HDRLEN));
+    });
+}
+
+std::optional<MacAddress> addressIn(std::optional<Bytes> content) {
+    MacAddress address;
+    if (!content || content->size() != address.size()) return std::nullopt;
+    std::ranges::copy(*content, address.begin());
+    return address;
+}
+
+std::int64_t toMilliseconds(std::uint64_t nanoseconds) {
+    return static_cast<std::int64_t>(nanoseconds / 1000000);
+}
+
+std::optional<std::int64_t> lastSeen(const Attributes& bss, std::int64_t now) {
+    if (const auto at = bss.number<std::uint64_t>(NL80211_BSS_LAST_SEEN_BOOTTIME)) return toMilliseconds(*at);
+    if (const auto ago = bss.number<std::uint32_t>(NL80211_BSS_SEEN_MS_AGO)) return now - *ago;
+    return std::nullopt;
+}
+
+std::optional<int> signalOf(const Attributes& bss) {
+    const auto hundredths = bss.number<std::int32_t>(NL80211_BSS_SIGNAL_MBM);
+    if (!hundredths) return std::nullopt;
+    return *hundredths / 100;
+}
+
+std::optional<AccessPoint> accessPointOf(const Attributes& bss, std::int64_t now) {
+    const std::optional<MacAddress> address = addressIn(bss.find(NL80211_BSS_BSSID));
+    if (!address) return std::nullopt;
+    const Bytes latest = bss.find(NL80211_BSS_INFORMATION_ELEMENTS).value_or(Bytes());
+    std::optional<Bytes> beacon = bss.find(NL80211_BSS_BEACON_IES);
+    // Without a word of a probe response, the latest frame was a beacon.
+    if (!beacon && !bss.has(NL80211_BSS_PRESP_DATA) && !latest.empty()) beacon = latest;
+
+    AccessPoint accessPoint;
+    accessPoint.address = *address;
+    accessPoint.frequency = bss.number<std::uint32_t>(NL80211_BSS_FREQUENCY).value_or(0);
+    accessPoint.beaconInterval = bss.number<std::uint16_t>(NL80211_BSS_BEACON_INTERVAL);
+    accessPoint.capability = bss.number<std::uint16_t>(NL80211_BSS_CAPABILITY).value_or(0);
+    accessPoint.signal = signalOf(bss);
+    accessPoint.lastSeen = lastSeen(bss, now);
+    accessPoint.joined =
+        bss.number<std::uint32_t>(NL80211_BSS_STATUS) == std::uint32_t{NL80211_BSS_STATUS_ASSOCIATED};
+    accessPoint.elements.assign(latest.begin(), latest.end());
+    if (beacon) accessPoint.beaconElements.emplace(beacon->begin(), beacon->end());
+    accessPoint.says = decodeAdvertised(accessPoint.capability, latest, beacon);
+    return accessPoint;
+}
+
+/// The first of several ways in which drivers tell the signal.
+std::optional<int> stationSignal(const Attributes& station) {
+    for (const std::uint16_t type :
+         {NL80211_STA_INFO_SIGNAL_AVG, NL80211_STA_INFO_SIGNAL, NL80211_STA_INFO_BEACON_SIGNAL_AVG}) {
+        if (const auto signal = station.number<std::int8_t>(type)) return *signal;
+    }
+    return std::nullopt;
+}
+
+RadioChannel channelOf(const Attributes& frequency) {
+    return {frequency.number<std::uint32_t>(NL80211_FREQUENCY_ATTR_FREQ).value_or(0),
+            frequency.has(NL80211_FREQUENCY_ATTR_DISABLED), frequency.has(NL80211_FREQUENCY_ATTR_NO_IR),
+            frequency.has(NL80211_FREQUENCY_ATTR_RADAR)};
+}
+
+void addChannels(std::vector<RadioChannel>& channels, const Attributes& bands) {
+    bands.forEach([&](std::uint16_t, Bytes band) {
+        Attributes(band).nested(NL80211_BAND_ATTR_FREQS).forEach([&](std::uint16_t, Bytes frequency) {
+            const RadioChannel channel = channelOf(Attributes(frequency));
+            if (channel.frequency != 0) channels.push_back(channel);
+        });
+    });
+}
+
+std::size_t countOf(const Attributes& list) {
+    std::size_t count = 0;
+    list.forEach([&](std::uint16_t, Bytes) { ++count; });
+    return count;
+}
+
+std::optional<ScanEvent::Kind> scanEventKind(Bytes payload) {
+    if (payload.size() < GENL_HDRLEN) return std::nullopt;
+    switch (payload[0]) {
+        case NL80211_CMD_TRIGGER_SCAN:
+            return ScanEvent::Kind::started;
+        case NL80211_CMD_NEW_SCAN_RESULTS:
+            return ScanEvent::Kind::finished;
+        case NL80211_CMD_SCAN_ABORTED:
+            return ScanEvent::Kind::aborted;
+        default:
+            return std::nullopt;
+    }
+}
+
+void addScanEvent(std::vector<ScanEvent>& events, ScanEvent::Kind kind, const Attributes& message) {
+    const auto index = message.number<std::uint32_t>(NL80211_ATTR_IFINDEX);
+    if (!index) return;
+    ScanEvent event{kind, *index, countOf(message.nested(NL80211_ATTR_SCAN_FREQUENCIES)), false};
+    message.nested(NL80211_ATTR_SCAN_SSIDS).forEach([&](std::uint16_t, Bytes name) {
+        if (name.empty()) event.probedForAll = true;
+    });
+    events.push_back(event);
+}
+
+}  // namespace
+
+bool RadioInterface::isStation() const {
+    return type == NL80211_IFTYPE_STATION;
+}
+
+std::optional<RadioFamily> readFamily(Bytes buffer) {
+    std::optional<RadioFamily> family;
+    forEachOf(CTRL_CMD_NEWFAMILY, buffer, [&](const Attributes& message) {
+        const auto number = message.number<std::uint16_t>(CTRL_ATTR_FAMILY_ID);
+        if (!number || message.text(CTRL_ATTR_FAMILY_NAME) != NL80211_GENL_NAME) return;
+        family = RadioFamily{*number, {}};
+        message.nested(CTRL_ATTR_MCAST_GROUPS).forEach([&](std::uint16_t, Bytes content) {
+            const Attributes group(content);
+            const auto id = group.number<std::uint32_t>(CTRL_ATTR_MCAST_GRP_ID);
+            if (const auto name = group.text(CTRL_ATTR_MCAST_GRP_NAME); id && name)
+                family->groups[*name] = *id;
+        });
+    });
+    return family;
+}
+
+std::vector<RadioInterface> readInterfaces(Bytes buffer) {
+    std::vector<RadioInterface> interfaces;
+    forEachOf(NL80211_CMD_NEW_INTERFACE, buffer, [&](const Attributes& message) {
+        const auto name = message.text(NL80211_ATTR_IFNAME);
+        const auto index = message.number<std::uint32_t>(NL80211_ATTR_IFINDEX);
+        if (!name || !index) return;  // a peer-to-peer device has neither
+        RadioInterface interface;
+        interface.name = *name;
+        interface.index = *index;
+        interface.radio = message.number<std::uint32_t>(NL80211_ATTR_WIPHY).value_or(0);
+        interface.type = message.number<std::uint32_t>(NL80211_ATTR_IFTYPE).value_or(0);
+        interface.frequency = message.number<std::uint32_t>(NL80211_ATTR_WIPHY_FREQ);
+        if (const auto joined = message.find(NL80211_ATTR_SSID)) interface.joinedName.emplace(*joined);
+        interfaces.push_back(std::move(interface));
+    });
+    return interfaces;
+}
+
+std::vector<AccessPoint> readAccessPoints(Bytes buffer, std::int64_t now) {
+    std::vector<AccessPoint> accessPoints;
+    forEachOf(NL80211_CMD_NEW_SCAN_RESULTS, buffer, [&](const Attributes& message) {
+        std::optional<AccessPoint> each = accessPointOf(message.nested(NL80211_ATTR_BSS), now);
+        if (each) accessPoints.push_back(std::move(*each));
+    });
+    return accessPoints;
+}
+
+std::optional<Station> readStation(Bytes buffer) {
+    std::optional<Station> station;
+    forEachOf(NL80211_CMD_NEW_STATION, buffer, [&](const Attributes& message) {
+        if (station) return;
+        const Attributes info = message.nested(NL80211_ATTR_STA_INFO);
+        const Attributes parameters = info.nested(NL80211_STA_INFO_BSS_PARAM);
+        station.emplace();
+        if (const auto signal = stationSignal(info)) station->signals.push_back(*signal);
+        station->dtimPeriod = parameters.number<std::uint8_t>(NL80211_STA_BSS_PARAM_DTIM_PERIOD);
+        station->beaconInterval = parameters.number<std::uint16_t>(NL80211_STA_BSS_PARAM_BEACON_INTERVAL);
+    });
+    return station;
+}
+
+Survey readSurvey(Bytes buffer) {
+    Survey survey;
+    forEachOf(NL80211_CMD_NEW_SURVEY_RESULTS, buffer, [&](const Attributes& message) {
+        const Attributes info = message.nested(NL80211_ATTR_SURVEY_INFO);
+        const auto frequency = info.number<std::uint32_t>(NL80211_SURVEY_INFO_FREQUENCY);
+        if (!frequency) return;
+        SurveyedChannel channel{*frequency, info.has(NL80211_SURVEY_INFO_IN_USE), std::nullopt};
+        if (const auto noise = info.number<std::int8_t>(NL80211_SURVEY_INFO_NOISE)) channel.noise = *noise;
+        survey.push_back(channel);
+    });
+    return survey;
+}
+
+std::optional<Regulation> readRegulation(Bytes buffer, std::uint32_t radio) {
+    std::optional<Regulation> system;
+    std::optional<Regulation> own;
+    forEachOf(NL80211_CMD_GET_REG, buffer, [&](const Attributes& message) {
+        const auto country = message.text(NL80211_ATTR_REG_ALPHA2);
+        if (!country || country->size() != 2) return;
+        const auto of = message.number<std::uint32_t>(NL80211_ATTR_WIPHY);
+        if (!of) system = Regulation{*country};
+        if (of == radio) own = Regulation{*country};
+    });
+    return own ? own : system;
+}
+
+std::optional<RadioAbilities> readAbilities(Bytes buffer, std::uint32_t radio) {
+    std::optional<RadioAbilities> abilities;
+    // A radio is told in many messages: each adds to what the others said.
+    forEachOf(NL80211_CMD_NEW_WIPHY, buffer, [&](const Attributes& message) {
+        if (message.number<std::uint32_t>(NL80211_ATTR_WIPHY) != radio) return;
+        if (!abilities) abilities.emplace();
+        if (const auto names = message.number<std::uint8_t>(NL80211_ATTR_MAX_NUM_SCAN_SSIDS)) {
+            abilities->namesPerScan = *names;
+        }
+        addChannels(abilities->channels, message.nested(NL80211_ATTR_WIPHY_BANDS));
+    });
+    return abilities;
+}
+
+std::vector<ScanEvent> readScanEvents(Bytes buffer) {
+    std::vector<ScanEvent> events;
+    forEachContent(buffer, [&](const NetlinkMessage& message) {
+        const std::optional<ScanEvent::Kind> kind = scanEventKind(message.payload);
+        if (kind) addScanEvent(events, *kind, message.attributesAfter(GENL_HDRLEN));
+    });
+    return events;
+}
+
+}  // namespace wp

@@ -1,0 +1,72 @@
+#pragma once
+
+#include <map>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "linux/netlink_reader.h"
+#include "service/facts.h"
+
+namespace wp {
+
+// What the kernel's messages about radios say. Each takes a buffer of messages, as a dump leaves it, and passes
+// over what it does not know or what is broken. Pure functions; *any* thread.
+
+/// The number under which the kernel's Wi-Fi messages go, and those of its multicast groups by name.
+struct RadioFamily {
+    std::uint16_t number = 0;
+    std::map<std::string, std::uint32_t> groups;
+};
+std::optional<RadioFamily> readFamily(Bytes buffer);
+
+/// One interface of a radio.
+struct RadioInterface {
+    std::string name;
+    std::uint32_t index = 0;
+    std::uint32_t radio = 0;
+    std::uint32_t type = 0;
+    std::optional<NetworkName> joinedName;   ///< of the network that a station has joined
+    std::optional<std::uint32_t> frequency;  ///< MHz, while it has a channel
+    bool isStation() const;
+};
+std::vector<RadioInterface> readInterfaces(Bytes buffer);
+
+/// The access points of a scan, told apart by what the kernel has of each.
+/// @param now ms on the clock that counts suspended time too
+std::vector<AccessPoint> readAccessPoints(Bytes buffer, std::int64_t now);
+
+/// The link to the joined access point, with one sample of the signal; nothing when there is no link.
+std::optional<Station> readStation(Bytes buffer);
+
+Survey readSurvey(Bytes buffer);
+
+/// The domain of the radio, where it manages its own, else that of the whole system.
+std::optional<Regulation> readRegulation(Bytes buffer, std::uint32_t radio);
+
+/// One channel that a radio could use.
+struct RadioChannel {
+    std::uint32_t frequency = 0;  ///< MHz
+    bool disabled = false;        ///< by the regulatory domain
+    bool passive = false;         ///< nothing may be sent before a beacon was heard
+    bool radar = false;
+};
+
+/// What a radio can do.
+struct RadioAbilities {
+    std::size_t namesPerScan = 0;  ///< how many names one scan can probe for
+    std::vector<RadioChannel> channels;
+};
+std::optional<RadioAbilities> readAbilities(Bytes buffer, std::uint32_t radio);
+
+/// What came over the multicast group "scan". Events are in their order.
+struct ScanEvent {
+    enum class Kind { started, finished, aborted };
+    Kind kind = Kind::finished;
+    std::uint32_t interfaceIndex = 0;
+    std::size_t frequencies = 0;  ///< how many channels the scan covered
+    bool probedForAll = false;    ///< whether it asked for networks of any name
+};
+std::vector<ScanEvent> readScanEvents(Bytes buffer);
+
+}  // namespace wp

@@ -1,0 +1,165 @@
+#include "linux/radio_messages.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+
+#include "verification/unit/linux/captured.h"
+
+namespace wp {
+namespace {
+
+using Buffer = std::vector<std::uint8_t>;
+
+const AccessPoint& joinedIn(const std::vector<AccessPoint>& accessPoints) {
+    return *std::ranges::find_if(accessPoints, &AccessPoint::joined);
+}
+
+TEST(RadioMessages, FindTheFamilyAndItsGroups) {
+    const auto family = readFamily(captured("good-home-family"));
+
+    ASSERT_TRUE(family);
+    EXPECT_GE(family->number, 0x10);
+    EXPECT_TRUE(family->groups.contains("scan"));
+    EXPECT_TRUE(family->groups.contains("mlme"));
+}
+
+TEST(RadioMessages, TellTheInterfaceAndWhatItHasJoined) {
+    const auto interfaces = readInterfaces(captured("good-home-interface"));
+
+    ASSERT_EQ(1U, interfaces.size());
+    EXPECT_EQ("wlan0", interfaces[0].name);
+    EXPECT_TRUE(interfaces[0].isStation());
+    ASSERT_TRUE(interfaces[0].joinedName);
+    EXPECT_EQ("Northlight", textFromName(*interfaces[0].joinedName));
+    EXPECT_EQ(2437U, interfaces[0].frequency);
+}
+
+TEST(RadioMessages, TellAnInterfaceThatHasJoinedNothing) {
+    const auto interfaces = readInterfaces(captured("not-joined-interface"));
+
+    ASSERT_EQ(1U, interfaces.size());
+    EXPECT_FALSE(interfaces[0].joinedName);
+}
+
+TEST(RadioMessages, TellTheJoinedAccessPoint) {
+    const auto accessPoints = readAccessPoints(captured("good-home-scan"), 0);
+
+    ASSERT_TRUE(std::ranges::any_of(accessPoints, &AccessPoint::joined));
+    const AccessPoint& home = joinedIn(accessPoints);
+    EXPECT_EQ("Northlight", textFromName(home.says.name));
+    EXPECT_EQ(2437U, home.frequency);
+    EXPECT_EQ(100, home.beaconInterval);
+    EXPECT_EQ(2, home.says.dtimPeriod);
+    EXPECT_EQ(false, home.says.hidesName);
+    EXPECT_EQ(Security::wpa2Personal, securityOf(home.says.security));
+    EXPECT_EQ((CountryCode{'U', 'S'}), home.says.country);
+    EXPECT_EQ("b/g/n", phyModesOf(home));
+    ASSERT_TRUE(home.signal);
+    EXPECT_LT(*home.signal, -1);
+    EXPECT_TRUE(home.lastSeen);
+}
+
+TEST(RadioMessages, TellWhatTheScenariosAccessPointsAre) {
+    const std::pair<const char*, Security> scenarios[] = {
+        {"open-cafe-slow-beacons", Security::open},
+        {"wep", Security::wep},
+        {"wpa2-and-wpa3", Security::mixedWpa2Wpa3Personal},
+        {"owe", Security::owe},
+        {"passpoint", Security::wpa2Personal},
+    };
+    for (const auto& [scenario, security] : scenarios) {
+        const auto accessPoints = readAccessPoints(captured(std::string(scenario) + "-scan"), 0);
+        ASSERT_FALSE(accessPoints.empty()) << scenario;
+        EXPECT_EQ(security, securityOf(joinedIn(accessPoints).says.security)) << scenario;
+    }
+}
+
+TEST(RadioMessages, TellSlowBeaconsModesAndHotspots) {
+    EXPECT_EQ(1000, joinedIn(readAccessPoints(captured("open-cafe-slow-beacons-scan"), 0)).beaconInterval);
+    const auto airport = readAccessPoints(captured("passpoint-scan"), 0);
+    EXPECT_EQ(1, std::ranges::count_if(airport, [](const AccessPoint& each) { return each.says.hotspot; }));
+    EXPECT_FALSE(joinedIn(airport).says.hotspot);
+    const auto wifi6 = readAccessPoints(captured("wifi6-scan"), 0);
+    EXPECT_TRUE(joinedIn(wifi6).says.he);
+    const auto slow = readAccessPoints(captured("rates-11b-only-scan"), 0);
+    EXPECT_EQ(22, joinedIn(slow).says.fastestRate);
+    EXPECT_EQ("b", phyModesOf(joinedIn(slow)));
+}
+
+TEST(RadioMessages, TellAHiddenNeighbourByItsBeacon) {
+    const auto accessPoints = readAccessPoints(captured("hidden-neighbour-scan"), 0);
+
+    EXPECT_TRUE(
+        std::ranges::any_of(accessPoints, [](const AccessPoint& each) { return each.says.name.absent(); }));
+    EXPECT_TRUE(std::ranges::any_of(accessPoints,
+                                    [](const AccessPoint& each) { return each.says.hidesName == true; }));
+}
+
+TEST(RadioMessages, TellTheLink) {
+    const auto station = readStation(captured("good-home-station"));
+
+    ASSERT_TRUE(station);
+    ASSERT_EQ(1U, station->signals.size());
+    EXPECT_LT(station->signals[0], -1);
+    EXPECT_EQ(2, station->dtimPeriod);
+    EXPECT_EQ(100, station->beaconInterval);
+    EXPECT_FALSE(readStation(captured("not-joined-station")));
+}
+
+TEST(RadioMessages, TellTheMeasuredNoiseOfAChannel) {
+    const Survey survey = readSurvey(captured("good-home-survey"));
+
+    const auto channel = std::ranges::find(survey, 2437U, &SurveyedChannel::frequency);
+    ASSERT_NE(survey.end(), channel);
+    EXPECT_EQ(-92, channel->noise);
+}
+
+TEST(RadioMessages, TellTheRegulatoryDomainOfTheSystem) {
+    const auto regulation = readRegulation(captured("good-home-reg"), 0);
+
+    ASSERT_TRUE(regulation);
+    EXPECT_EQ("US", regulation->country);
+    EXPECT_FALSE(readRegulation({}, 0));
+}
+
+TEST(RadioMessages, GatherARadioFromItsManyMessages) {
+    const Buffer dump = captured("good-home-wiphy");
+    const auto interfaces = readInterfaces(captured("good-home-interface"));
+
+    const auto abilities = readAbilities(dump, interfaces.at(0).radio);
+
+    ASSERT_TRUE(abilities);
+    EXPECT_GE(abilities->namesPerScan, 1U);
+    const auto has = [&](std::uint32_t frequency) {
+        return std::ranges::any_of(abilities->channels,
+                                   [&](auto& channel) { return channel.frequency == frequency; });
+    };
+    EXPECT_TRUE(has(2412));
+    EXPECT_TRUE(has(5180));
+    EXPECT_TRUE(std::ranges::any_of(abilities->channels, &RadioChannel::radar));
+    EXPECT_FALSE(readAbilities(dump, 4711));
+}
+
+TEST(RadioMessages, TellStartAndEndOfScans) {
+    const auto events = readScanEvents(captured("good-home-scan_events"));
+
+    ASSERT_EQ(4U, events.size());
+    EXPECT_EQ(ScanEvent::Kind::started, events[0].kind);
+    EXPECT_EQ(ScanEvent::Kind::finished, events[1].kind);
+    EXPECT_FALSE(events[1].probedForAll);
+    EXPECT_EQ(ScanEvent::Kind::finished, events[3].kind);
+    EXPECT_TRUE(events[3].probedForAll);
+    EXPECT_GT(events[3].frequencies, 11U);
+}
+
+TEST(RadioMessages, SurviveAnyCutOfADump) {
+    const Buffer dump = captured("wpa1-other-country-scan");
+    for (std::size_t size = 0; size <= dump.size(); ++size) {
+        const Buffer prefix(dump.begin(), dump.begin() + static_cast<std::ptrdiff_t>(size));
+        EXPECT_LE(readAccessPoints(prefix, 0).size(), 4U);
+    }
+}
+
+}  // namespace
+}  // namespace wp
