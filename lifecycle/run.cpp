@@ -147,4 +147,8 @@ std::shared_ptr<WiFiProfileViewController> WiFiProfileViewController::self() {
     return std::static_pointer_cast<WiFiProfileViewController>(shared_from_this());
 }
 
+std::weak_ptr<WiFiProfileViewController> WiFiProfileViewController::weakSelf() {
+    return self();
+}
+
 }  // namespace wp

@@ -1,4 +1,5 @@
 #include "lifecycle/wifi_profile_view_controller.h"
+#include "platform/ui/alert_controller.h"
 
 namespace wp {
 namespace {
@@ -44,12 +45,34 @@ bool WiFiProfileViewController::obtainDevice(WiFiManagerClient& manager) {
     }
     device_.set(devices.front());
     wifiPoweredOn_ = manager.power() != 0;
-    // The device must not keep the controller alive: the controller keeps the device.
-    devices.front()->registerPowerCallback([weakSelf = weak_from_this()] {
-        if (auto strongSelf = weakSelf.lock())
-            static_cast<WiFiProfileViewController&>(*strongSelf).powerChanged();
+    // Here and below: what the controller itself keeps must not keep the controller alive.
+    devices.front()->registerPowerCallback([weakSelf = weakSelf()] {
+        if (auto self = weakSelf.lock()) self->powerChanged();
     });
     return true;
+}
+
+void WiFiProfileViewController::presentWiFiPoweredOffAlert() {
+    const Localization& strings = platform_.localization;
+    bool isWLAN = platform_.capabilities.booleanAnswer("wapi");
+    auto alert = std::make_shared<ui::AlertController>(
+        std::nullopt, strings.localizedString(isWLAN ? "POWER_ON_WLAN" : "POWER_ON_WIFI"),
+        ui::AlertController::Style::alert);
+    alert->addAction(std::make_shared<ui::AlertAction>(strings.localizedString("NO"),
+                                                       ui::AlertAction::Style::standard,
+                                                       [weakSelf = weakSelf()](ui::AlertAction&) {
+                                                           if (auto self = weakSelf.lock())
+                                                               self->endTestWithStatusCode(kPowerDeclined);
+                                                       }));
+    alert->addAction(std::make_shared<ui::AlertAction>(
+        strings.localizedString("YES"), ui::AlertAction::Style::standard,
+        [weakSelf = weakSelf()](ui::AlertAction&) {
+            auto self = weakSelf.lock();
+            std::shared_ptr<WiFiManagerClient> manager = self ? self->manager_.get() : nullptr;
+            // The power callback tells when Wi-Fi is on, and the run goes on from there.
+            if (manager) manager->setPower(kPowerOn);
+        }));
+    presentAlert(std::move(alert), ui::Animated::yes);
 }
 
 void WiFiProfileViewController::powerChanged() {

@@ -97,6 +97,9 @@ class WiFiProfileViewController final : public DiagnosticViewController {
     /// Tells the host that the run is over. *Any* thread.
     void finishTest();
 
+    /// Once the run is over no key and no action of an alert reaches it any more.
+    bool acceptsInput() const override { return !ended_; }
+
     const std::shared_ptr<WiFiProfileInputs>& inputs() const { return inputs_; }
     /// {"MaxScanCacheAge": the inputs' value}; for every test of the current network.
     const DictionaryPointer& currentNetworkConfiguration() const { return currentNetworkConfiguration_; }
@@ -292,6 +295,8 @@ class WiFiProfileViewController final : public DiagnosticViewController {
   private:
     /// The controller as a block keeps it.
     std::shared_ptr<WiFiProfileViewController> self();
+    /// The controller as what it owns itself (the screen's actions, the power callback) refers to it.
+    std::weak_ptr<WiFiProfileViewController> weakSelf();
 
     // 1. Life of a run
     /// What the test run does beyond the device's tests, and the code with which it ends.

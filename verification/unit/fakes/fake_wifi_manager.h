@@ -4,6 +4,7 @@
 #include <memory>
 #include <mutex>
 #include <string>
+#include <type_traits>
 #include <utility>
 #include <vector>
 
@@ -181,7 +182,7 @@ class FakeWiFiManager final : public WiFiManagerService {
     };
 
     template <class Function>
-    auto with(Function function) const {
+    std::invoke_result_t<Function, State&> with(Function function) const {
         std::lock_guard lock(state_->mutex);
         return function(*state_);
     }

@@ -217,7 +217,7 @@ TEST_P(CatalogueRowTest, LeavesTheProgressAlone) {
 }
 
 INSTANTIATE_TEST_SUITE_P(EveryTest, CatalogueRowTest, ::testing::ValuesIn(allRows()),
-                         [](const auto& info) { return info.param.name; });
+                         [](const auto& test) { return test.param.name; });
 
 /// The rows whose value goes into the document as the service delivered it.
 class PlainRowTest : public CatalogueRowTest {};
@@ -257,7 +257,7 @@ TEST_P(PlainRowTest, StoresTheVeryObject) {
 }
 
 INSTANTIATE_TEST_SUITE_P(EveryTest, PlainRowTest, ::testing::ValuesIn(plainRows()),
-                         [](const auto& info) { return info.param.name; });
+                         [](const auto& test) { return test.param.name; });
 
 TEST_F(CatalogueTest, HasElevenDeviceTestsAndThirtyNetworkTestsWithAnIDEach) {
     std::set<int> testIDs;

@@ -73,7 +73,7 @@ TEST_P(SelectedRowTest, WritesItsVerdictIntoTheSelectedSection) {
 }
 
 INSTANTIATE_TEST_SUITE_P(EveryTest, SelectedRowTest, ::testing::ValuesIn(kSelectedRows),
-                         [](const auto& info) { return info.param.name; });
+                         [](const auto& test) { return test.param.name; });
 
 TEST(SelectedNetwork, ReceivesTheCacheAgeAndTheNameWithEachOfItsSixteenTests) {
     EndedRun run("Office");
