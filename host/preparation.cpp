@@ -1,0 +1,105 @@
+#include "host/preparation.h"
+
+#include <fcntl.h>
+#include <unistd.h>
+
+#include "host/exit.h"
+#include "host/files.h"
+#include "host/request.h"
+#include "host/screen_choice.h"
+#include "host/string_table.h"
+
+namespace wp::host {
+namespace {
+
+/// The recording holds the names of networks nearby: nobody else's business.
+constexpr mode_t kRecordingMode = 0600;
+
+LocaleChoice localeOf(const RunOptions& options) {
+    if (!options.locale) return localeOfEnvironment();
+    std::optional<LocaleChoice> choice = localeNamed(*options.locale);
+    if (choice) return *choice;
+    std::string names;
+    for (const std::string& name : stringTableNames()) names += (names.empty() ? "" : ", ") + name;
+    refuse("--locale: there are no texts for \"" + *options.locale + "\"; give one of " + names);
+}
+
+std::shared_ptr<const Recording> loaded(const std::string& option, const std::string& file) {
+    std::variant<Recording, Refusal> recording = readRecording(readFile(option, file));
+    if (const Refusal* refusal = std::get_if<Refusal>(&recording))
+        refuse(option + ": " + file + ": " + refusal->text());
+    return std::make_shared<const Recording>(std::get<Recording>(std::move(recording)));
+}
+
+std::shared_ptr<const Recording> demo(const std::string& name) {
+    std::optional<std::filesystem::path> file;
+    bool isPlain = name.find('/') == std::string::npos && name.front() != '.';
+    if (isPlain) file = resourceFile("recordings/" + name + ".json");
+    if (!file)
+        refuse("--demo: no recording \"" + name +
+               "\" ships with the program; give home, troubled or selected");
+    return loaded("--demo", file->string());
+}
+
+std::shared_ptr<const Recording> recordingOf(const RunOptions& options) {
+    if (options.replayFile) return loaded("--replay", *options.replayFile);
+    if (options.demo) return demo(*options.demo);
+    return nullptr;
+}
+
+/// The screen is drawn on the controlling terminal, so standard output may lead anywhere.
+bool hasTerminal() {
+    int terminal = open("/dev/tty", O_RDWR | O_CLOEXEC | O_NOCTTY);
+    if (terminal < 0) return false;
+    close(terminal);
+    return true;
+}
+
+remote::Script scriptOf(const RunOptions& options) {
+    if (!options.remote) return {};
+    remote::Script script = remote::readScript(*options.remote, remote::Pictures::refused);
+    if (script.error) refuse("--remote: " + *script.error);
+    return script;
+}
+
+std::optional<OutputFile> outputFile(const char* option, const std::optional<std::string>& path,
+                                     std::optional<mode_t> mode = std::nullopt) {
+    if (!path || *path == "-") return std::nullopt;
+    return OutputFile(option, *path, mode);
+}
+
+void refuseOneFileForTwo(const RunOptions& options) {
+    const std::pair<const char*, const std::optional<std::string>*> files[] = {
+        {"--output", &options.outputFile},
+        {"--record", &options.recordFile},
+        {"--automation", &options.automationFile},
+        {"--transcript", &options.transcriptFile}};
+    for (std::size_t i = 0; i < std::size(files); ++i)
+        for (std::size_t j = i + 1; j < std::size(files); ++j)
+            if (*files[i].second && **files[i].second != "/dev/null" && *files[i].second == *files[j].second)
+                refuse(std::string(files[j].first) + ": " + **files[j].second + ": is the file of " +
+                       files[i].first + " too; give another");
+}
+
+}  // namespace
+
+Preparation prepare(const RunOptions& options) {
+    if (options.format != OutputFormat::json)
+        refuse("--format: this build writes no report yet; leave it out to get the result as JSON");
+    Preparation prepared;
+    prepared.locale = localeOf(options);
+    prepared.parameters = requestParameters(options);
+    if (options.configFile) prepared.configuration = readConfiguration(*options.configFile);
+    prepared.recording = recordingOf(options);
+    prepared.screen = chooseScreen(
+        options.screen, {hasTerminal(), asksForList(*prepared.parameters), options.remote.has_value()});
+    prepared.script = scriptOf(options);
+    refuseOneFileForTwo(options);
+    prepared.output = outputFile("--output", options.outputFile);
+    prepared.record = outputFile("--record", options.recordFile, kRecordingMode);
+    prepared.automation = outputFile("--automation", options.automationFile);
+    prepared.transcript = outputFile("--transcript", options.transcriptFile);
+    return prepared;
+}
+
+}  // namespace wp::host

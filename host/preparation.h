@@ -1,0 +1,33 @@
+#pragma once
+
+#include <memory>
+#include <optional>
+
+#include "exchange/recording.h"
+#include "host/arguments.h"
+#include "host/configuration.h"
+#include "host/locale.h"
+#include "host/output_file.h"
+#include "platform/value.h"
+#include "screens/remote/script.h"
+
+namespace wp::host {
+
+/// All that a run needs from files and from the command line, read and checked before anything happens.
+struct Preparation {
+    DictionaryPointer parameters;
+    LocaleChoice locale;
+    Configuration configuration;
+    std::shared_ptr<const Recording> recording;  ///< null: the run is live
+    ScreenChoice screen = ScreenChoice::none;    ///< never `automatic`
+    remote::Script script;
+    std::optional<OutputFile> output;
+    std::optional<OutputFile> record;
+    std::optional<OutputFile> automation;
+    std::optional<OutputFile> transcript;  ///< absent also for "-"
+};
+
+/// Throws `Exit` (status 2) with the first thing that is not acceptable. *Main*.
+Preparation prepare(const RunOptions& options);
+
+}  // namespace wp::host

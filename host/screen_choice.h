@@ -1,0 +1,18 @@
+#pragma once
+
+#include "host/arguments.h"
+
+namespace wp::host {
+
+/// What the choice of a screen depends on.
+struct ScreenSurroundings {
+    bool hasTerminal = false;  ///< a person at a terminal sees and presses keys there
+    bool hasList = false;      ///< the request asks for the list
+    bool hasScript = false;    ///< keys come from a remote-control script
+};
+
+/// The screen that the run is drawn on: never `automatic`. Throws `Exit` (status 2) with what to change where
+/// the wanted screen cannot do what the run needs. *Any*.
+ScreenChoice chooseScreen(ScreenChoice wanted, const ScreenSurroundings& surroundings);
+
+}  // namespace wp::host
