@@ -19,6 +19,9 @@ class ProgressView : public View {
     float progress() const { return progress_; }
     /// A value outside is taken as the nearest one inside; one that is no number as 0.
     void setProgress(float progress) { set(progress_, progress > 0 ? std::min(progress, 1.0F) : 0.0F); }
+    /// Of how many equal steps the whole consists, for a front end that says n/m; 0: not known.
+    int stepCount() const { return stepCount_; }
+    void setStepCount(int count) { set(stepCount_, count); }
     const Color& trackColor() const { return trackColor_; }
     void setTrackColor(Color color) { set(trackColor_, color); }
 
@@ -28,6 +31,7 @@ class ProgressView : public View {
   private:
     Style style_;
     float progress_ = 0;
+    int stepCount_ = 0;
     Color trackColor_ = Color::white(0.9);
 };
 

@@ -1,0 +1,128 @@
+#include "screens/terminal/list_picture.h"
+
+#include <algorithm>
+
+namespace wp::terminal {
+namespace {
+
+bool hasTitle(const ui::SettingsTableView& table, int section) {
+    const auto& title = table.titleForHeader(section);
+    return title && !title->empty();
+}
+
+int lineOf(const std::vector<ListLine>& lines, ui::IndexPath path) {
+    auto isLine = [&](const ListLine& line) { return line.kind == ListLine::Kind::row && line.path == path; };
+    return static_cast<int>(std::find_if(lines.begin(), lines.end(), isLine) - lines.begin());
+}
+
+/// Draws the lines that fall into the window.
+class ListPainter {
+  public:
+    ListPainter(Canvas& canvas, Area area, const ui::SettingsTableView& table,
+                std::optional<ui::IndexPath> focused)
+        : canvas_(canvas), area_(area), table_(table), focused_(focused), isDim_(table.alpha() < 1) {}
+
+    void drawLine(int row, const ListLine& line) {
+        if (line.kind == ListLine::Kind::header) drawHeader(row, *table_.titleForHeader(line.path.section));
+        if (line.kind == ListLine::Kind::row) drawRow(row, line.path);
+    }
+
+  private:
+    void drawHeader(int row, const std::string& title) {
+        Style style{.ink = Ink::accent, .bold = !isDim_, .dim = isDim_};
+        canvas_.put(row, area_.column,
+                    elided(cellsOf(title, canvas_.charset()), area_.columns, canvas_.charset()), style);
+    }
+
+    void drawRow(int row, ui::IndexPath path) {
+        const ui::TableViewCell& cell = *table_.cellForRow(path);
+        bool isFocused = focused_ == path;
+        bool isLive = isFocused && table_.allowsSelection();
+        Style style{.bold = isLive, .dim = isDim_ || !cell.isUserInteractionEnabled(), .reverse = isLive};
+        if (isLive) canvas_.fill(row, area_.column, area_.columns, style);
+        if (isFocused) {
+            if (isLive)
+                canvas_.put(row, area_.column, "\u25B8", ">", style);
+            else
+                canvas_.put(row, area_.column, "\u25B9", "-", style);
+        }
+        Cells name = elided(cellsOf(cell.text(), canvas_.charset()), area_.columns - 3, canvas_.charset());
+        canvas_.put(row, area_.column + 2, name, style);
+    }
+
+    Canvas& canvas_;
+    Area area_;
+    const ui::SettingsTableView& table_;
+    std::optional<ui::IndexPath> focused_;
+    bool isDim_;
+};
+
+/// Shows in the frame's right line which part of the list the window is.
+void drawScrollMark(Canvas& canvas, Area frame, int first, int height, int count) {
+    if (count <= height) return;
+    int length = std::max(1, height * height / count);
+    int top = (height - length) * first / (count - height);
+    for (int row = 0; row < length; ++row)
+        canvas.put(frame.row + 1 + top + row, frame.column + frame.columns - 1, "\u2588", "#", {});
+}
+
+}  // namespace
+
+std::vector<ListLine> linesOf(const ui::SettingsTableView& table) {
+    std::vector<ListLine> lines;
+    for (int section = 0; section < table.numberOfSections(); ++section) {
+        if (hasTitle(table, section)) {
+            if (!lines.empty()) lines.push_back({ListLine::Kind::blank, {}});
+            lines.push_back({ListLine::Kind::header, {0, section}});
+        }
+        for (int row = 0; row < table.numberOfRows(section); ++row)
+            lines.push_back({ListLine::Kind::row, {row, section}});
+    }
+    return lines;
+}
+
+int firstLineToShow(const std::vector<ListLine>& lines, std::optional<ui::IndexPath> focused, int height,
+                    int before) {
+    int count = static_cast<int>(lines.size());
+    int first = before;
+    int at = focused ? lineOf(lines, *focused) : count;
+    if (at < count) {
+        bool isUnderTitle = at > 0 && lines[static_cast<std::size_t>(at - 1)].kind == ListLine::Kind::header;
+        first = std::max(first, at - height + 1);
+        first = std::min(first, isUnderTitle && height > 1 ? at - 1 : at);
+    }
+    return std::clamp(first, 0, std::max(0, count - height));
+}
+
+void drawList(Canvas& canvas, Area area, const ui::SettingsTableView& table,
+              std::optional<ui::IndexPath> focused, int& firstLine) {
+    Style frame{.dim = true};
+    drawFrame(canvas, area, frame);
+    Area inner{area.row + 1, area.column + 2, area.rows - 2, area.columns - 4};
+    std::vector<ListLine> lines = linesOf(table);
+    firstLine = firstLineToShow(lines, table.lastFocusedIndexPath(), inner.rows, firstLine);
+    ListPainter painter(canvas, inner, table, focused);
+    int count = static_cast<int>(lines.size());
+    for (int row = 0; row < inner.rows && firstLine + row < count; ++row)
+        painter.drawLine(inner.row + row, lines[static_cast<std::size_t>(firstLine + row)]);
+    drawScrollMark(canvas, area, firstLine, inner.rows, count);
+}
+
+void drawFrame(Canvas& canvas, Area area, Style style) {
+    int right = area.column + area.columns - 1;
+    int bottom = area.row + area.rows - 1;
+    for (int column = area.column + 1; column < right; ++column) {
+        canvas.put(area.row, column, "\u2500", "-", style);
+        canvas.put(bottom, column, "\u2500", "-", style);
+    }
+    for (int row = area.row + 1; row < bottom; ++row) {
+        canvas.put(row, area.column, "\u2502", "|", style);
+        canvas.put(row, right, "\u2502", "|", style);
+    }
+    canvas.put(area.row, area.column, "\u250C", "+", style);
+    canvas.put(area.row, right, "\u2510", "+", style);
+    canvas.put(bottom, area.column, "\u2514", "+", style);
+    canvas.put(bottom, right, "\u2518", "+", style);
+}
+
+}  // namespace wp::terminal
