@@ -1,6 +1,8 @@
 #include "host/front_ends.h"
 
 #include "host/exit.h"
+#include "screens/headless/headless_screen.h"
+#include "screens/terminal/terminal_screen.h"
 
 namespace wp::host {
 namespace {
@@ -18,13 +20,27 @@ class NoScreen final : public ui::FrontEnd {
     MainQueue& queue_;
 };
 
-}  // namespace
-
-std::unique_ptr<ui::FrontEnd> makeFrontEnd(ScreenChoice choice, ui::Screen& /*screen*/, MainQueue& queue) {
-    if (choice != ScreenChoice::none) refuse("--screen: this build has no screen yet; give none");
-    return std::make_unique<NoScreen>(queue);
+std::unique_ptr<ui::FrontEnd> makeTerminal(ui::Screen& screen, MainQueue& queue) {
+    terminal::TerminalScreen::Opened opened = terminal::TerminalScreen::open(screen, queue);
+    if (const std::string* why = std::get_if<std::string>(&opened)) refuse("--screen: terminal: " + *why);
+    return std::get<std::unique_ptr<terminal::TerminalScreen>>(std::move(opened));
 }
 
-void restoreTerminal() {}
+}  // namespace
+
+std::unique_ptr<ui::FrontEnd> makeFrontEnd(ScreenChoice choice, ui::Screen& screen, MainQueue& queue) {
+    switch (choice) {
+        case ScreenChoice::terminal:
+            return makeTerminal(screen, queue);
+        case ScreenChoice::headless:
+            return std::make_unique<headless::HeadlessScreen>(screen, queue);
+        default:
+            return std::make_unique<NoScreen>(queue);
+    }
+}
+
+void restoreTerminal() {
+    terminal::TerminalScreen::restoreNow();
+}
 
 }  // namespace wp::host

@@ -24,6 +24,7 @@
 #include "platform/extension.h"
 #include "platform/main_queue.h"
 #include "platform/ui/screen.h"
+#include "screens/remote/remote_control.h"
 
 namespace wp::host {
 namespace {
@@ -145,11 +146,9 @@ std::optional<std::string> Run::drive() {
     if (prepared_.screen == ScreenChoice::terminal && isatty(STDERR_FILENO)) log_.hold();
     cancellable_ = &progress_;
     if (!isBrokenOff()) controller_->start();
-    activity_.setIdleHandler([this] { mainQueue_.wake(); });
-    frontEnd->runUntil([this] { return isOver() || (activity_.idle() && !mainQueue_.hasEventsToCome()); });
-    activity_.setIdleHandler(nullptr);
-    if (isOver()) return std::nullopt;
-    return "the diagnostic stopped before its end";
+    remote::RemoteControl remote({screen_, *frontEnd, mainQueue_, activity_, [this] { return isOver(); },
+                                  [this](std::string_view line) { transcript_->add(line); }});
+    return remote.play(prepared_.script);
 }
 
 void Run::tearDown(bool hasObstacle) {
