@@ -14,11 +14,21 @@
 #include "platform/extension.h"
 #include "platform/records.h"
 #include "platform/synchronized.h"
+#include "platform/ui/controls.h"
+#include "platform/ui/label.h"
+#include "platform/ui/table_view.h"
 #include "platform/wifi_manager.h"
 
 namespace wp {
 
+class NetworkDictionary;
+class WiFiHeaderView;
+struct ScanJob;
+struct ScanList;
 struct TestRow;
+
+using NetworkArray = std::vector<WiFiScanResultPointer>;
+std::shared_ptr<ScanList> makeScanList();
 
 /// The controller of the Wi-Fi diagnostic: one object lives for one run and owns all of its state.
 ///
@@ -48,14 +58,21 @@ struct TestRow;
 ///   8. Current-network tests: connectivity              tests/connectivity_tests.cpp
 ///   9. Current-network tests: channel, signal, scan     tests/channel_tests.cpp
 ///  10. Selected-network tests                           tests/selected_network_tests.cpp
-///  11. Network list                                     network_list/
-class WiFiProfileViewController final : public DiagnosticViewController {
+///  11. Scan list model                                  network_list/scan_list_model.cpp
+///  12. Incremental list update                          network_list/list_update.cpp
+///  13. Selection, confirmation, other network           network_list/selection.cpp
+///  14. Network list table                               network_list/table.cpp
+///  15. Screen layout and views                          network_list/screen_layout.cpp
+class WiFiProfileViewController final : public DiagnosticViewController,
+                                        public ui::TableViewDataSource,
+                                        public ui::TableViewDelegate {
   public:
     using Configuration = const DictionaryPointer&;
     using Results = const DictionaryPointer&;
 
     /// *Main*. The platform outlives the controller and every block of it.
     explicit WiFiProfileViewController(Platform& platform) : platform_(platform) {}
+    ~WiFiProfileViewController() override;
 
     // 1. Life of a run -- lifecycle/run.cpp
     // ------------------------------------------------------------------
@@ -154,6 +171,10 @@ class WiFiProfileViewController final : public DiagnosticViewController {
 
     /// Counts one more test as done and lets the bar follow on the main queue. *Any* thread; returns at once.
     void updateProgress();
+
+    /// Builds a progress screen from scratch, in place of the list. Nothing in a run calls it: a run turns the
+    /// screen that it has into one by `showProgress`. *Main*.
+    void displayProgressScreen();
 
     bool progressScreenVisible() const { return progressScreenVisible_; }
     /// Tests done so far, and tests that this run performs: 11, 27, 40 or 56. *Any* thread.
@@ -278,19 +299,153 @@ class WiFiProfileViewController final : public DiagnosticViewController {
     void runSelectedNetworkConflictingCountryCode();
     void runSelectedNetworkPoorSignal();
 
-    // 11. Network list -- network_list/
-    // ----------------------------------------------------------------------
+    // 11. Scan list model -- network_list/scan_list_model.cpp
+    // ---------------------------------------------------------- The list is built in the background, in a
+    // job that holds copies of all that it depends on, and published on the main queue by the step that shows
+    // it. So the table's data source never changes under the table, and no lock is needed.
 
-    /// Marks a scan as under way, and as done.
+    /// Rebuilds the job's collections from its scan: one entry per name, the strongest; the joined access
+    /// point only in `distinctNetworks`; the joined network's other access points nowhere. *Background*.
+    void dedupScanResultsToHighestRSSI(ScanJob& job) const;
+
+    /// After the first scan: where another network than the joined one is selected, takes it out of the
+    /// choosable ones and puts the joined one in. *Background*.
+    void updateFilteredNetworkListIfNeeded(ScanJob& job) const;
+
+    /// Sorts the choosable networks by name in the user's collation, case ignored; stable. *Any* thread, on a
+    /// list that no other one uses.
+    void sortWiFiScanResults(ScanList& list) const;
+
+    /// Appends the network to the choosable ones, removes it from them; null does nothing. *Main*.
+    void addNetworkToFilteredNetworkList(const WiFiScanResultPointer& network);
+    void removeNetworkFromFilteredNetworkList(const WiFiScanResultPointer& network);
+
+    /// Scans again and applies the difference to the table. The sender is ignored. *Main*; returns at once.
+    void refreshNetworkList(const void* sender);
+
+    /// Every network that can be named, by name. *Main*, as all of these.
+    const NetworkDictionary& distinctNetworks() const;
+    /// The choosable networks, by name and in the order in which the table shows them.
+    const NetworkDictionary& filteredNetworks() const;
+    const NetworkArray& filteredWiFiScanResults() const;
+    /// The choosable networks as they were when the latest rescan began.
+    const NetworkDictionary& previousScanFilteredNetworks() const;
+    const NetworkArray& previousScanFilteredWiFiScanResults() const;
+    /// The joined access point in the latest scan that heard it; null before one did.
+    const WiFiScanResultPointer& currentNetwork() const { return currentNetwork_; }
+    /// False while a scan is under way. *Any* thread.
+    bool scanFinished() const { return scanFinished_; }
+    /// Whether the row that scans again may be used: once the first list is shown.
+    bool refreshEnabled() const { return refreshEnabled_; }
+
+    // 12. Incremental list update -- network_list/list_update.cpp
+    // ------------------------------------------------------ All *Main*. Networks are matched by name, exactly:
+    // one that changed its strength keeps its row.
+
+    /// Inserts the rows of the first list.
+    void loadInitialNetworkList();
+    /// Applies the difference between the list before the rescan and the one after it.
+    void updateNetworkList();
+    void deleteLostNetworks();
+    void insertNewNetworks();
+
+    // 13. Selection, confirmation, other network -- network_list/selection.cpp
+    // ----------------------------------------- All *Main*. The selection is a name and nothing else.
+
+    /// Asks the user to confirm the network (null: the selected name, which no scan has shown); "yes" makes it
+    /// the selected one where `shouldUpdate` says so, and runs the tests.
+    void presentNetworkConfirmationAlertWithNetwork(const WiFiScanResultPointer& network, bool shouldUpdate);
+    /// Makes a choosable network the selected one; the one selected before becomes choosable again.
+    void updateSelectedNetwork(const WiFiScanResultPointer& network);
+    /// Replaces the selected network's row, or creates it where there was none.
+    void reloadSelectedNetwork(bool hadSelection);
+    /// Deletes that row of the choosable networks.
+    void deleteSelectedNetwork(int row);
+    /// Inserts the row of a network that has become choosable again.
+    void insertPreviousSelectedNetwork(const WiFiScanResultPointer& network);
+    /// Asks the user to type a name.
+    void askForSSID();
+    /// Lets the typed name be taken over only while there is one.
+    void textFieldAlertDidChange(ui::TextField& textField);
+    /// Makes the typed name the selected one. It is taken as it stands, blanks included.
+    void updateSelectedNetworkFromOtherWithSSID(const std::string& ssid);
+
+    /// The name that was selected before the latest change.
+    const std::optional<std::string>& previousSelectedNetworkName() const {
+        return previousSelectedNetworkName_;
+    }
+
+    // 14. Network list table -- network_list/table.cpp
+    // ----------------------------------------------------------------- All *Main*, but for the spinner.
+
+    /// Runs the first scan in the background and shows the list; returns at once.
+    void displayNetworkList();
+    void setupRefreshControl();
+    /// Marks a scan as under way, and as done. *Any* thread.
     void showSpinner();
     void hideSpinner();
-    /// Runs the first scan in the background and shows the list. *Main*; returns at once.
-    void displayNetworkList();
-    /// Builds the screen's views. *Main*.
+    /// Whether rows can be selected.
+    void enableTableViewSelection(bool enable);
+    /// Deliberately nothing, both: the screen has no buttons in its bar, and the callers keep calling.
+    void enableRightBarButtonItem(bool enable);
+    void removeNavigationBarButtons();
+    /// Works out anew whether the row that scans again takes touches.
+    void reloadRefreshCell();
+    void scrollToSelectedNetwork();
+    void scrollToLastFocusedItem();
+    /// One more than there are choosable networks.
+    int networksOffset() const;
+
+    int numberOfSectionsInTableView(ui::SettingsTableView& tableView) override;
+    int tableViewNumberOfRowsInSection(ui::SettingsTableView& tableView, int section) override;
+    std::optional<std::string> tableViewTitleForHeaderInSection(ui::SettingsTableView& tableView,
+                                                                int section) override;
+    std::shared_ptr<ui::TableViewCell> tableViewCellForRowAtIndexPath(ui::SettingsTableView& tableView,
+                                                                      ui::IndexPath indexPath) override;
+    double tableViewHeightForHeaderInSection(ui::SettingsTableView& tableView, int section) override;
+    double tableViewHeightForFooterInSection(ui::SettingsTableView& tableView, int section) override;
+    void tableViewDidSelectRowAtIndexPath(ui::SettingsTableView& tableView, ui::IndexPath indexPath) override;
+    bool tableViewCanFocusRowAtIndexPath(ui::SettingsTableView& tableView, ui::IndexPath indexPath) override;
+    std::optional<ui::IndexPath> indexPathForPreferredFocusedViewInTableView(
+        ui::SettingsTableView& tableView) override;
+    /// Attached to the top of the screen.
+    static constexpr int kBarPositionTopAttached = 3;
+    int positionForBar() const { return kBarPositionTopAttached; }
+
+    // 15. Screen layout and views -- network_list/screen_layout.cpp
+    // ---------------------------------------------------- All *Main*. Null before the views are built.
+
+    /// Builds the screen. The argument is not consulted: the table is always there.
     void setupViewWithNetworkList(bool withNetworkList);
 
-    bool scanFinished() const { return scanFinished_; }
-    bool refreshEnabled() const { return refreshEnabled_; }
+    bool prefersStatusBarHidden() const override { return false; }
+    bool shouldAutorotate() const override { return false; }
+    unsigned supportedInterfaceOrientations() const override { return ui::kOrientationMaskPortrait; }
+    ui::InterfaceOrientation preferredInterfaceOrientationForPresentation() const override {
+        return ui::InterfaceOrientation::portrait;
+    }
+    void updateViewConstraints() override;
+    std::string screenName() const override { return progressScreenVisible_ ? "progress" : "list"; }
+
+    const std::shared_ptr<ui::SettingsTableView>& tableView() const { return tableView_; }
+    const std::shared_ptr<ui::Label>& descriptionLabel() const { return descriptionLabel_; }
+    const std::shared_ptr<ui::Label>& mainLabel() const { return mainLabel_; }
+    const std::shared_ptr<ui::ProgressView>& progressView() const { return progressView_; }
+    const std::shared_ptr<ui::Label>& navigationBarLabel() const { return navigationBarLabel_; }
+    double tableViewWidth() const { return tableViewWidth_; }
+    const ui::EdgeInsets& tableViewPadding() const { return tableViewPadding_; }
+    const ui::EdgeInsets& tableViewContentInsets() const { return tableViewContentInsets_; }
+    /// Declared for headers of the table; nothing assigns them, so what is told to their spinners shows
+    /// nothing.
+    const std::shared_ptr<WiFiHeaderView>& networksGroupHeaderView() const {
+        return networksGroupHeaderView_;
+    }
+    const std::shared_ptr<WiFiHeaderView>& selectedNetworkHeaderView() const {
+        return selectedNetworkHeaderView_;
+    }
+    /// Nothing assigns or reads the images: rows show only their text.
+    const std::shared_ptr<ui::ImageView>& blueCheck() const { return blueCheck_; }
+    const std::shared_ptr<ui::ImageView>& spacer() const { return spacer_; }
 
   private:
     /// The controller as a block keeps it.
@@ -376,9 +531,52 @@ class WiFiProfileViewController final : public DiagnosticViewController {
 
     Synchronized<ArrayPointer> wifiScanResults_;
 
-    // 11. Network list
+    // 11. Scan list model
+    enum class Scan { first, again };
+    std::shared_ptr<ScanJob> beginScanJob(Scan scan) const;
+    void scanForJob(ScanJob& job);
+    void rebuild(ScanJob& job) const;
+    void exchangeInRescan(ScanJob& job) const;
+    void publish(ScanJob& job);
+    void showRescan(ScanJob& job);
+    ScanList& mutableList();
+
+    std::shared_ptr<ScanList> list_ = makeScanList();
+    std::shared_ptr<ScanList> previousList_ = makeScanList();
+    WiFiScanResultPointer currentNetwork_;
     std::atomic<bool> scanFinished_ = false;
     bool refreshEnabled_ = false;
+
+    // 13. Selection, confirmation, other network
+    void selectName(const std::optional<std::string>& name);
+    void takeFromList(const WiFiScanResultPointer& network);
+    void putBackPreviousNetwork();
+
+    std::optional<std::string> previousSelectedNetworkName_;
+
+    // 14. Network list table
+    void adoptConnectedName(const std::optional<std::string>& connectedName);
+    void showFirstList(ScanJob& job);
+    std::string textOfRow(ui::IndexPath indexPath) const;
+    bool rowTakesTouches(ui::IndexPath indexPath) const;
+
+    // 15. Screen layout and views
+    void buildTable(const std::shared_ptr<ui::View>& root);
+    void buildContent(const std::shared_ptr<ui::View>& root);
+    void buildNavigationBar(const std::shared_ptr<ui::View>& root);
+
+    std::shared_ptr<ui::SettingsTableView> tableView_;
+    std::shared_ptr<ui::Label> descriptionLabel_;
+    std::shared_ptr<ui::Label> mainLabel_;
+    std::shared_ptr<ui::ProgressView> progressView_;
+    std::shared_ptr<ui::Label> navigationBarLabel_;
+    std::shared_ptr<WiFiHeaderView> networksGroupHeaderView_;
+    std::shared_ptr<WiFiHeaderView> selectedNetworkHeaderView_;
+    std::shared_ptr<ui::ImageView> blueCheck_;
+    std::shared_ptr<ui::ImageView> spacer_;
+    double tableViewWidth_ = 0;
+    ui::EdgeInsets tableViewPadding_;
+    ui::EdgeInsets tableViewContentInsets_;
 };
 
 }  // namespace wp
