@@ -1,0 +1,78 @@
+#include "service/address_configuration.h"
+
+#include <algorithm>
+
+namespace wp {
+namespace {
+
+bool isOneOf(const std::string& method, std::initializer_list<std::string_view> methods) {
+    return std::find(methods.begin(), methods.end(), method) != methods.end();
+}
+
+bool contains(const std::vector<IPAddress>& list, const IPAddress& address) {
+    return std::find(list.begin(), list.end(), address) != list.end();
+}
+
+}  // namespace
+
+Known<std::string> methodFromIPv4Addresses(const std::vector<AssignedAddress>& addresses, bool hasLease) {
+    bool any = false;
+    for (const AssignedAddress& each : addresses) {
+        if (!each.address.isIPv4() || each.address.loopback() || each.address.unspecified()) continue;
+        // A client without a manager may set its address without an end, but it leaves a lease behind.
+        if (each.permanent && !each.address.linkLocal() && !hasLease) return std::string("static");
+        any = true;
+    }
+    if (any || hasLease) return std::string("dynamic");
+    return failure(Reason::unavailable, "no manager tells how IPv4 is set up, and there is no address");
+}
+
+Known<std::string> methodFromIPv6Addresses(const std::vector<AssignedAddress>& addresses,
+                                           const KernelIPv6& kernel) {
+    if (kernel.disabled) return std::string("disabled");
+    bool dynamic = false;
+    for (const AssignedAddress& each : addresses) {
+        if (each.address.isIPv4() || each.address.linkLocal() || each.address.loopback()) continue;
+        if (each.permanent && !each.byAdvertisement) return std::string("static");
+        dynamic = true;
+    }
+    if (dynamic || kernel.acceptsAdvertisements) return std::string("dynamic");
+    return std::string("link-local");
+}
+
+Outcome usesCustomIPv4(const AddressMethods& methods) {
+    if (!methods.ipv4) return methods.ipv4.error();
+    return problem(!isOneOf(*methods.ipv4, {"auto", "dhcp", "dynamic"}),
+                   {{"IPv4ConfigMethod", *methods.ipv4}});
+}
+
+Outcome usesCustomIPv6(const AddressMethods& methods) {
+    if (!methods.ipv6) return methods.ipv6.error();
+    return problem(!isOneOf(*methods.ipv6, {"auto", "dhcp", "dynamic"}),
+                   {{"IPv6ConfigMethod", *methods.ipv6}});
+}
+
+Outcome usesCustomNameServers(const Known<NameServers>& servers) {
+    if (!servers) return servers.error();
+    if (!servers->manual.empty()) return problem(true);
+    bool hidden = false;
+    for (const IPAddress& server : servers->effective) {
+        if (server.loopback())
+            hidden = true;
+        else if (!contains(servers->offered, server) && servers->offerKnown)
+            return problem(true);
+    }
+    if (hidden)
+        return failure(Reason::unavailable, "a resolver on the device does not tell which servers it asks");
+    if (!servers->offerKnown && !servers->effective.empty())
+        return failure(Reason::unavailable,
+                       "no lease or manager tells which name servers the network offers");
+    return problem(false);
+}
+
+Outcome usesCustomWebProxy(const Known<WebProxyPlaces>& places) {
+    if (!places) return places.error();
+    return problem(!places->empty());
+}
+
+}  // namespace wp

@@ -1,0 +1,63 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "service/ip_address.h"
+#include "service/outcome.h"
+
+namespace wp {
+
+/// How the interface gets its addresses, in the words of the connection manager: "auto", "dhcp", "manual",
+/// "link-local", "shared", "ignore", "disabled". Where no manager tells and the addresses themselves had to
+/// be looked at: "dynamic" or "static".
+struct AddressMethods {
+    Known<std::string> ipv4;
+    Known<std::string> ipv6;
+};
+
+/// One address as the kernel keeps it, for devices without a manager that tells.
+struct AssignedAddress {
+    IPAddress address;
+    bool permanent = false;        ///< without an end to its life
+    bool byAdvertisement = false;  ///< the kernel made it of a router's advertisement, or as a link-local one
+};
+
+/// The kernel's own switches for IPv6 on the interface.
+struct KernelIPv6 {
+    bool disabled = false;
+    bool acceptsAdvertisements = true;
+};
+
+/// The method of IPv4 as the addresses give it away: an address without an end that no lease accounts for was
+/// put there by hand. No address at all tells nothing. *Any* thread.
+Known<std::string> methodFromIPv4Addresses(const std::vector<AssignedAddress>& addresses, bool hasLease);
+/// The same for IPv6. *Any* thread.
+Known<std::string> methodFromIPv6Addresses(const std::vector<AssignedAddress>& addresses,
+                                           const KernelIPv6& kernel);
+
+/// Test 14: whether IPv4 is set up in any other way than by itself. Information: "IPv4ConfigMethod".
+Outcome usesCustomIPv4(const AddressMethods& methods);
+/// Test 15: the same for IPv6; switched off counts as custom. Information: "IPv6ConfigMethod".
+Outcome usesCustomIPv6(const AddressMethods& methods);
+
+/// The name servers of the interface, by where they come from.
+struct NameServers {
+    std::vector<IPAddress> manual;     ///< entered by a person
+    std::vector<IPAddress> effective;  ///< those that are asked, behind a resolver on the device itself
+    std::vector<IPAddress> offered;    ///< by DHCP or a router's advertisement
+    bool offerKnown = false;           ///< whether what the network offers could be read at all
+};
+
+/// Test 16: whether a name server was entered by hand, or one is asked that the network did not offer. A
+/// resolver on the device itself whose own servers are not known cannot be judged.
+Outcome usesCustomNameServers(const Known<NameServers>& servers);
+
+/// Where a proxy is set, for example "environment: https_proxy"; empty when nowhere.
+using WebProxyPlaces = std::vector<std::string>;
+
+/// Test 17: whether a proxy, or a script that finds one, is set anywhere. One that the network offers by DHCP
+/// is not the device's own setting and does not count.
+Outcome usesCustomWebProxy(const Known<WebProxyPlaces>& places);
+
+}  // namespace wp

@@ -1,0 +1,76 @@
+#include "service/captive_portal.h"
+
+namespace wp {
+namespace {
+
+using End = PortalAnswer::End;
+
+PortalVerdict verdict(bool captive, std::string why) {
+    return {captive, std::move(why)};
+}
+
+bool isRedirect(int status) {
+    return status >= 300 && status <= 399 && status != 304;
+}
+
+bool opens(const PortalAnswer& secure) {
+    return secure.end == End::answered && secure.status >= 200 && secure.status <= 299;
+}
+
+Known<PortalVerdict> judgePlain(const PortalAnswer& plain, const PortalAnswer& secure) {
+    const std::string status = std::to_string(plain.status);
+    if (plain.status == 204) return verdict(false, "open: status 204");
+    if (plain.status == 511) return verdict(true, "status 511");
+    if (isRedirect(plain.status))
+        return verdict(true, plain.location.empty() ? "suspected: status " + status + " to nowhere"
+                                                    : "redirected with status " + status);
+    // One byte is what some proxies add to an empty page.
+    if (plain.status == 200 && plain.bodySize <= 1) {
+        if (opens(secure)) return verdict(false, "open: an empty page, and the secure probe got through");
+        return failure(Reason::timeout, "an empty page over HTTP and no answer over HTTPS");
+    }
+    if (plain.status >= 200 && plain.status <= 399) return verdict(true, "suspected: status " + status);
+    if (opens(secure)) return verdict(false, "partial: status " + status + " over HTTP, HTTPS got through");
+    return failure(Reason::timeout, "status " + status + " over HTTP and no answer over HTTPS");
+}
+
+const SavedNetwork* remembered(const Known<SavedNetworks>& saved, const NetworkName& name) {
+    return saved ? findSaved(*saved, name) : nullptr;
+}
+
+Dictionary::Entries information(const SavedNetwork* network, bool seenSeveralAPs) {
+    if (network == nullptr) return {};
+    return {{"PreferredNetwork", recordOf(*network, seenSeveralAPs)}};
+}
+
+}  // namespace
+
+Known<PortalVerdict> judgePortal(const PortalEvidence& evidence) {
+    if (evidence.declared.unrestricted) return verdict(false, "the network says that it has no portal");
+    if (evidence.declared.captive)
+        return verdict(*evidence.declared.captive, "the network's own API says so");
+    if (evidence.plain.end == End::answered) return judgePlain(evidence.plain, evidence.secure);
+    if (opens(evidence.secure)) return verdict(false, "partial: HTTPS got through, HTTP did not");
+    if (evidence.plain.server && evidence.plain.server->privateUse())
+        return verdict(false, "no Internet: the probe's name has the private address " +
+                                  evidence.plain.server->text() + ", and nothing answers there");
+    return failure(Reason::timeout, "no probe was answered: " + evidence.plain.why);
+}
+
+Outcome isCaptive(const Known<PortalEvidence>& evidence, const Known<SavedNetworks>& saved,
+                  const NetworkName& name, bool seenSeveralAPs) {
+    if (!evidence) return evidence.error();
+    const auto judged = judgePortal(*evidence);
+    if (!judged) return judged.error();
+    return problem(judged->captive, information(remembered(saved, name), seenSeveralAPs));
+}
+
+Outcome isRememberedAsCaptive(const Known<SavedNetworks>& saved, const NetworkName& name,
+                              bool seenSeveralAPs) {
+    if (!saved) return saved.error();
+    const SavedNetwork* network = remembered(saved, name);
+    if (network == nullptr) return failure(Reason::notFound, "no remembered network has this name");
+    return problem(network->captive, information(network, seenSeveralAPs));
+}
+
+}  // namespace wp

@@ -1,0 +1,53 @@
+#pragma once
+
+#include <optional>
+#include <vector>
+
+#include "service/channel_load.h"
+#include "service/outcome.h"
+
+namespace wp {
+
+/// When a channel counts as congested.
+struct CongestionLimits {
+    /// Share of foreign airtime. Guides for voice and video over Wi-Fi plan for less than one half; delays
+    /// grow steeply from 40 to 50 % on.
+    double load = 0.50;
+    /// The same one half on the scale of the BSS Load element, 0 to 255.
+    unsigned advertisedLoad = 128;
+    /// Sum of overlapping access points, as `overlapWeight` counts them, where nothing was measured: three
+    /// that are near share out half of the air in a busy evening. No source names a number.
+    double overlap = 3.0;
+};
+
+/// What the radio knows of the air around.
+struct AirFacts {
+    Known<std::vector<AccessPoint>> nearby;
+    Known<Airtime> airtime;
+    Known<AllowedChannels> allowed;
+};
+
+/// The channels that would be better, by number; a band that the radio does not have, or that was not heard,
+/// has none.
+struct Recommendation {
+    std::optional<int> ghz2;
+    std::optional<int> ghz5;
+    std::optional<int> ghz5Wide;  ///< primary channel of the best pair of 40 MHz
+    std::optional<int> ghz5NoRadar;
+};
+
+/// The least occupied channels. Of equals the joined network's own channel is kept, then the lower number
+/// wins. \param own the access point that is joined; null where none is
+Recommendation recommend(const AirFacts& air, const AccessPoint* own);
+
+/// Test 24: whether the judged access point's channel is congested. For the joined network what the radio
+/// measured on its channel comes first, for another one what its access point advertises. Information:
+/// "CurrentChannel" and the four recommendations.
+Outcome channelIsCongested(const AccessPoint& judged, const AirFacts& air, const AccessPoint* own,
+                           const CongestionLimits& limits = {});
+/// Test 25: whether every one of the channels 1, 6 and 11 is congested. Information: the recommendations.
+Outcome band2IsCongested(const AirFacts& air, const AccessPoint* own, const CongestionLimits& limits = {});
+/// Test 26: the same for every channel of 5 GHz that is allowed here.
+Outcome band5IsCongested(const AirFacts& air, const AccessPoint* own, const CongestionLimits& limits = {});
+
+}  // namespace wp

@@ -1,0 +1,59 @@
+#pragma once
+
+#include <chrono>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "service/ip_address.h"
+#include "service/outcome.h"
+
+namespace wp {
+
+/// What became of a name that the link's own name servers were asked for.
+struct NameAnswer {
+    std::string name;
+    std::vector<IPAddress> addresses;
+    std::string why;  ///< where there is no address: what the servers said
+    std::chrono::milliseconds took{0};
+};
+
+/// An answer slower than the first is slow, slower than the second a problem; for the log only. (A desktop
+/// system's own latency check of names goes by these.)
+inline constexpr std::chrono::milliseconds kSlowName{400}, kVerySlowName{500};
+
+/// Test 7: whether a name outside resolves. Only an address that can lead outside counts: gateways that show
+/// their own page answer with a private one.
+Outcome resolvesNames(const Known<NameAnswer>& answer);
+
+/// What became of a connection to the vendor's service.
+struct ServiceContact {
+    enum class End {
+        reached,         ///< connected and, over TLS, with a certificate that holds
+        failed,          ///< no address, no connection, or another one than the vendor's at the other end
+        badCertificate,  ///< connected, but the certificate does not hold
+    };
+    End end = End::failed;
+    std::string why;   ///< of a failure
+    int status = 0;    ///< of HTTP
+    std::string body;  ///< at most 64 KiB
+};
+
+/// What counts as the vendor's content: status 204, or 200 with a body that begins with the text.
+struct ExpectedContent {
+    std::string bodyPrefix;
+};
+
+/// Whether the device's clock can be right: not before the day on which the program was built.
+struct ClockCheck {
+    bool beforeBuild = false;
+};
+
+/// Test 9: whether the vendor's service can be reached, up to a secure connection. A certificate that does
+/// not hold on a device whose clock is wrong says nothing about the network.
+Outcome reachesVendor(const Known<ServiceContact>& contact, const ClockCheck& clock);
+/// Test 11: whether the vendor's content arrives unaltered.
+Outcome retrievesFromVendor(const Known<ServiceContact>& contact, const ExpectedContent& expected,
+                            const ClockCheck& clock);
+
+}  // namespace wp

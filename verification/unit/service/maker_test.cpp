@@ -1,0 +1,98 @@
+#include "service/maker.h"
+
+#include <gtest/gtest.h>
+
+#include "service/plain_text.h"
+#include "verification/unit/service/finding.h"
+#include "verification/unit/service/frames.h"
+
+namespace wp {
+namespace {
+
+Frame attribute(unsigned type, std::string_view text) {
+    return Frame{static_cast<std::uint8_t>(type >> 8), static_cast<std::uint8_t>(type),
+                 static_cast<std::uint8_t>(text.size() >> 8), static_cast<std::uint8_t>(text.size())} +
+           Frame(text.begin(), text.end());
+}
+
+constexpr std::uint32_t kWps = 0x0050F204;
+const Vendors::BaseStation kExample{{"Example Networks"}, {{0x02, 0x11, 0x22}}};
+
+TEST(WpsDescription, IsReadFromAttributesSpreadOverElements) {
+    const Frame all = attribute(0x104A, "\x10") + attribute(0x1021, "Example Networks GmbH") +
+                      attribute(0x1023, " Base 5 ") + attribute(0x1024, "v2") + attribute(0x1011, "Attic");
+    const Frame first(all.begin(), all.begin() + 20), second(all.begin() + 20, all.end());
+
+    const WpsDescription read = decodeWps(vendorElement(kWps, first) + vendorElement(kWps, second));
+
+    EXPECT_EQ(read.manufacturer, "Example Networks GmbH");
+    EXPECT_EQ(read.modelName, "Base 5");
+    EXPECT_EQ(read.modelNumber, "v2");
+    EXPECT_EQ(read.deviceName, "Attic");
+}
+
+TEST(WpsDescription, AnAttributeThatReachesBeyondTheEndEndsIt) {
+    Frame cut = attribute(0x1021, "Example") + attribute(0x1023, "Model");
+    cut.resize(cut.size() - 2);
+    const WpsDescription read = decodeWps(vendorElement(kWps, cut));
+    EXPECT_EQ(read.manufacturer, "Example");
+    EXPECT_EQ(read.modelName, "");
+    EXPECT_EQ(decodeWps(vendorElement(kWps, {0x10})).manufacturer, "");
+    EXPECT_EQ(decodeWps({}).manufacturer, "");
+}
+
+TEST(PlainText, KeepsUtf8EscapesOtherBytesAndDropsControls) {
+    EXPECT_EQ(plainText("  B\xC3\xBCro \xE2\x82\xAC "), "B\xC3\xBCro \xE2\x82\xAC");
+    EXPECT_EQ(plainText("a\xFFz\xC3"), "a\\xFFz\\xC3");
+    EXPECT_EQ(plainText("a\x1B[2Jz\n\x7F\xC2\x9B"), "a[2Jz");
+    EXPECT_EQ(plainText("\xED\xA0\x80"), "\\xED\\xA0\\x80");
+    EXPECT_EQ(plainText("\xC0\xAF"), "\\xC0\\xAF");
+    EXPECT_EQ(plainText("abcdef", 3), "abc");
+    EXPECT_EQ(plainText("   "), "");
+}
+
+TEST(VendorBaseStation, IsKnownByItsMakersNameWithoutCase) {
+    const AccessPoint ours =
+        heard(vendorElement(kWps, attribute(0x1021, "EXAMPLE networks") + attribute(0x1023, "Base 5")));
+    const AccessPoint other = heard(vendorElement(kWps, attribute(0x1021, "Sample Networks")));
+
+    const Outcome outcome = isVendorBaseStation(ours, std::nullopt, kExample);
+
+    EXPECT_TRUE(found(outcome));
+    EXPECT_TRUE(outcome->didPass);
+    EXPECT_EQ(informationOf(outcome, "MarlixModelName"), Value("Base 5"));
+    EXPECT_FALSE(found(isVendorBaseStation(other, std::nullopt, kExample)));
+}
+
+TEST(VendorBaseStation, IsKnownByItsAddressAndTakesTheRoutersModel) {
+    AccessPoint ours = heard(nameElement("Home"));
+    ours.address = {0x02, 0x11, 0x22, 0x33, 0x44, 0x55};
+    const RouterDescription router{"Someone", "Router 7", "Attic"};
+    EXPECT_EQ(informationOf(isVendorBaseStation(ours, router, kExample), "MarlixModelName"),
+              Value("Router 7"));
+    EXPECT_EQ(isVendorBaseStation(ours, std::nullopt, kExample)->info, nullptr);
+}
+
+TEST(VendorBaseStation, IsKnownByWhatTheRouterSays) {
+    const AccessPoint plain = heard(nameElement("Home"));
+    EXPECT_TRUE(found(isVendorBaseStation(plain, RouterDescription{"Example Networks", "", ""}, kExample)));
+    EXPECT_FALSE(found(isVendorBaseStation(plain, RouterDescription{"", "", ""}, {{""}, {}})));
+}
+
+TEST(VendorHotspot, IsKnownByAnElementAnAddressOrALease) {
+    const Vendors::Hotspot byElement{{{{0xAA, 0xBB, 0xCC}, std::uint8_t{9}}}, {}, {}};
+    EXPECT_TRUE(found(isVendorHotspot(heard(vendorElement(0xAABBCC09)), "", byElement)));
+    EXPECT_FALSE(found(isVendorHotspot(heard(vendorElement(0xAABBCC08)), "", byElement)));
+    EXPECT_FALSE(found(isVendorHotspot(heard(element(221, {0xAA, 0xBB, 0xCC})), "", byElement)));
+
+    AccessPoint phone = heard(nameElement("Phone"));
+    phone.address = {0x02, 0x1A, 0x11, 0xF0, 0x01, 0x02};
+    EXPECT_TRUE(found(isVendorHotspot(phone, "", {{}, {{0x02, 0x1A, 0x11}}, {}})));
+    EXPECT_FALSE(found(isVendorHotspot(phone, "", {{}, {{0x02, 0x1A, 0x12}, {}}, {}})));
+
+    EXPECT_TRUE(found(isVendorHotspot(phone, "x EXAMPLE_METERED", {{}, {}, {"EXAMPLE_METERED"}})));
+    EXPECT_FALSE(found(isVendorHotspot(phone, "", {{}, {}, {"EXAMPLE_METERED", ""}})));
+}
+
+}  // namespace
+}  // namespace wp
