@@ -93,7 +93,7 @@ OutputFile::OutputFile(std::string option, std::string path, std::optional<mode_
     }
     fs::path folder = resolved(path_).parent_path();
     if (access(folder.c_str(), W_OK | X_OK) != 0)
-        refuse(place + "cannot be written: folder " + folder.string() + ": " + errorText());
+        refuse(place + "cannot be written: its folder: " + errorText());
 }
 
 void OutputFile::write(std::string_view bytes) const {

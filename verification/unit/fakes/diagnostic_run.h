@@ -34,9 +34,7 @@ inline std::shared_ptr<WiFiProfileViewController> controllerFor(Platform& platfo
 struct DiagnosticRun {
     explicit DiagnosticRun(NetworkList list = NetworkList::hidden,
                            std::optional<std::string> networkName = std::nullopt)
-        : controller(controllerFor(device.platform, request(list, std::move(networkName)))) {
-        device.screen.setRootViewController(controller);
-    }
+        : controller(controllerFor(device.platform, request(list, std::move(networkName)))) {}
 
     /// Starts the run and takes every step until nothing is left to do.
     void runToEnd() {
