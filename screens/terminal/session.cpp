@@ -87,13 +87,14 @@ bool Session::start(std::string& why) {
         why = "the terminal's modes cannot be read (" + std::string(std::strerror(errno)) + ")";
         return false;
     }
-    if (auto unfit = whyUnfit(terminal_)) {
-        why = *unfit;
+    TerminalDescription description = describeTerminal(terminal_);
+    if (description.unfit) {
+        why = *description.unfit;
         return false;
     }
     output_ = fdopen(fcntl(terminal_, F_DUPFD_CLOEXEC, 0), "w");
     input_ = fdopen(fcntl(terminal_, F_DUPFD_CLOEXEC, 0), "r");
-    guard_ = std::make_unique<Guard>(terminal_, modes_, leavingSequence());
+    guard_ = std::make_unique<Guard>(terminal_, modes_, description.leavingSequence);
     screen_ = newterm(nullptr, output_, input_);
     if (screen_ == nullptr) {
         why = "the terminal cannot be set up for a screen";

@@ -18,26 +18,27 @@ const char* capability(const char* name) {
     return isMissing ? nullptr : value;
 }
 
-}  // namespace
-
-std::optional<std::string> whyUnfit(int descriptor) {
-    const char* term = std::getenv("TERM");
-    if (term == nullptr || *term == '\0') return "TERM is not set, so nothing is known of the terminal";
-    std::string name = "\"" + ui::displayForm(term) + "\"";
-    int status = 0;
-    if (setupterm(term, descriptor, &status) != OK)
-        return "nothing is known of a terminal " + name + " (TERM)";
-    for (const char* needed : {"cup", "clear"})
-        if (capability(needed) == nullptr)
-            return "a terminal " + name + " (TERM) cannot place text on its screen";
-    return std::nullopt;
-}
-
 std::string leavingSequence() {
     std::string sequence;
     for (const char* name : {"sgr0", "rmkx", "cnorm", "rmcup"})
         if (const char* value = capability(name)) sequence += withoutPadding(value);
     return sequence;
+}
+
+}  // namespace
+
+TerminalDescription describeTerminal(int descriptor) {
+    const char* term = std::getenv("TERM");
+    if (term == nullptr || *term == '\0') return {"TERM is not set, so nothing is known of the terminal", ""};
+    std::string name = "\"" + ui::displayForm(term) + "\"";
+    int status = 0;
+    if (setupterm(term, descriptor, &status) != OK)
+        return {"nothing is known of a terminal " + name + " (TERM)", ""};
+    TerminalDescription description{std::nullopt, leavingSequence()};
+    if (capability("cup") == nullptr || capability("clear") == nullptr)
+        description.unfit = "a terminal " + name + " (TERM) cannot place text on its screen";
+    del_curterm(cur_term);
+    return description;
 }
 
 std::string withoutPadding(std::string capability) {

@@ -5,13 +5,16 @@
 
 namespace wp::terminal {
 
-/// Why the terminal of that descriptor cannot carry a screen, in one line; nothing when it can. Loads its
-/// description, by TERM. *Main*.
-std::optional<std::string> whyUnfit(int descriptor);
+/// What the system's description of a terminal, named by TERM, says.
+struct TerminalDescription {
+    /// Why it cannot carry a screen, in one line; nothing when it can.
+    std::optional<std::string> unfit;
+    /// What sets attributes, keypad and cursor back and leaves the drawn screen.
+    std::string leavingSequence;
+};
 
-/// What sets the attributes, the keypad and the cursor back and leaves the drawn screen, by the description
-/// that `whyUnfit` loaded. *Main*.
-std::string leavingSequence();
+/// Reads the description of the terminal of that descriptor. *Main*.
+TerminalDescription describeTerminal(int descriptor);
 
 /// A capability without its padding marks (`$<5/>`), which are no characters to be sent.
 std::string withoutPadding(std::string capability);
