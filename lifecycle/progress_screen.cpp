@@ -31,7 +31,9 @@ void WiFiProfileViewController::updateProgress() {
         // Deliberate: the counters as they are now, so that the bar of several updates shows the newest.
         auto completed = static_cast<float>(self->completedTests_.load());
         auto total = static_cast<float>(self->totalTests_.load());
-        if (self->progressView_) self->progressView_->setProgress(completed / total);
+        if (!self->progressView_) return;
+        self->progressView_->setStepCount(self->totalTests_);
+        self->progressView_->setProgress(completed / total);
     });
 }
 

@@ -24,8 +24,9 @@ int Canvas::put(int row, int column, const Cells& cells, Style style) {
     if (row < 0 || row >= rows_ || column < 0) return column;
     for (const Cell& cell : cells) {
         if (column + cell.columns > columns_) break;
-        square(row, column) = {cell.text, style};
-        if (cell.columns == 2) square(row, column + 1) = {L"", style};
+        clear(row, column, cell.columns, style);
+        square(row, column).text = cell.text;
+        if (cell.columns == 2) square(row, column + 1).text = L"";
         column += cell.columns;
     }
     return column;
@@ -37,8 +38,17 @@ int Canvas::put(int row, int column, std::string_view unicode, std::string_view 
 
 void Canvas::fill(int row, int column, int width, Style style) {
     if (row < 0 || row >= rows_) return;
+    int begin = std::max(column, 0);
     int end = std::min(column + width, columns_);
-    for (int at = std::max(column, 0); at < end; ++at) square(row, at) = {L" ", style};
+    if (begin < end) clear(row, begin, end - begin, style);
+}
+
+/// A wide character that is overwritten by half goes as a whole.
+void Canvas::clear(int row, int column, int width, Style style) {
+    int end = column + width;
+    if (square(row, column).text.empty()) square(row, column - 1).text = L" ";
+    if (end < columns_ && square(row, end).text.empty()) square(row, end).text = L" ";
+    for (int at = column; at < end; ++at) square(row, at) = {L" ", style};
 }
 
 void Canvas::dim(int row, int column) {

@@ -65,6 +65,7 @@ class Canvas {
 
   private:
     Square& square(int row, int column);
+    void clear(int row, int column, int width, Style style);
 
     int rows_;
     int columns_;

@@ -21,6 +21,12 @@ constexpr int kFewestListRows = 8;
 constexpr int kTitleRows = 2;
 constexpr int kHintRows = 1;
 
+/// A text of the product's own, in which lines are broken for another width.
+std::string flowing(std::string text) {
+    std::replace(text.begin(), text.end(), '\n', ' ');
+    return text;
+}
+
 class ScreenPainter {
   public:
     ScreenPainter(Canvas& canvas, const ui::Screen& screen, const Texts& texts)
@@ -63,7 +69,8 @@ class ScreenPainter {
         int most = std::clamp(canvas_.rows() - kTitleRows - kHintRows - 1 - kFewestListRows, 2,
                               kMostDescriptionLines);
         std::vector<Cells> lines;
-        if (description) lines = wrapped(cellsOf(description->text(), charset_), width_, most, charset_);
+        if (description)
+            lines = wrapped(cellsOf(flowing(description->text()), charset_), width_, most, charset_);
         int height = std::max(static_cast<int>(lines.size()), 2);
         int at = row;
         if (description && !description->isHidden())

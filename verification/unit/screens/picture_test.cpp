@@ -263,6 +263,28 @@ TEST_F(PictureTest, KeepsWideAndCombiningCharactersInTheirCells) {
     EXPECT_THAT(picture, HasSubstr("│   \U0001F600 home                                            │"));
 }
 
+TEST_F(PictureTest, BlanksAWideCharacterThatABoxCoversByHalf) {
+    controller->names = {"東京東京東京東京", "a東京東京東京東京"};
+    build();
+    controller->ask("x");
+    Canvas canvas = drawn();
+
+    for (int row = 0; row < canvas.rows(); ++row) {
+        int columns = 0;
+        for (int column = 0; column < canvas.columns(); ++column)
+            if (const std::wstring& square = canvas.at(row, column).text; !square.empty())
+                columns += wcwidth(square[0]);
+        EXPECT_EQ(columns, canvas.columns()) << row;
+    }
+}
+
+TEST_F(PictureTest, LetsTheDescriptionFlow) {
+    build();
+    controller->description().setText("One line\nand another.");
+
+    EXPECT_THAT(text(), HasSubstr("\n  One line and another.\n"));
+}
+
 TEST_F(PictureTest, ShowsNamesFromTheAirInTheirDisplayForm) {
     controller->names = {"\x1B]0;owned\x07", "\x1B[2J", "\u202Eevil", "a\nb", std::string(32, '\xFF')};
     build();

@@ -1,10 +1,9 @@
 #!/usr/bin/env python3
-"""Looks at the terminal screen from outside: a program in a terminal of its own (tmux), keys in, picture out.
+"""Looks at the terminal screen from outside, with a sample list on it.
 
 terminal_test.py PROGRAM [TEST ...]
 """
 import os
-import pathlib
 import shlex
 import signal
 import subprocess
@@ -13,71 +12,9 @@ import tempfile
 import time
 import unittest
 
+from tmux_terminal import PATIENCE, WRAPPED, Terminal
+
 PROGRAM = ""
-# Only a failure takes as long.
-PATIENCE = 30
-
-
-class Terminal:
-    """A terminal with a shell script in it; gone with the test, and everything in it."""
-
-    def __init__(self, script, columns=100, rows=30, environment=None):
-        self.directory = tempfile.TemporaryDirectory()
-        self.socket = os.path.join(self.directory.name, "socket")
-        variables = {"LC_ALL": "C.UTF-8", **(environment or {})}
-        exports = "".join(f"export {name}={shlex.quote(value)}; " for name, value in variables.items())
-        self.tmux("-f", "/dev/null", "new-session", "-d", "-x", str(columns), "-y", str(rows),
-                  "cd " + shlex.quote(self.directory.name) + "; " + exports + script)
-
-    def tmux(self, *words):
-        run = subprocess.run(["tmux", "-u", "-S", self.socket, *words], stdout=subprocess.PIPE,
-                             stderr=subprocess.PIPE, check=False)
-        if run.returncode != 0:
-            raise AssertionError(f"tmux {words}: {run.stderr.decode()}")
-        return run.stdout.decode()
-
-    def press(self, *keys):
-        self.tmux("send-keys", *keys)
-
-    def type(self, text):
-        self.tmux("send-keys", "-l", text)
-
-    def picture(self, *options):
-        return self.tmux("capture-pane", "-p", *options)
-
-    def state(self, form):
-        return self.tmux("display-message", "-p", form).strip()
-
-    def resize(self, columns, rows):
-        self.tmux("resize-window", "-x", str(columns), "-y", str(rows))
-
-    def path(self, name):
-        return pathlib.Path(self.directory.name, name)
-
-    def waitFor(self, what, get=None):
-        """Waits until the picture (or what `get` returns) holds the text or fulfils the function."""
-        get = get or self.picture
-        end = time.monotonic() + PATIENCE
-        while True:
-            found = get()
-            if what(found) if callable(what) else what in found:
-                return found
-            if time.monotonic() > end:
-                raise AssertionError(f"waited in vain for {what!r}; last seen:\n{found}")
-            time.sleep(0.01)
-
-    def waitForFile(self, name):
-        def content():
-            return self.path(name).read_text() if self.path(name).exists() else ""
-        return self.waitFor(lambda text: text.endswith("\n"), content).strip()
-
-    def close(self):
-        subprocess.run(["tmux", "-S", self.socket, "kill-server"], stderr=subprocess.DEVNULL, check=False)
-        self.directory.cleanup()
-
-
-# Leaves behind the terminal's modes before and after, the exit status, and a shell that waits.
-WRAPPED = "stty -g > before; {program}; echo $? > status; stty -g > after; echo finished; exec sleep 1000"
 
 
 class TerminalScreen(unittest.TestCase):
@@ -94,13 +31,6 @@ class TerminalScreen(unittest.TestCase):
         terminal = Terminal((script or "{program}; exec sleep 1000").format(program=shlex.join(words)), **options)
         self.addCleanup(terminal.close)
         return terminal
-
-    def childOf(self, terminal):
-        """The program that the terminal's shell runs."""
-        shell = terminal.state("#{pane_pid}")
-        children = terminal.waitFor(lambda text: text != "", lambda: pathlib.Path(
-            f"/proc/{shell}/task/{shell}/children").read_text().strip())
-        return int(children.split()[0])
 
     def testShowsTheListInThePlacesOfItsCells(self):
         terminal = self.start(names=["東京ネット".encode(), "cafe\u0301 x".encode(), "\U0001F600 home".encode()])
@@ -272,7 +202,7 @@ class TerminalScreen(unittest.TestCase):
             with self.subTest(signal=number.name):
                 terminal = self.start(WRAPPED)
                 terminal.waitFor("▸ Home")
-                os.kill(self.childOf(terminal), number)
+                os.kill(terminal.child(), number)
                 self.assertEqual(terminal.waitForFile("status"), str(128 + number))
                 self.assertRestored(terminal)
 
