@@ -1,0 +1,192 @@
+#include "linux/dbus/network_manager.h"
+
+#include <algorithm>
+
+#include "linux/dbus/network_records.h"
+
+namespace wp {
+namespace {
+
+const std::string kService = "org.freedesktop.NetworkManager";
+const BusObject kManager{kService, "/org/freedesktop/NetworkManager"};
+const BusObject kSettings{kService, "/org/freedesktop/NetworkManager/Settings"};
+/// Beyond these a store is broken rather than full.
+constexpr std::size_t kMostConnections = 2000;
+
+bool isPath(const std::string& path) {
+    return !path.empty() && path != "/";
+}
+
+BusObject objectAt(const BusValue& path) {
+    return {kService, path.text()};
+}
+
+Known<BusObject> deviceOf(Bus& bus, const std::string& interfaceName, const Until& until) {
+    const auto path = bus.call(kManager, kService, "GetDeviceByIpIface", {interfaceName}, until);
+    if (!path) return path.error();
+    return objectAt(*path);
+}
+
+BusValue activeSettings(Bus& bus, const std::string& activePath, const Until& until) {
+    if (!isPath(activePath)) return {};
+    const auto connection =
+        bus.property({kService, activePath}, kService + ".Connection.Active", "Connection", until);
+    if (!connection || !isPath(connection->text())) return {};
+    auto settings =
+        bus.call(objectAt(*connection), kService + ".Settings.Connection", "GetSettings", {}, until);
+    return settings ? std::move(*settings) : BusValue();
+}
+
+std::map<std::string, std::string> leaseAt(Bus& bus, const std::string& path, const std::string& kind,
+                                           const Until& until) {
+    std::map<std::string, std::string> options;
+    if (!isPath(path)) return options;
+    const auto read = bus.property({kService, path}, kService + "." + kind, "Options", until);
+    if (!read) return options;
+    for (const auto& [name, value] : read->map())
+        if (const auto* text = value.as<std::string>()) options.emplace(name, *text);
+    return options;
+}
+
+void addServers(Bus& bus, const std::string& path, const std::string& kind, const Until& until,
+                std::vector<IPAddress>& servers) {
+    if (!isPath(path)) return;
+    const auto config = bus.properties({kService, path}, kService + "." + kind, until);
+    if (!config) return;
+    for (const BusValue& each : (*config)["NameserverData"].list())
+        if (const auto address = IPAddress::fromText(each["address"].text())) servers.push_back(*address);
+    if (kind == "IP6Config")
+        for (const BusValue& each : (*config)["Nameservers"].list())
+            if (const auto address = IPAddress::fromBytes(each.bytes())) servers.push_back(*address);
+}
+
+/// In `dns` an IPv4 address is a number in network order as it lies in memory, an IPv6 one 16 bytes;
+/// `dns-data` has both as texts.
+void addManual(const BusValue& family, std::vector<IPAddress>& servers) {
+    for (const BusValue& each : family["dns-data"].list())
+        if (const auto address = IPAddress::fromText(each.text())) servers.push_back(*address);
+    if (!family["dns-data"].list().empty()) return;
+    for (const BusValue& each : family["dns"].list()) {
+        std::optional<IPAddress> address;
+        if (const auto number = each.number()) {
+            const auto raw = static_cast<std::uint32_t>(*number);
+            std::uint8_t bytes[4];
+            std::copy_n(reinterpret_cast<const std::uint8_t*>(&raw), 4, bytes);
+            address = IPAddress::fromBytes(bytes);
+        } else {
+            address = IPAddress::fromBytes(each.bytes());
+        }
+        if (address) servers.push_back(*address);
+    }
+}
+
+bool allowsOnlyFirstWpa(const BusValue& protocols) {
+    const auto& list = protocols.list();
+    return !list.empty() &&
+           std::all_of(list.begin(), list.end(), [](const BusValue& each) { return each.text() == "wpa"; });
+}
+
+SavedSecurity securityIn(const BusValue& settings) {
+    const BusValue& security = settings["802-11-wireless-security"];
+    if (security.empty()) return SavedSecurity::open;
+    const std::string management = security["key-mgmt"].text();
+    if (management == "none" || management == "ieee8021x") return SavedSecurity::wep;
+    if (management == "owe") return SavedSecurity::owe;
+    if (management == "sae") return SavedSecurity::sae;
+    if (management.starts_with("wpa-eap")) return SavedSecurity::enterprise;
+    if (management == "wpa-psk")
+        return allowsOnlyFirstWpa(security["proto"]) ? SavedSecurity::wpaPersonal
+                                                     : SavedSecurity::wpa2Personal;
+    return SavedSecurity::unknown;
+}
+
+}  // namespace
+
+Known<NetworkManagerLink> readNetworkManagerLink(Bus& bus, const std::string& interfaceName,
+                                                 const Until& until) {
+    const auto device = deviceOf(bus, interfaceName, until);
+    if (!device) return device.error();
+    const auto properties = bus.properties(*device, kService + ".Device", until);
+    if (!properties) return properties.error();
+    if (!(*properties)["Managed"].flag())
+        return failure(Reason::notFound, "NetworkManager does not manage " + interfaceName);
+    NetworkManagerLink link;
+    link.device = *device;
+    link.settings = activeSettings(bus, (*properties)["ActiveConnection"].text(), until);
+    link.lease4 = leaseAt(bus, (*properties)["Dhcp4Config"].text(), "DHCP4Config", until);
+    link.lease6 = leaseAt(bus, (*properties)["Dhcp6Config"].text(), "DHCP6Config", until);
+    addServers(bus, (*properties)["Ip4Config"].text(), "IP4Config", until, link.servers);
+    addServers(bus, (*properties)["Ip6Config"].text(), "IP6Config", until, link.servers);
+    if (until.stop->raised()) return waitFailure(Wait::stopped, kService);
+    return link;
+}
+
+std::vector<IPAddress> manualServers(const BusValue& settings) {
+    std::vector<IPAddress> servers;
+    addManual(settings["ipv4"], servers);
+    addManual(settings["ipv6"], servers);
+    return servers;
+}
+
+std::string proxyOf(const BusValue& settings) {
+    const BusValue& proxy = settings["proxy"];
+    // 1 is "auto": only with a script of its own is it the person's setting rather than the network's offer.
+    if (proxy["method"].number().value_or(0) != 1) return {};
+    if (!proxy["pac-url"].text().empty()) return "NetworkManager profile: pac-url";
+    if (!proxy["pac-script"].text().empty()) return "NetworkManager profile: pac-script";
+    return {};
+}
+
+std::optional<SavedNetwork> savedFromNetworkManager(const BusValue& settings) {
+    const BusValue& wireless = settings["802-11-wireless"];
+    const std::string mode = wireless["mode"].text("infrastructure");
+    if (wireless["ssid"].bytes().empty() || mode != "infrastructure") return std::nullopt;
+    SavedNetwork network;
+    network.name = NetworkName(wireless["ssid"].bytes());
+    network.security = securityIn(settings);
+    network.enabled = settings["connection"]["autoconnect"].flag(true);
+    network.hidden = wireless["hidden"].flag();
+    network.seenSeveralAPs = wireless["seen-bssids"].list().size() > 1;
+    const std::int64_t joined = settings["connection"]["timestamp"].number().value_or(0);
+    if (joined > 0) network.lastJoined = dateFromUnix(joined);
+    return network;
+}
+
+Known<SavedNetworks> networkManagerNetworks(Bus& bus, const Until& until) {
+    const auto paths = bus.call(kSettings, kService + ".Settings", "ListConnections", {}, until);
+    if (!paths) return paths.error();
+    if (paths->list().size() > kMostConnections)
+        return failure(Reason::malformed, "NetworkManager lists more connections than can be real");
+    SavedNetworks saved{"NetworkManager", {}};
+    for (const BusValue& path : paths->list()) {
+        const auto settings =
+            bus.call(objectAt(path), kService + ".Settings.Connection", "GetSettings", {}, until);
+        // One that was deleted meanwhile is not remembered any more.
+        if (!settings && settings.error().code == static_cast<int>(Reason::notFound)) continue;
+        if (!settings) return settings.error();
+        if (auto network = savedFromNetworkManager(*settings)) saved.networks.push_back(*network);
+    }
+    return saved;
+}
+
+Known<WirelessPower> networkManagerPower(Bus& bus, const Until& until) {
+    const auto properties = bus.properties(kManager, kService, until);
+    if (!properties) return properties.error();
+    return WirelessPower{(*properties)["WirelessEnabled"].flag(),
+                         (*properties)["WirelessHardwareEnabled"].flag(true)};
+}
+
+Known<bool> setNetworkManagerPower(Bus& bus, bool on, const Until& until) {
+    const auto reply = bus.call(kManager, "org.freedesktop.DBus.Properties", "Set",
+                                {kService, std::string("WirelessEnabled"), BusFlagVariant{on}}, until);
+    if (!reply) return reply.error();
+    return on;
+}
+
+Known<bool> requestNetworkManagerScan(Bus& bus, const BusObject& device, const Until& until) {
+    const auto reply = bus.call(device, kService + ".Device.Wireless", "RequestScan", {BusOptions()}, until);
+    if (!reply) return reply.error();
+    return true;
+}
+
+}  // namespace wp

@@ -1,0 +1,22 @@
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <string_view>
+
+#include "platform/value.h"
+#include "service/saved_networks.h"
+
+namespace wp {
+
+/// A moment given in seconds since 1970-01-01 UTC. *Any* thread.
+Date dateFromUnix(std::int64_t seconds);
+/// "2026-11-20T18:30:00Z"; nothing for any other form.
+std::optional<Date> dateFromText(std::string_view text);
+
+/// A name in the supplicant's form: in double quotes as it stands, `P"…"` with escapes, or in hexadecimal.
+std::optional<NetworkName> nameFromSupplicant(std::string_view text);
+/// The security that the supplicant's key management, protocols and the presence of a WEP key stand for.
+SavedSecurity securityFromSupplicant(std::string_view keyManagement, std::string_view protocols, bool wepKey);
+
+}  // namespace wp

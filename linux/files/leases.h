@@ -1,0 +1,32 @@
+#pragma once
+
+#include <map>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "service/ip_address.h"
+
+namespace wp {
+
+/// What a DHCP client of its own, without a manager, wrote down of its lease.
+struct Lease {
+    std::vector<IPAddress> servers;
+    std::string vendorText;
+    std::string portalApi;
+};
+
+/// The last lease for the interface in the form that dhclient keeps; nothing where there is none, or its
+/// end has passed. \param now seconds since 1970-01-01 UTC. *Any* thread.
+std::optional<Lease> readDhclientLeases(std::string_view text, std::string_view interfaceName,
+                                        std::int64_t now);
+
+/// Looks for the interface's lease in the places where dhclient keeps them, below a root folder.
+std::optional<Lease> findLease(const std::string& interfaceName, std::int64_t now,
+                               const std::string& root = "");
+
+/// The name servers of a resolver file.
+std::vector<IPAddress> serversFromResolverFile(std::string_view text);
+
+}  // namespace wp

@@ -1,0 +1,164 @@
+#include "linux/probe/name_lookup.h"
+
+#include <ares.h>
+#include <netdb.h>
+#include <sys/random.h>
+
+#include <array>
+#include <memory>
+
+#include "linux/probe/udp_socket.h"
+#include "linux/wait_any.h"
+
+namespace wp {
+namespace {
+
+using namespace std::chrono_literals;
+
+constexpr int kTryMilliseconds = 2000, kTries = 2;
+/// How long the other family may take once one has answered (RFC 8305 waits 50 ms for the same).
+constexpr auto kOtherFamily = 50ms;
+constexpr int kMostAddresses = 32;
+
+struct LibraryUser {
+    LibraryUser() { ares_library_init(ARES_LIB_INIT_ALL); }
+};
+
+struct Destroy {
+    void operator()(ares_channel channel) const { ares_destroy(channel); }
+};
+using Channel = std::unique_ptr<std::remove_pointer_t<ares_channel>, Destroy>;
+
+/// What the lookups of one name have brought so far.
+struct Lookup {
+    std::vector<IPAddress> addresses;
+    std::string why;
+    int running = 0;
+};
+
+std::string csvOf(const NameServerSet& whom) {
+    std::string list;
+    for (const IPAddress& server : whom.servers) {
+        const std::string zone = server.linkLocal() && !server.isIPv4() && !whom.interfaceName.empty()
+                                     ? "%" + whom.interfaceName
+                                     : "";
+        const std::string port = std::to_string(whom.port);
+        if (!list.empty()) list += ",";
+        // The zone stands behind the port in this list.
+        list += server.isIPv4() ? server.text() + ":" + port : "[" + server.text() + "]:" + port + zone;
+    }
+    return list;
+}
+
+Known<Channel> openChannel(const NameServerSet& whom) {
+    static const LibraryUser user;
+    ares_options options{};
+    char lookups[] = "b";
+    options.flags = ARES_FLAG_NOSEARCH | ARES_FLAG_NOALIASES;
+    options.timeout = kTryMilliseconds;
+    options.tries = kTries;
+    options.lookups = lookups;
+    ares_channel raw = nullptr;
+    const int mask = ARES_OPT_FLAGS | ARES_OPT_TIMEOUTMS | ARES_OPT_TRIES | ARES_OPT_LOOKUPS;
+    int status = ares_init_options(&raw, &options, mask);
+    Channel channel(raw);
+    if (status == ARES_SUCCESS) status = ares_set_servers_ports_csv(raw, csvOf(whom).c_str());
+    if (status != ARES_SUCCESS)
+        return failure(Reason::unavailable,
+                       std::string("names cannot be asked for: ") + ares_strerror(status));
+    if (!whom.interfaceName.empty()) ares_set_local_dev(raw, whom.interfaceName.c_str());
+    return channel;
+}
+
+void addFrom(Lookup& lookup, int type, const unsigned char* answer, int size) {
+    int count = kMostAddresses;
+    if (type == 1) {
+        std::array<ares_addrttl, kMostAddresses> found;
+        if (ares_parse_a_reply(answer, size, nullptr, found.data(), &count) != ARES_SUCCESS) return;
+        for (int i = 0; i < count; ++i) {
+            const auto* bytes =
+                reinterpret_cast<const std::uint8_t*>(&found[static_cast<std::size_t>(i)].ipaddr);
+            lookup.addresses.push_back(*IPAddress::fromBytes({bytes, 4}));
+        }
+        return;
+    }
+    std::array<ares_addr6ttl, kMostAddresses> found;
+    if (ares_parse_aaaa_reply(answer, size, nullptr, found.data(), &count) != ARES_SUCCESS) return;
+    for (int i = 0; i < count; ++i) {
+        const auto* bytes =
+            reinterpret_cast<const std::uint8_t*>(&found[static_cast<std::size_t>(i)].ip6addr);
+        lookup.addresses.push_back(*IPAddress::fromBytes({bytes, 16}));
+    }
+}
+
+template <int kType>
+void keepAnswer(void* place, int status, int, unsigned char* answer, int size) {
+    auto& lookup = *static_cast<Lookup*>(place);
+    --lookup.running;
+    if (status == ARES_SUCCESS)
+        addFrom(lookup, kType, answer, size);
+    else if (status != ARES_ENODATA || lookup.why.empty())
+        lookup.why = ares_strerror(status);
+}
+
+/// Waits for the channel's sockets, or for its own next timeout.
+Wait turn(ares_channel channel, const Until& until) {
+    std::array<ares_socket_t, ARES_GETSOCK_MAXNUM> sockets;
+    const int bits = ares_getsock(channel, sockets.data(), ARES_GETSOCK_MAXNUM);
+    std::vector<pollfd> descriptors;
+    for (int i = 0; i < ARES_GETSOCK_MAXNUM; ++i) {
+        short events = 0;
+        if (ARES_GETSOCK_READABLE(bits, i)) events |= POLLIN;
+        if (ARES_GETSOCK_WRITABLE(bits, i)) events |= POLLOUT;
+        if (events != 0) descriptors.push_back({sockets[static_cast<std::size_t>(i)], events, 0});
+    }
+    timeval most{1, 0};
+    const timeval* patience = ares_timeout(channel, &most, &most);
+    const auto time = std::chrono::seconds(patience->tv_sec) + std::chrono::microseconds(patience->tv_usec);
+    const Wait wait = waitAny(descriptors, until.within(time));
+    if (wait == Wait::stopped) return wait;
+    for (const pollfd& each : descriptors)
+        ares_process_fd(channel, (each.revents & ~POLLOUT) != 0 ? each.fd : ARES_SOCKET_BAD,
+                        (each.revents & POLLOUT) != 0 ? each.fd : ARES_SOCKET_BAD);
+    ares_process_fd(channel, ARES_SOCKET_BAD, ARES_SOCKET_BAD);
+    return Clock::now() >= until.deadline ? Wait::timeout : Wait::ready;
+}
+
+}  // namespace
+
+Known<NameAnswer> lookUpName(const std::string& name, const NameServerSet& whom, const Until& until) {
+    const auto start = Clock::now();
+    NameAnswer answer{name, {}, {}, {}};
+    if (whom.servers.empty()) {
+        answer.why = "there is no name server";
+        return answer;
+    }
+    Lookup lookup;  // outlives the channel, which answers to it when it goes
+    const auto channel = openChannel(whom);
+    if (!channel) return channel.error();
+    lookup.running = 2;
+    ares_query(channel->get(), name.c_str(), 1, 1, keepAnswer<1>, &lookup);
+    ares_query(channel->get(), name.c_str(), 1, 28, keepAnswer<28>, &lookup);
+    Until patience = until;
+    while (lookup.running > 0) {
+        if (!lookup.addresses.empty() && lookup.running == 1) patience = patience.within(kOtherFamily);
+        const Wait wait = turn(channel->get(), patience);
+        if (wait == Wait::stopped) return waitFailure(wait, "the name server");
+        if (wait == Wait::timeout) break;
+    }
+    answer.took = std::chrono::duration_cast<std::chrono::milliseconds>(Clock::now() - start);
+    answer.addresses = lookup.addresses;
+    if (lookup.addresses.empty())
+        answer.why = lookup.why.empty() ? "no name server answered in time" : lookup.why;
+    return answer;
+}
+
+std::string freshName(const std::string& wildcardSuffix) {
+    std::array<std::uint8_t, 8> bytes{};
+    (void)!::getrandom(bytes.data(), bytes.size(), 0);
+    std::string name;
+    for (const std::uint8_t byte : bytes) name += static_cast<char>('a' + byte % 26);
+    return name + (wildcardSuffix.starts_with(".") ? "" : ".") + wildcardSuffix;
+}
+
+}  // namespace wp

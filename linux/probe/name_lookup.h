@@ -1,0 +1,27 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "linux/stop_signal.h"
+#include "service/ip_address.h"
+#include "service/reachability.h"
+
+namespace wp {
+
+/// Whom to ask for names, and over which interface.
+struct NameServerSet {
+    std::vector<IPAddress> servers;
+    std::string interfaceName;  ///< empty: any
+    std::uint16_t port = 53;
+};
+
+/// Asks for the name's addresses of both families at once, each server 2 s, twice. No cache and no hosts file of
+/// this device is looked into. What the servers say, and that none of them answers, are both answers; that there
+/// is none to be asked too. An error is only that the lookup was stopped, or could not begin. *Any* thread.
+Known<NameAnswer> lookUpName(const std::string& name, const NameServerSet& whom, const Until& until);
+
+/// A name that no cache holds: eight random letters before the suffix, for a zone that answers to every name.
+std::string freshName(const std::string& wildcardSuffix);
+
+}  // namespace wp

@@ -1,0 +1,24 @@
+#pragma once
+
+#include <map>
+#include <optional>
+#include <string>
+#include <string_view>
+
+namespace wp {
+
+/// The longest answer of a portal's API that is read; a true one has a few hundred bytes.
+inline constexpr std::size_t kLongestPortalAnswer = 4096;
+
+/// Whether the portal's API says that this device is captive (RFC 8908). Nothing for what is no such answer:
+/// not JSON, without "captive", or captive without a page to go to. *Any* thread.
+std::optional<bool> captiveFromApi(std::string_view json);
+
+/// The address of the portal's API among the options of a lease, by their numbers or the names that managers
+/// give them (RFC 8910, option 114; 160 is its withdrawn code); empty where the network names none.
+std::string portalApiIn(const std::map<std::string, std::string>& lease);
+
+/// Whether the address is the one that means "no portal here".
+bool meansNoPortal(std::string_view uri);
+
+}  // namespace wp

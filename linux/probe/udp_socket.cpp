@@ -1,0 +1,96 @@
+#include "linux/probe/udp_socket.h"
+
+#include <netinet/in.h>
+
+#include <algorithm>
+#include <cerrno>
+#include <cstring>
+
+namespace wp {
+namespace {
+
+constexpr std::size_t kLongestDatagram = 4096;
+
+/// Takes in all that is there; true once one is accepted.
+bool receiveAll(const Descriptor& socket, const AcceptDatagram& accept) {
+    std::vector<std::uint8_t> buffer(kLongestDatagram);
+    while (true) {
+        SocketAddress from;
+        from.size = sizeof from.storage;
+        const ssize_t size = ::recvfrom(socket.number(), buffer.data(), buffer.size(), MSG_DONTWAIT,
+                                        reinterpret_cast<sockaddr*>(&from.storage), &from.size);
+        if (size < 0) return false;
+        const auto sender = from.address();
+        if (sender && accept({buffer.data(), static_cast<std::size_t>(size)}, *sender)) return true;
+    }
+}
+
+}  // namespace
+
+SocketAddress SocketAddress::of(const IPAddress& address, std::uint16_t port, unsigned interfaceIndex) {
+    SocketAddress result;
+    if (address.isIPv4()) {
+        auto& place = *reinterpret_cast<sockaddr_in*>(&result.storage);
+        place.sin_family = AF_INET;
+        place.sin_port = htons(port);
+        std::copy(address.bytes().begin(), address.bytes().end(),
+                  reinterpret_cast<std::uint8_t*>(&place.sin_addr));
+        result.size = sizeof place;
+        return result;
+    }
+    auto& place = *reinterpret_cast<sockaddr_in6*>(&result.storage);
+    place.sin6_family = AF_INET6;
+    place.sin6_port = htons(port);
+    place.sin6_scope_id = address.linkLocal() ? interfaceIndex : 0;
+    std::copy(address.bytes().begin(), address.bytes().end(), place.sin6_addr.s6_addr);
+    result.size = sizeof place;
+    return result;
+}
+
+std::optional<IPAddress> SocketAddress::address() const {
+    if (storage.ss_family == AF_INET) {
+        const auto& place = *reinterpret_cast<const sockaddr_in*>(&storage);
+        return IPAddress::fromBytes({reinterpret_cast<const std::uint8_t*>(&place.sin_addr), 4});
+    }
+    if (storage.ss_family != AF_INET6) return std::nullopt;
+    return IPAddress::fromBytes({reinterpret_cast<const sockaddr_in6*>(&storage)->sin6_addr.s6_addr, 16});
+}
+
+std::uint16_t SocketAddress::port() const {
+    if (storage.ss_family == AF_INET) return ntohs(reinterpret_cast<const sockaddr_in*>(&storage)->sin_port);
+    return ntohs(reinterpret_cast<const sockaddr_in6*>(&storage)->sin6_port);
+}
+
+Known<Descriptor> udpSocket(const IPAddress& address, const std::string& interfaceName) {
+    const int family = address.isIPv4() ? AF_INET : AF_INET6;
+    Descriptor socket(::socket(family, SOCK_DGRAM | SOCK_CLOEXEC | SOCK_NONBLOCK, 0));
+    if (!socket)
+        return failure(Reason::unsupported, std::string("no socket of this family: ") + std::strerror(errno));
+    const auto size = static_cast<socklen_t>(interfaceName.size());
+    if (size != 0 &&
+        ::setsockopt(socket.number(), SOL_SOCKET, SO_BINDTODEVICE, interfaceName.c_str(), size) != 0)
+        return failure(errno == EPERM ? Reason::notPermitted : Reason::noInterface,
+                       "cannot send over " + interfaceName + ": " + std::strerror(errno));
+    return socket;
+}
+
+Wait exchangeDatagrams(const Descriptor& socket, const SocketAddress& target, Bytes request,
+                       const std::vector<std::chrono::milliseconds>& pauses, const AcceptDatagram& accept,
+                       const Until& until) {
+    for (std::size_t turn = 0; turn <= pauses.size(); ++turn) {
+        // A send that fails (no route yet, an earlier refusal) counts as a datagram that was lost.
+        (void)::sendto(socket.number(), request.data(), request.size(), MSG_NOSIGNAL, target.raw(),
+                       target.size);
+        const Until own = turn < pauses.size() ? until.within(pauses[turn]) : until;
+        while (true) {
+            pollfd descriptor{socket.number(), POLLIN, 0};
+            const Wait wait = waitAny({&descriptor, 1}, own);
+            if (wait == Wait::stopped) return wait;
+            if (wait == Wait::timeout) break;
+            if (receiveAll(socket, accept)) return Wait::ready;
+        }
+    }
+    return Wait::timeout;
+}
+
+}  // namespace wp

@@ -1,0 +1,41 @@
+#pragma once
+
+#include <sys/socket.h>
+
+#include <functional>
+#include <string>
+#include <vector>
+
+#include "linux/descriptor.h"
+#include "linux/wait_any.h"
+#include "service/ip_address.h"
+
+namespace wp {
+
+/// An address with a port, in the form that the kernel takes.
+struct SocketAddress {
+    sockaddr_storage storage{};
+    socklen_t size = 0;
+
+    /// \param interfaceIndex for link-local addresses of IPv6; 0 where it does not matter
+    static SocketAddress of(const IPAddress& address, std::uint16_t port, unsigned interfaceIndex = 0);
+    /// The address without its port; nothing where it is of no IP family.
+    std::optional<IPAddress> address() const;
+    std::uint16_t port() const;
+    const sockaddr* raw() const { return reinterpret_cast<const sockaddr*>(&storage); }
+};
+
+/// A datagram socket of the family of `address`, bound to the interface where one is named. Being refused the
+/// interface is `notPermitted`.
+Known<Descriptor> udpSocket(const IPAddress& address, const std::string& interfaceName);
+
+/// Looks at one answer and where it came from; true ends the exchange.
+using AcceptDatagram = std::function<bool(Bytes message, const IPAddress& sender)>;
+
+/// Sends the request and waits for an answer that is accepted; sends it again after each of the pauses.
+/// Datagrams longer than 4 KiB are cut there.
+Wait exchangeDatagrams(const Descriptor& socket, const SocketAddress& target, Bytes request,
+                       const std::vector<std::chrono::milliseconds>& pauses, const AcceptDatagram& accept,
+                       const Until& until);
+
+}  // namespace wp

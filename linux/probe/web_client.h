@@ -1,0 +1,49 @@
+#pragma once
+
+#include <functional>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "linux/stop_signal.h"
+#include "service/ip_address.h"
+
+namespace wp {
+
+/// One request. It follows no redirect, goes through no proxy, and takes a connection of its own.
+struct WebRequest {
+    std::string url;
+    std::string interfaceName;         ///< empty: any
+    std::vector<IPAddress> addresses;  ///< of the URL's host; empty: the URL holds an address itself
+    std::vector<std::string> headers;  ///< "Name: value"
+    std::optional<std::string> post;   ///< a body to be sent
+    bool connectOnly = false;          ///< ends with the connection, secure where the URL is
+    std::size_t longestBody = 64U << 10;
+    std::string authorities;  ///< a file of certificates in place of the system's
+};
+
+/// What became of it.
+struct WebAnswer {
+    enum class End { answered, failed, badCertificate };
+    End end = End::failed;
+    std::string why;
+    int status = 0;
+    std::string body;  ///< up to the request's bound
+    std::string location;
+    std::string contentType;
+    std::optional<IPAddress> server;
+    std::chrono::milliseconds took{0};
+};
+
+/// Called after each answer with all answers so far; true ends the others at once, as failed.
+using Conclusive = std::function<bool(const std::vector<std::optional<WebAnswer>>& answers)>;
+
+/// Runs the requests at once. What is not done at the deadline has failed. An error is only that all was
+/// stopped. *Any* thread.
+Known<std::vector<WebAnswer>> runWebRequests(const std::vector<WebRequest>& requests, const Until& until,
+                                             const Conclusive& conclusive = nullptr);
+
+/// The host of a URL with the scheme http or https, without brackets; empty for any other form.
+std::string hostOf(const std::string& url);
+
+}  // namespace wp

@@ -1,0 +1,111 @@
+#include "linux/config.h"
+
+#include <gtest/gtest.h>
+#include <stdlib.h>
+
+#include <filesystem>
+#include <fstream>
+
+namespace wp {
+namespace {
+
+/// The refusal's line; empty where the text is taken.
+std::string refusalOf(const std::string& json) {
+    Config config = Config::defaults();
+    const auto refusal = applyConfig(json, config);
+    return refusal ? refusal->text() : "";
+}
+
+TEST(Config, TakesOverWhatIsSetAndKeepsTheRest) {
+    Config config = Config::defaults();
+    const auto refusal = applyConfig(R"({
+        "capabilities": {"wapi": true},
+        "endpoints": {"pingIPv4": "192.0.2.1", "stun": "", "vendorHost": "[2001:db8::1]:8443"},
+        "thresholds": {"savedNetworks": 2, "channelLoad": 0.25, "overlap": 2},
+        "vendors": {"baseStation": {"manufacturers": ["A", "B"], "addressPrefixes": ["02:1A:2b"]},
+                    "hotspot": {"vendorElements": [{"prefix": "00:11:22"}, {"prefix": "00:11:22", "type": 7}],
+                                "addressPrefixes": ["02:1A:11:22"], "leaseTexts": []},
+                    "peerLinkIndicator": "/run/peer"}})",
+                                     config);
+    ASSERT_FALSE(refusal) << refusal->text();
+    EXPECT_EQ(config.endpoints.pingIPv4, "192.0.2.1");
+    EXPECT_EQ(config.endpoints.pingIPv6, Endpoints().pingIPv6);
+    EXPECT_EQ(config.endpoints.stun, "");
+    EXPECT_EQ(config.thresholds.saved.count, 2U);
+    EXPECT_EQ(config.thresholds.bluetooth.paired, BluetoothLimits().paired);
+    EXPECT_DOUBLE_EQ(config.thresholds.congestion.load, 0.25);
+    EXPECT_DOUBLE_EQ(config.thresholds.congestion.overlap, 2.0);
+    EXPECT_EQ(config.vendors.baseStation.manufacturers, (std::vector<std::string>{"A", "B"}));
+    EXPECT_EQ(config.vendors.baseStation.prefixes, (std::vector<VendorPrefix>{{0x02, 0x1A, 0x2B}}));
+    ASSERT_EQ(config.vendors.hotspot.elements.size(), 2U);
+    EXPECT_EQ(config.vendors.hotspot.elements[0].type, std::nullopt);
+    EXPECT_EQ(config.vendors.hotspot.elements[1].type, 7);
+    EXPECT_TRUE(config.vendors.hotspot.leaseTexts.empty());
+    EXPECT_EQ(config.peerLinkIndicator, "/run/peer");
+}
+
+TEST(Config, ARefusalSaysWhereAndWhyAndChangesNothing) {
+    EXPECT_EQ(refusalOf(R"({"endpoints": {"pingIPv4": "::1"}})"),
+              "endpoints.pingIPv4: must be an IPv4 address");
+    EXPECT_EQ(refusalOf(R"({"endpoints": {"portalSecure": "http://a/"}})"),
+              "endpoints.portalSecure: must begin with https://");
+    EXPECT_EQ(refusalOf(R"({"endpoints": {"stun": "host"}})"), "endpoints.stun: must be HOST:PORT");
+    EXPECT_EQ(refusalOf(R"({"vendors": {"hotspot": {"addressPrefixes": ["02:1A:1"]}}})"),
+              "vendors.hotspot.addressPrefixes[0]: must be octets such as 02:00:5E");
+    for (const char* json :
+         {"", "[]", "{\"other\": 1}", R"({"endpoints": {"ping": ""}})", R"({"endpoints": 1})",
+          R"({"endpoints": {"name": "a b"}})", R"({"thresholds": {"savedNetworks": -1}})",
+          R"({"thresholds": {"savedNetworks": 1.5}})", R"({"thresholds": {"channelLoad": 0}})",
+          R"({"thresholds": {"channelLoad": 1.01}})", R"({"vendors": {"baseStation": {"x": []}}})",
+          R"({"vendors": {"baseStation": {"addressPrefixes": ["02:1A:11:22"]}}})",
+          R"({"vendors": {"baseStation": {"addressPrefixes": ["02:1A:11:"]}}})",
+          R"({"vendors": {"hotspot": {"vendorElements": [{"type": 1}]}}})",
+          R"({"vendors": {"hotspot": {"vendorElements": [{"prefix": "02:1A:11", "type": 256}]}}})"})
+        EXPECT_NE(refusalOf(json), "") << json;
+
+    Config config = Config::defaults();
+    applyConfig(R"({"endpoints": {"pingIPv4": "192.0.2.1"}, "thresholds": 7})", config);
+    EXPECT_EQ(config.endpoints.pingIPv4, Endpoints().pingIPv4);
+}
+
+TEST(Config, TheEndpointsThatAreShownAreAConfigurationThemselves) {
+    Config shown = Config::defaults();
+    shown.endpoints.pingIPv4 = "192.0.2.1";
+    Config read = Config::defaults();
+    const auto refusal = applyConfig(endpointsAsJson(shown), read);
+    ASSERT_FALSE(refusal) << refusal->text();
+    EXPECT_EQ(read.endpoints.pingIPv4, "192.0.2.1");
+    EXPECT_EQ(read.endpoints.vendorUrl, Endpoints().vendorUrl);
+}
+
+TEST(Config, TheDataFileForMakersThatShipsIsAcceptable) {
+    Config config = Config::defaults();
+    std::ifstream file(WP_SOURCE_DIR "/resources/vendors.json");
+    const std::string text{std::istreambuf_iterator<char>(file), {}};
+    ASSERT_FALSE(text.empty());
+    const auto refusal = applyConfig(text, config);
+    EXPECT_FALSE(refusal) << refusal->text();
+}
+
+TEST(Config, LaterFilesWinAndOnlyTheNamedOneMustBeThere) {
+    std::string pattern = ::testing::TempDir() + "/wpXXXXXX";
+    const std::string folder = mkdtemp(pattern.data());
+    std::ofstream(folder + "/a") << R"({"endpoints": {"name": "a.example", "nameWildcard": "w.example"}})";
+    std::ofstream(folder + "/b") << R"({"endpoints": {"name": "b.example"}})";
+    std::ofstream(folder + "/bad") << R"({"endpoints": {"name": 1}})";
+
+    const auto both = loadConfig({folder + "/a", folder + "/none"}, folder + "/b");
+    const auto missing = loadConfig({folder + "/a"}, folder + "/none");
+    const auto bad = loadConfig({folder + "/bad", folder + "/a"}, "");
+
+    ASSERT_TRUE(std::holds_alternative<Config>(both));
+    EXPECT_EQ(std::get<Config>(both).endpoints.name, "b.example");
+    EXPECT_EQ(std::get<Config>(both).endpoints.nameWildcard, "w.example");
+    EXPECT_EQ(std::get<std::string>(missing), folder + "/none: cannot be read");
+    EXPECT_TRUE(std::get<std::string>(bad).starts_with(folder + "/bad: endpoints.name: "))
+        << std::get<std::string>(bad);
+    std::filesystem::remove_all(folder);
+}
+
+}  // namespace
+}  // namespace wp

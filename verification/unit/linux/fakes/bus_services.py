@@ -1,0 +1,152 @@
+#!/usr/bin/python3
+"""Stand-ins for the services that a device may have on its system bus, with a small fixed state each.
+
+Usage: bus_services.py ADDRESS SERVICE...   (prints "ready"; services: nm, supplicant, iwd, bluez, resolved, broken)
+"""
+import sys
+
+import dbus
+import dbus.mainloop.glib
+import dbusmock
+from gi.repository import GLib
+
+dbus.mainloop.glib.DBusGMainLoop(set_as_default=True)
+kept = []
+
+
+def service(name, path, interface, properties=None, manager=False):
+    # A connection each: all of them want the root object.
+    bus = dbus.bus.BusConnection(sys.argv[1])
+    kept.append(dbus.service.BusName(name, bus, do_not_queue=True))
+    main = dbusmock.DBusMockObject(kept[-1], path, interface, properties or {}, is_object_manager=manager)
+    kept.append(main)
+    return main
+
+
+def text(value):
+    return dbus.ByteArray(value)
+
+
+def network_manager():
+    nm, base = "org.freedesktop.NetworkManager", "/org/freedesktop/NetworkManager"
+    main = service(nm, base, nm, {"WirelessEnabled": True, "WirelessHardwareEnabled": True})
+    main.AddMethod(nm, "GetDeviceByIpIface", "s", "o",
+                   "ret = dbus.ObjectPath('%s/Devices/' + {'wlan0': '1', 'wlan1': '2'}[args[0]])" % base)
+    device = nm + ".Device"
+    main.AddObject(base + "/Devices/1", device, {
+        "Managed": True, "ActiveConnection": dbus.ObjectPath(base + "/ActiveConnection/1"),
+        "Dhcp4Config": dbus.ObjectPath(base + "/DHCP4Config/1"), "Dhcp6Config": dbus.ObjectPath("/"),
+        "Ip4Config": dbus.ObjectPath(base + "/IP4Config/1"), "Ip6Config": dbus.ObjectPath(base + "/IP6Config/1"),
+    }, [])
+    dbusmock.get_object(base + "/Devices/1").AddMethod(
+        device + ".Wireless", "RequestScan", "a{sv}", "", "")
+    main.AddObject(base + "/Devices/2", device, {"Managed": False}, [])
+    main.AddObject(base + "/ActiveConnection/1", nm + ".Connection.Active",
+                   {"Connection": dbus.ObjectPath(base + "/Settings/1")}, [])
+    main.AddObject(base + "/DHCP4Config/1", nm + ".DHCP4Config", {"Options": dbus.Dictionary({
+        "domain_name_servers": "192.168.1.1 192.168.1.2", "captive_portal": "https://p.example/api",
+        "vendor_encapsulated_options": "EXAMPLE_METERED"}, signature="sv")}, [])
+    main.AddObject(base + "/IP4Config/1", nm + ".IP4Config", {"NameserverData": dbus.Array([
+        dbus.Dictionary({"address": "192.168.1.1"}, signature="sv")], signature="a{sv}")}, [])
+    main.AddObject(base + "/IP6Config/1", nm + ".IP6Config", {"Nameservers": dbus.Array([
+        text(bytes.fromhex("20010db8000000000000000000000053"))], signature="ay")}, [])
+
+    settings, paths = nm + ".Settings", []
+
+    def connection(number, sections):
+        path = "%s/Settings/%d" % (base, number)
+        paths.append(path)
+        value = dbus.Dictionary({name: dbus.Dictionary(keys, signature="sv") for name, keys in sections.items()},
+                                signature="sa{sv}")
+        main.AddObject(path, settings + ".Connection", {}, [])
+        target = dbusmock.get_object(path)
+        target.connection_settings = value
+        target.AddMethod(settings + ".Connection", "GetSettings", "", "a{sa{sv}}", "ret = self.connection_settings")
+
+    connection(1, {"connection": {"type": "802-11-wireless", "timestamp": dbus.UInt64(1700000000)},
+                   "802-11-wireless": {"ssid": text(b"Home \xff"), "seen-bssids": dbus.Array(
+                       ["02:00:00:00:00:01", "02:00:00:00:00:02"], signature="s")},
+                   "802-11-wireless-security": {"key-mgmt": "sae"},
+                   "ipv4": {"method": "manual", "dns": dbus.Array([dbus.UInt32(0x09090909)], signature="u")},
+                   "ipv6": {"method": "auto", "dns": dbus.Array(
+                       [text(bytes.fromhex("262000fe000000000000000000000009"))], signature="ay")},
+                   "proxy": {"method": dbus.Int32(1), "pac-url": "http://wpad/"}})
+    connection(2, {"connection": {"type": "802-3-ethernet"}, "802-3-ethernet": {}})
+    connection(3, {"connection": {"type": "802-11-wireless", "autoconnect": False},
+                   "802-11-wireless": {"ssid": text(b"Cellar"), "hidden": True}})
+    connection(4, {"connection": {"type": "802-11-wireless"},
+                   "802-11-wireless": {"ssid": text(b"Hotspot"), "mode": "ap"}})
+    main.AddObject(base + "/Settings", settings, {}, [])
+    dbusmock.get_object(base + "/Settings").AddMethod(
+        settings, "ListConnections", "", "ao",
+        "ret = dbus.Array([dbus.ObjectPath(p) for p in %r] + [dbus.ObjectPath('%s/Settings/99')], signature='o')"
+        % (paths, base))
+
+
+def supplicant():
+    name, base = "fi.w1.wpa_supplicant1", "/fi/w1/wpa_supplicant1"
+    main = service(name, base, name)
+    main.AddMethod(name, "GetInterface", "s", "o",
+                   "if args[0] != 'wlan0': raise dbus.exceptions.DBusException('no', "
+                   "name='fi.w1.wpa_supplicant1.InterfaceUnknown')\n"
+                   "ret = dbus.ObjectPath('%s/Interfaces/0')" % base)
+    networks = [base + "/Interfaces/0/Networks/%d" % i for i in range(2)]
+    main.AddObject(base + "/Interfaces/0", name + ".Interface", {"Networks": dbus.Array(
+        [dbus.ObjectPath(each) for each in networks], signature="o")},
+        [("Scan", "a{sv}", "", "assert args[0]['Type'] == 'active'")])
+    for path, enabled, properties in (
+            (networks[0], True, {"ssid": '"Home"', "key_mgmt": "WPA-PSK SAE", "proto": "WPA RSN"}),
+            (networks[1], False, {"ssid": "c3bf00", "key_mgmt": "NONE", "scan_ssid": "1", "wep_key0": "*"})):
+        main.AddObject(path, name + ".Network", {
+            "Enabled": enabled, "Properties": dbus.Dictionary(properties, signature="sv")}, [])
+
+
+def iwd():
+    name = "net.connman.iwd"
+    main = service(name, "/", name + ".Test", manager=True)
+    main.AddObject("/net/connman/iwd/0/3", name + ".Device", {"Name": "wlan0"}, [])
+    dbusmock.get_object("/net/connman/iwd/0/3").AddMethod(name + ".Station", "Scan", "", "", "")
+    main.AddObject("/net/connman/iwd/a_psk", name + ".KnownNetwork", {
+        "Name": "Home", "Type": "psk", "Hidden": False, "AutoConnect": True,
+        "LastConnectedTime": "2023-11-14T22:13:20Z"}, [])
+    main.AddObject("/net/connman/iwd/b_open", name + ".KnownNetwork", {
+        "Name": "Cafe", "Type": "open", "Hidden": True, "AutoConnect": False}, [])
+
+
+def bluez():
+    name = "org.bluez"
+    main = service(name, "/", name + ".Test", manager=True)
+    main.AddObject("/org/bluez/hci0", name + ".Adapter1", {"Powered": True}, [])
+    for number, paired, connected in ((1, True, True), (2, True, False), (3, False, False)):
+        main.AddObject("/org/bluez/hci0/dev_%d" % number, name + ".Device1",
+                       {"Paired": paired, "Connected": connected}, [])
+
+
+def resolved():
+    name = "org.freedesktop.resolve1"
+    main = service(name, "/org/freedesktop/resolve1", name + ".Manager")
+    main.AddMethod(name + ".Manager", "GetLink", "i", "o", "ret = dbus.ObjectPath('/l/%d' % args[0])")
+    main.AddObject("/l/3", name + ".Link", {"DNS": dbus.Array([
+        dbus.Struct([dbus.Int32(2), text(b"\xc0\xa8\x01\x01")], signature="iay"),
+        dbus.Struct([dbus.Int32(10), text(bytes(15) + b"\x01")], signature="iay"),
+        dbus.Struct([dbus.Int32(2), text(b"\x01")], signature="iay")], signature="(iay)")}, [])
+
+
+def broken():
+    name = "org.example.broken"
+    main = service(name, "/", name)
+    main.AddMethod(name, "Deep", "", "v",
+                   "v = dbus.String('x', variant_level=1)\nfor i in range(20): v = dbus.Array([v], signature='v')\nret = v")
+    main.AddMethod(name, "Fail", "", "",
+                   "raise dbus.exceptions.DBusException('not for you', name='org.freedesktop.DBus.Error.AccessDenied')")
+    main.AddMethod(name, "Numbers", "", "ynqiuxtdba{us}",
+                   "ret = (dbus.Byte(200), dbus.Int16(-5), dbus.UInt16(65535), dbus.Int32(-7), dbus.UInt32(8),"
+                   " dbus.Int64(-9), dbus.UInt64(2**64 - 1), 0.5, True, dbus.Dictionary({7: 'seven'}, signature='us'))")
+    main.AddMethod(name, "Sleep", "", "", "import time; time.sleep(3600)")
+
+
+for each in sys.argv[2:]:
+    {"nm": network_manager, "supplicant": supplicant, "iwd": iwd, "bluez": bluez, "resolved": resolved,
+     "broken": broken}[each]()
+print("ready", flush=True)
+GLib.MainLoop().run()

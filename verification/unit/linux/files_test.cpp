@@ -1,0 +1,234 @@
+#include <gtest/gtest.h>
+#include <stdlib.h>
+
+#include <filesystem>
+#include <fstream>
+
+#include "linux/files/leases.h"
+#include "linux/files/networkd.h"
+#include "linux/files/proxy_settings.h"
+#include "service/bytes.h"
+
+namespace wp {
+namespace {
+
+/// A folder that stands for the root of a system, gone with the test.
+class Root : public ::testing::Test {
+  protected:
+    Root() {
+        std::string pattern = ::testing::TempDir() + "/wpXXXXXX";
+        root_ = mkdtemp(pattern.data());
+    }
+    ~Root() override { std::filesystem::remove_all(root_); }
+
+    void write(const std::string& path, const std::string& content) const {
+        std::filesystem::create_directories(std::filesystem::path(root_ + path).parent_path());
+        std::ofstream(root_ + path, std::ios::binary) << content;
+    }
+
+    std::string root_;
+};
+
+std::string textsOf(const std::vector<IPAddress>& addresses) {
+    std::string text;
+    for (const IPAddress& each : addresses) text += each.text() + " ";
+    return text;
+}
+
+constexpr const char* kLeases = R"(default-duid "\000\001";
+lease {
+  interface "wlan0";
+  fixed-address 192.168.1.20;
+  option domain-name-servers 192.168.1.1, 192.168.1.2;
+  expire 5 2026/11/20 18:30:00;
+}
+lease {
+  interface "eth0";
+  option domain-name-servers 10.0.0.1;
+  expire never;
+}
+lease {
+  interface "wlan0";
+  option domain-name-servers 192.168.1.3;
+  option vendor-encapsulated-options "EXAMPLE_METERED";
+  option unknown-114 "https://p.example/api";
+  expire 5 2026/11/20 19:30:00;
+}
+)";
+constexpr std::int64_t kSixThirtyPm = 1'795'199'400;  // 2026-11-20 18:30:00 UTC
+
+TEST(Leases, TheLastLeaseOfTheInterfaceCounts) {
+    const auto lease = readDhclientLeases(kLeases, "wlan0", kSixThirtyPm);
+    ASSERT_TRUE(lease);
+    EXPECT_EQ(textsOf(lease->servers), "192.168.1.3 ");
+    EXPECT_EQ(lease->vendorText, "EXAMPLE_METERED");
+    EXPECT_EQ(lease->portalApi, "https://p.example/api");
+    EXPECT_EQ(textsOf(readDhclientLeases(kLeases, "eth0", kSixThirtyPm)->servers), "10.0.0.1 ");
+    EXPECT_FALSE(readDhclientLeases(kLeases, "wlan1", kSixThirtyPm));
+}
+
+TEST(Leases, OneThatHasEndedIsNone) {
+    EXPECT_TRUE(readDhclientLeases(kLeases, "wlan0", kSixThirtyPm + 3599));
+    EXPECT_FALSE(readDhclientLeases(kLeases, "wlan0", kSixThirtyPm + 3600));
+    EXPECT_FALSE(readDhclientLeases("lease {\ninterface \"w\";\nexpire epoch 100; # old\n}\n", "w", 101));
+    EXPECT_FALSE(readDhclientLeases("lease {\ninterface \"w\";\nexpire 5 2026/13/40 1:2:3;\n}\n", "w", 0));
+}
+
+TEST(Leases, CutAndBrokenFilesAreReadAsFarAsTheyGo) {
+    const std::string whole = kLeases;
+    for (std::size_t size = 0; size < whole.size(); ++size)
+        readDhclientLeases(whole.substr(0, size), "wlan0", 0);
+    EXPECT_FALSE(readDhclientLeases("}\n}\nlease {\nlease {\n", "wlan0", 0));
+}
+
+TEST(ResolverFile, NamesItsServers) {
+    EXPECT_EQ(textsOf(serversFromResolverFile(
+                  "# x\nnameserver 192.168.1.1\nsearch a\n\tnameserver\t2001:db8::1%wlan0\n"
+                  "nameserver bogus\nnameserver\n")),
+              "192.168.1.1 2001:db8::1 ");
+}
+
+UnitFile unit(const std::string& text) {
+    UnitFile settings;
+    readUnitFile(text, settings);
+    return settings;
+}
+
+std::string methodsOf(const std::string& text) {
+    const AddressMethods methods = methodsFromNetworkd(unit(text));
+    return *methods.ipv4 + " " + *methods.ipv6;
+}
+
+TEST(Networkd, SettingsBecomeMethods) {
+    EXPECT_EQ(methodsOf("[Network]\nDHCP=yes\n"), "auto auto");
+    EXPECT_EQ(methodsOf("[Network]\nDHCP=ipv4\nIPv6AcceptRA=no\n"), "auto link-local");
+    EXPECT_EQ(methodsOf("[Network]\nAddress=192.168.1.5/24\nAddress=2001:db8::5/64\n"), "manual manual");
+    EXPECT_EQ(methodsOf("[Network]\nDHCP=ipv6\n[Address]\nAddress=192.168.1.5/24\n"), "manual auto");
+    EXPECT_EQ(methodsOf("[Network]\nLinkLocalAddressing=no\n"), "disabled disabled");
+    EXPECT_EQ(methodsOf("[Network]\nLinkLocalAddressing=yes\nIPv6AcceptRA=false\n"), "link-local link-local");
+    EXPECT_EQ(methodsOf("[Network]\nAddress=192.168.1.5/24\nAddress=\nDHCP=yes\n"), "auto auto");
+}
+
+TEST_F(Root, OfASystemWithNetworkdTellsMethodsServersAndLease) {
+    write("/run/systemd/netif/links/3",
+          "ADMIN_STATE=configured\nNETWORK_FILE=/etc/systemd/network/wlan0.network\n"
+          "NETWORK_FILE_DROPINS=\"/etc/systemd/network/wlan0.network.d/dns.conf\"\n");
+    write("/etc/systemd/network/wlan0.network", "[Match]\nName=wlan0\n[Network]\nDHCP=ipv4\n");
+    write("/etc/systemd/network/wlan0.network.d/dns.conf", "[Network]\nDNS=9.9.9.9#dns.example 2620:fe::9\n");
+    write("/run/systemd/netif/leases/3",
+          "ADDRESS=192.168.1.20\nDNS=192.168.1.1\nCAPTIVE_PORTAL=https://p.example/\n");
+
+    const auto link = readNetworkdLink(3, root_);
+
+    ASSERT_TRUE(link);
+    EXPECT_EQ(*link->methods.ipv4, "auto");
+    EXPECT_EQ(textsOf(link->manualServers), "9.9.9.9 2620:fe::9 ");
+    EXPECT_EQ(textsOf(link->offeredServers), "192.168.1.1 ");
+    EXPECT_TRUE(link->hasLease);
+    EXPECT_EQ(link->portalApi, "https://p.example/");
+    EXPECT_FALSE(readNetworkdLink(4, root_));
+}
+
+TEST_F(Root, WithoutANetworkFileIsNotManagedByNetworkd) {
+    write("/run/systemd/netif/links/3", "ADMIN_STATE=unmanaged\n");
+    EXPECT_FALSE(readNetworkdLink(3, root_));
+}
+
+TEST_F(Root, KeepsALeaseWhereItsClientPutsIt) {
+    write("/var/lib/dhcp/dhclient.wlan0.leases", kLeases);
+    EXPECT_TRUE(findLease("wlan0", kSixThirtyPm, root_));
+    EXPECT_FALSE(findLease("wlan0", kSixThirtyPm + 3600, root_));
+}
+
+TEST_F(Root, FilesThatAreTooLongOrNoFilesAreNotRead) {
+    write("/long", std::string(11, 'x'));
+    EXPECT_FALSE(readSmallFile(root_ + "/long", 10));
+    EXPECT_EQ(readSmallFile(root_ + "/long", 11), std::string(11, 'x'));
+    EXPECT_FALSE(readSmallFile(root_));
+    EXPECT_FALSE(readSmallFile("/dev/zero"));
+}
+
+const char* noVariable(const char*) {
+    return nullptr;
+}
+
+TEST_F(Root, ProxiesAreFoundInEnvironmentAndFile) {
+    write("/etc/environment",
+          "PATH=/bin\n#http_proxy=http://old/\nexport https_proxy=\"http://p:3128\"\nno_proxy=x\n");
+    const auto variable = [](const char* name) {
+        if (std::string_view(name) == "ALL_PROXY") return "socks5://p";
+        return std::string_view(name) == "http_proxy" ? "" : static_cast<const char*>(nullptr);
+    };
+    EXPECT_EQ(findProxies(variable, root_),
+              (std::vector<std::string>{"environment: ALL_PROXY", "/etc/environment: https_proxy"}));
+    EXPECT_EQ(findProxies(noVariable, root_ + "/none"), std::vector<std::string>());
+}
+
+void put32(std::string& into, std::uint32_t number) {
+    for (int shift = 0; shift < 32; shift += 8) into += static_cast<char>(number >> shift);
+}
+
+/// A settings database with one key that is chained to a parent.
+std::string settingsDatabase(const std::string& mode) {
+    const std::string parent = "/org/gnome/system/", child = "proxy/mode";
+    const std::string value = mode + std::string("\0\0s", 3);
+    const std::uint32_t table = 24 + 8 + 4 + 2 * 24;
+    std::string bytes = "GVariant";
+    put32(bytes, 0);
+    put32(bytes, 0);
+    put32(bytes, 24);
+    put32(bytes, table);
+    put32(bytes, 0);
+    put32(bytes, 1);
+    put32(bytes, 0);
+    const auto item = [&](std::uint32_t parentIndex, std::uint32_t key, std::size_t size, char type,
+                          std::uint32_t start, std::uint32_t end) {
+        put32(bytes, 0);
+        put32(bytes, parentIndex);
+        put32(bytes, key);
+        bytes += static_cast<char>(size);
+        bytes += '\0';
+        bytes += type;
+        bytes += '\0';
+        put32(bytes, start);
+        put32(bytes, end);
+    };
+    const auto parentAt = table, childAt = parentAt + static_cast<std::uint32_t>(parent.size());
+    const auto valueAt = childAt + static_cast<std::uint32_t>(child.size());
+    item(0xFFFFFFFF, parentAt, parent.size(), 'L', 0, 0);
+    item(0, childAt, child.size(), 'v', valueAt, valueAt + static_cast<std::uint32_t>(value.size()));
+    return bytes + parent + child + value;
+}
+
+TEST(SettingsDatabase, TellsTheProxyMode) {
+    EXPECT_EQ(proxyModeInSettingsDatabase(settingsDatabase("manual")), "manual");
+    EXPECT_EQ(proxyModeInSettingsDatabase(settingsDatabase("none")), "none");
+}
+
+TEST(SettingsDatabase, CutOrTwistedTellsNothingAndReadsNothingBeyond) {
+    const std::string whole = settingsDatabase("manual");
+    for (std::size_t size = 0; size < whole.size(); ++size)
+        EXPECT_EQ(proxyModeInSettingsDatabase(whole.substr(0, size)), "") << size;
+    for (std::size_t at = 0; at < whole.size(); ++at) {
+        std::string twisted = whole;
+        twisted[at] = static_cast<char>(~twisted[at]);
+        proxyModeInSettingsDatabase(twisted);
+    }
+    std::string circle = whole;
+    circle[36 + 4] = 0;  // the parent of the parent is itself
+    circle[36 + 5] = circle[36 + 6] = circle[36 + 7] = 0;
+    EXPECT_EQ(proxyModeInSettingsDatabase(circle), "");
+}
+
+TEST_F(Root, ADesktopsProxyCountsUnlessItIsNone) {
+    const auto variable = [](const char* name) {
+        return std::string_view(name) == "HOME" ? "/home/u" : nullptr;
+    };
+    write("/home/u/.config/dconf/user", settingsDatabase("auto"));
+    EXPECT_EQ(findProxies(variable, root_), (std::vector<std::string>{"desktop settings: auto"}));
+    write("/home/u/.config/dconf/user", settingsDatabase("none"));
+    EXPECT_EQ(findProxies(variable, root_), std::vector<std::string>());
+}
+
+}  // namespace
+}  // namespace wp

@@ -1,0 +1,263 @@
+#include <gtest/gtest.h>
+#include <stdlib.h>
+
+#include <algorithm>
+#include <filesystem>
+#include <thread>
+
+#include "linux/dbus/bluez.h"
+#include "linux/dbus/iwd.h"
+#include "linux/dbus/network_manager.h"
+#include "linux/dbus/network_records.h"
+#include "linux/dbus/resolved.h"
+#include "linux/dbus/supplicant.h"
+#include "verification/unit/linux/fakes/child_process.h"
+#include "verification/unit/linux/stop.h"
+
+namespace wp {
+namespace {
+
+using namespace std::chrono_literals;
+
+/// A message bus of the tests' own, with a stand-in for each service.
+class MessageBus : public ::testing::Test {
+  protected:
+    static void SetUpTestSuite() {
+        std::string pattern = ::testing::TempDir() + "/wpXXXXXX";
+        folder_ = mkdtemp(pattern.data());
+        address_ = "unix:path=" + folder_ + "/bus";
+        daemon_ = new ChildProcess({"dbus-daemon", "--session", "--nofork", "--nopidfile", "--print-address",
+                                    "--address=" + address_});
+        services_ = new ChildProcess({"/usr/bin/python3",
+                                      WP_SOURCE_DIR "/verification/unit/linux/fakes/bus_services.py",
+                                      address_, "nm", "supplicant", "iwd", "bluez", "resolved", "broken"});
+    }
+    static void TearDownTestSuite() {
+        delete services_;
+        delete daemon_;
+        std::filesystem::remove_all(folder_);
+    }
+
+    Bus bus() const {
+        auto known = Bus::at(address_);
+        EXPECT_TRUE(known);
+        return std::move(*known);
+    }
+
+    inline static std::string folder_, address_;
+    inline static ChildProcess *daemon_ = nullptr, *services_ = nullptr;
+};
+
+int codeOf(Reason reason) {
+    return static_cast<int>(reason);
+}
+
+std::string textsOf(const std::vector<IPAddress>& addresses) {
+    std::string text;
+    for (const IPAddress& each : addresses) text += each.text() + " ";
+    return text;
+}
+
+/// One line per network: name, security, and the first letters of what is set.
+std::string linesOf(const SavedNetworks& saved) {
+    std::string lines = saved.store + "\n";
+    for (const SavedNetwork& each : saved.networks) {
+        lines += textFromName(each.name) + " " + std::to_string(static_cast<int>(each.security));
+        lines += std::string(each.enabled ? " enabled" : "") + (each.hidden ? " hidden" : "") +
+                 (each.seenSeveralAPs ? " several" : "");
+        if (each.lastJoined)
+            lines += " " + std::to_string(static_cast<std::int64_t>(each.lastJoined->secondsSinceReference));
+        lines += "\n";
+    }
+    return lines;
+}
+
+TEST_F(MessageBus, ReadsValuesOfEveryKind) {
+    Bus bus = this->bus();
+    const auto reply = bus.call({"org.example.broken", "/"}, "org.example.broken", "Numbers", {}, patience());
+    ASSERT_TRUE(reply) << reply.error().text();
+    const auto& values = reply->list();
+    ASSERT_EQ(values.size(), 10U);
+    EXPECT_EQ(values[0].number(), 200);
+    EXPECT_EQ(values[1].number(), -5);
+    EXPECT_EQ(values[2].number(), 65535);
+    EXPECT_EQ(values[3].number(), -7);
+    EXPECT_EQ(values[5].number(), -9);
+    EXPECT_EQ(values[6].number(), std::nullopt);
+    EXPECT_EQ(*values[7].as<double>(), 0.5);
+    EXPECT_TRUE(values[8].flag());
+    EXPECT_EQ(values[9]["7"].text(), "seven");
+    EXPECT_TRUE(values[9]["8"].empty());
+    EXPECT_EQ(values[0].text("none"), "none");
+}
+
+TEST_F(MessageBus, ErrorsTellWhoIsMissingAndWhoRefuses) {
+    Bus bus = this->bus();
+    const BusObject broken{"org.example.broken", "/"};
+    const auto absent = bus.call({"org.example.absent", "/"}, "a.b", "C", {}, patience());
+    const auto refused = bus.call(broken, "org.example.broken", "Fail", {}, patience());
+    const auto unknown = bus.call(broken, "org.example.broken", "Nothing", {}, patience());
+    const auto deep = bus.call(broken, "org.example.broken", "Deep", {}, patience());
+    ASSERT_TRUE(!absent && !refused && !unknown && !deep);
+    EXPECT_EQ(absent.error().code, codeOf(Reason::unavailable)) << absent.error().text();
+    EXPECT_EQ(refused.error().code, codeOf(Reason::notPermitted)) << refused.error().text();
+    EXPECT_EQ(unknown.error().code, codeOf(Reason::notFound)) << unknown.error().text();
+    EXPECT_EQ(deep.error().code, codeOf(Reason::malformed)) << deep.error().text();
+}
+
+TEST_F(MessageBus, WithoutABusThereIsNothingToAsk) {
+    auto none = Bus::at("unix:path=" + folder_ + "/none");
+    if (none) {
+        const auto reply = none->call({"a.b", "/"}, "a.b", "C", {}, patience());
+        ASSERT_FALSE(reply);
+        EXPECT_EQ(reply.error().code, codeOf(Reason::unavailable));
+    } else {
+        EXPECT_EQ(none.error().code, codeOf(Reason::unavailable));
+    }
+}
+
+TEST_F(MessageBus, ASilentServiceIsLeftAtTheDeadlineAndWhenStopped) {
+    const ChildProcess silent({"/usr/bin/python3", "-c",
+                               "import dbus, sys, time\n"
+                               "bus = dbus.bus.BusConnection(sys.argv[1])\n"
+                               "bus.request_name('org.example.silent')\n"
+                               "print('ready', flush=True)\n"
+                               "time.sleep(3600)",
+                               address_});
+    Bus bus = this->bus();
+    const BusObject object{"org.example.silent", "/"};
+    const auto late = bus.call(object, "a.b", "C", {}, patience(50ms));
+    const auto stop = std::make_shared<StopSignal>();
+    stop->raise();
+    const auto stopped = bus.call(object, "a.b", "C", {}, patience(20s, stop));
+    ASSERT_TRUE(!late && !stopped);
+    EXPECT_EQ(late.error().code, codeOf(Reason::timeout));
+    EXPECT_EQ(stopped.error().code, codeOf(Reason::cancelled));
+}
+
+TEST_F(MessageBus, NetworkManagerTellsOfTheLinkThatItManages) {
+    Bus bus = this->bus();
+    const auto link = readNetworkManagerLink(bus, "wlan0", patience());
+    ASSERT_TRUE(link) << link.error().text();
+    EXPECT_EQ(link->settings["ipv4"]["method"].text(), "manual");
+    EXPECT_EQ(link->settings["ipv6"]["method"].text(), "auto");
+    EXPECT_EQ(link->lease4.at("domain_name_servers"), "192.168.1.1 192.168.1.2");
+    EXPECT_EQ(textsOf(link->servers), "192.168.1.1 2001:db8::53 ");
+    EXPECT_EQ(textsOf(manualServers(link->settings)), "9.9.9.9 2620:fe::9 ");
+    EXPECT_EQ(proxyOf(link->settings), "NetworkManager profile: pac-url");
+    EXPECT_TRUE(requestNetworkManagerScan(bus, link->device, patience()));
+}
+
+TEST_F(MessageBus, AnInterfaceThatNetworkManagerLeavesAloneIsNotItsOwn) {
+    Bus bus = this->bus();
+    const auto link = readNetworkManagerLink(bus, "wlan1", patience());
+    ASSERT_FALSE(link);
+    EXPECT_EQ(link.error().code, codeOf(Reason::notFound));
+}
+
+TEST_F(MessageBus, NetworkManagerTellsItsNetworks) {
+    Bus bus = this->bus();
+    const auto saved = networkManagerNetworks(bus, patience());
+    ASSERT_TRUE(saved) << saved.error().text();
+    EXPECT_EQ(linesOf(*saved),
+              "NetworkManager\n"
+              "Home \\xFF 5 enabled several 721692800\n"
+              "Cellar 0 hidden\n");
+}
+
+TEST_F(MessageBus, NetworkManagerSwitchesWiFi) {
+    Bus bus = this->bus();
+    ASSERT_TRUE(networkManagerPower(bus, patience()));
+    EXPECT_TRUE(networkManagerPower(bus, patience())->software);
+    EXPECT_TRUE(setNetworkManagerPower(bus, false, patience()));
+    EXPECT_FALSE(networkManagerPower(bus, patience())->software);
+    EXPECT_TRUE(setNetworkManagerPower(bus, true, patience()));
+}
+
+TEST_F(MessageBus, TheSupplicantTellsItsNetworks) {
+    Bus bus = this->bus();
+    const auto interface = supplicantInterface(bus, "wlan0", patience());
+    ASSERT_TRUE(interface) << interface.error().text();
+    const auto saved = supplicantNetworks(bus, *interface, patience());
+    ASSERT_TRUE(saved) << saved.error().text();
+    EXPECT_EQ(linesOf(*saved), std::string("wpa_supplicant\nHome 4 enabled\n\xC3\xBF\0 2 hidden\n", 43));
+    EXPECT_TRUE(requestSupplicantScan(bus, *interface, patience()));
+    const auto other = supplicantInterface(bus, "wlan7", patience());
+    ASSERT_FALSE(other);
+    EXPECT_EQ(other.error().code, codeOf(Reason::notFound));
+}
+
+TEST_F(MessageBus, IwdTellsItsNetworks) {
+    Bus bus = this->bus();
+    const auto objects = iwdObjects(bus, patience());
+    ASSERT_TRUE(objects) << objects.error().text();
+    EXPECT_EQ(iwdDevice(*objects, "wlan0"), "/net/connman/iwd/0/3");
+    EXPECT_EQ(iwdDevice(*objects, "wlan1"), "");
+    EXPECT_EQ(linesOf(iwdNetworks(*objects)), "iwd\nHome 4 enabled 721692800\nCafe 0 hidden\n");
+    EXPECT_TRUE(requestIwdScan(bus, "/net/connman/iwd/0/3", patience()));
+}
+
+TEST_F(MessageBus, BluetoothDevicesAreCounted) {
+    Known<Bus> bus = Bus::at(address_);
+    const auto bluetooth = readBluetooth(bus, true, patience());
+    ASSERT_TRUE(bluetooth) << bluetooth.error().text();
+    EXPECT_EQ(bluetooth->controllers, 1U);
+    EXPECT_TRUE(bluetooth->powered);
+    EXPECT_EQ(bluetooth->paired, 2U);
+    EXPECT_EQ(bluetooth->connected, 1U);
+}
+
+TEST_F(MessageBus, WithoutABluetoothServiceOnlyALackOfControllersCanBeTold) {
+    Known<Bus> bus = failure(Reason::unavailable, "there is no message bus");
+    const auto none = readBluetooth(bus, false, patience());
+    const auto unknown = readBluetooth(bus, true, patience());
+    ASSERT_TRUE(none);
+    EXPECT_EQ(none->paired, 0U);
+    ASSERT_FALSE(unknown);
+    EXPECT_EQ(unknown.error().code, codeOf(Reason::unavailable));
+}
+
+TEST_F(MessageBus, TheResolverTellsTheLinksServers) {
+    Bus bus = this->bus();
+    const auto servers = resolvedServers(bus, 3, patience());
+    ASSERT_TRUE(servers) << servers.error().text();
+    EXPECT_EQ(textsOf(*servers), "192.168.1.1 ::1 ");
+    EXPECT_FALSE(resolvedServers(bus, 4, patience()));
+}
+
+TEST(NetworkRecords, NamesOfTheSupplicantComeInThreeForms) {
+    const auto text = [](std::string_view form) {
+        const auto name = nameFromSupplicant(form);
+        return name ? textFromName(*name) : "none";
+    };
+    EXPECT_EQ(text("\"a\"b\""), "a\"b");
+    EXPECT_EQ(text("416263"), "Abc");
+    EXPECT_EQ(text("P\"a\\x41\\\\\\\"\\e\""), "aA\\\"\x1B");
+    for (const char* form : {"", "\"", "\"\"", "41626", "zz", "P\"\\q\"", "P\"\\x4\"", "P\"\\\"",
+                             "\"123456789012345678901234567890123\""})
+        EXPECT_EQ(text(form), "none") << form;
+}
+
+TEST(NetworkRecords, KeyManagementBecomesAKindOfSecurity) {
+    using enum SavedSecurity;
+    EXPECT_EQ(securityFromSupplicant("WPA-EAP IEEE8021X", "", false), enterprise);
+    EXPECT_EQ(securityFromSupplicant("WPA-PSK WPA-EAP", "", false), enterprise);
+    EXPECT_EQ(securityFromSupplicant("SAE", "RSN", false), sae);
+    EXPECT_EQ(securityFromSupplicant("WPA-PSK", "WPA", false), wpaPersonal);
+    EXPECT_EQ(securityFromSupplicant("WPA-PSK SAE", "WPA RSN", false), wpa2Personal);
+    EXPECT_EQ(securityFromSupplicant("OWE", "", false), owe);
+    EXPECT_EQ(securityFromSupplicant("NONE", "", false), open);
+    EXPECT_EQ(securityFromSupplicant("NONE", "", true), wep);
+    EXPECT_EQ(securityFromSupplicant("", "", false), unknown);
+}
+
+TEST(NetworkRecords, MomentsAreReadInOneFormOnly) {
+    EXPECT_EQ(dateFromText("2001-01-01T00:00:00Z"), Date{0});
+    EXPECT_EQ(dateFromText("2023-11-14T22:13:20Z"), dateFromUnix(1'700'000'000));
+    for (const char* text : {"", "2023-11-14", "2023-11-14T22:13:20", "2023-13-14T22:13:20Z",
+                             "2023-11-31T22:13:20Z", "2023-11-14T24:13:20Z", "2023-11-14 22:13:20Z"})
+        EXPECT_FALSE(dateFromText(text)) << text;
+}
+
+}  // namespace
+}  // namespace wp
