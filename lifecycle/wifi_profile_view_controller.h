@@ -37,8 +37,7 @@ std::shared_ptr<ScanList> makeScanList();
 /// and the tests begin when the user has confirmed one (`runTests`). The tests are one block on the
 /// background queue: the device, then the network that the device is joined to, then the selected network,
 /// one request after the other. Half a second after the last one the run ends with its status code and the
-/// result document
-/// (`endTestWithStatusCode`), and the host tears it down.
+/// result document (`endTestWithStatusCode`), and the host tears it down.
 ///
 /// Threads. *Main*: the host's calls, alerts and rows, power callbacks, every view. *Background*: the block
 /// of the tests and the scans of the list. What both sides touch is atomic or a `Synchronized` value; a
@@ -74,8 +73,7 @@ class WiFiProfileViewController final : public DiagnosticViewController,
     explicit WiFiProfileViewController(Platform& platform) : platform_(platform) {}
     ~WiFiProfileViewController() override;
 
-    // 1. Life of a run -- lifecycle/run.cpp
-    // ------------------------------------------------------------------
+    // 1. Life of a run -- lifecycle/run.cpp -----------------------------------------------------------------
 
     /// Keeps the inputs and makes the run's state: counters at 0, the configurations that do not depend on
     /// the selection, three empty result sections. *Main*; the responder is not used.
@@ -129,8 +127,7 @@ class WiFiProfileViewController final : public DiagnosticViewController,
     WiFiStatusPointer wifiStatus() const { return wifiStatus_.get(); }
     void setWifiStatus(WiFiStatusPointer status) { wifiStatus_.set(std::move(status)); }
 
-    // 2. Wi-Fi power -- lifecycle/wifi_power.cpp
-    // -------------------------------------------------------------
+    // 2. Wi-Fi power -- lifecycle/wifi_power.cpp ------------------------------------------------------------
 
     /// Gets the Wi-Fi manager client, its first device and the power state, and registers for power changes
     /// on the caller's run loop. Without a client or a device it logs that, ends the run (-2, -3) and returns
@@ -146,8 +143,7 @@ class WiFiProfileViewController final : public DiagnosticViewController,
 
     bool wifiPoweredOn() const { return wifiPoweredOn_; }
 
-    // 3. Phases and result document -- lifecycle/phases.cpp
-    // --------------------------------------------------
+    // 3. Phases and result document -- lifecycle/phases.cpp -------------------------------------------------
 
     /// Each runs the tests of its phase in their fixed order, each followed by `updateProgress`, and never
     /// stops early. *Background*; blocks.
@@ -163,8 +159,7 @@ class WiFiProfileViewController final : public DiagnosticViewController,
     const DictionaryPointer& currentNetworkData() const { return currentNetworkData_; }
     const DictionaryPointer& selectedNetworkData() const { return selectedNetworkData_; }
 
-    // 4. Progress screen -- lifecycle/progress_screen.cpp
-    // ----------------------------------------------------
+    // 4. Progress screen -- lifecycle/progress_screen.cpp ---------------------------------------------------
 
     /// Turns the screen into the progress screen. *Main*; before the views exist it changes nothing visible.
     void showProgress();
@@ -181,16 +176,14 @@ class WiFiProfileViewController final : public DiagnosticViewController,
     std::int32_t completedTests() const { return completedTests_; }
     std::int32_t totalTests() const { return totalTests_; }
 
-    // 5. Test invocation -- tests/test_invocation.cpp
-    // --------------------------------------------------------
+    // 5. Test invocation -- tests/test_invocation.cpp -------------------------------------------------------
 
     /// The first of the results; null, and a log line that says why, when there is none. *Any* thread.
     DiagnosticsTestResultPointer testResultFromResults(
         const std::optional<DiagnosticsTestResults>& results) const;
 
-    // 6. Device configuration tests -- tests/device_configuration_tests.cpp
-    // ---------------------------------- Each asks the service for one test with `configuration` and writes
-    // `deviceData`. *Background*; blocks.
+    // 6. Device configuration tests -- tests/device_configuration_tests.cpp ---------------------------------
+    // Each asks the service for one test with `configuration` and writes `deviceData`. *Background*; blocks.
 
     void runDeviceConfigurationCustomIPv4();
     void runDeviceConfigurationCustomIPv6();
@@ -204,10 +197,9 @@ class WiFiProfileViewController final : public DiagnosticViewController,
     void runDeviceConfigurationPNLContainsHidden();
     void runDeviceConfigurationConflictingSecurityTypeInPNL();
 
-    // 7. Current-network tests: properties -- tests/network_property_tests.cpp
-    // ------------------------------- Each asks the service for one test with the configuration given and
-    // writes only the dictionary given, so that it serves the current and the selected network alike.
-    // *Background*; blocks.
+    // 7. Current-network tests: properties -- tests/network_property_tests.cpp ------------------------------
+    // Each asks the service for one test with the configuration given and writes only the dictionary given,
+    // so that it serves the current and the selected network alike. *Background*; blocks.
 
     void runCurrentNetworkDetectDoubleNATWithConfiguration(Configuration configuration,
                                                            Results resultsDictionary);
@@ -238,8 +230,8 @@ class WiFiProfileViewController final : public DiagnosticViewController,
     void runCurrentNetworkMarlixBaseStationWithConfiguration(Configuration configuration,
                                                              Results resultsDictionary);
 
-    // 8. Current-network tests: connectivity -- tests/connectivity_tests.cpp
-    // --------------------------------- As in section 7, for the current network only.
+    // 8. Current-network tests: connectivity -- tests/connectivity_tests.cpp --------------------------------
+    // As in section 7, for the current network only.
 
     void runCurrentNetworkPingLANWithConfiguration(Configuration configuration, Results resultsDictionary);
     void runCurrentNetworkPingWANWithConfiguration(Configuration configuration, Results resultsDictionary);
@@ -253,9 +245,8 @@ class WiFiProfileViewController final : public DiagnosticViewController,
     void runCurrentNetworkRetrieveVantorWithConfiguration(Configuration configuration,
                                                           Results resultsDictionary);
 
-    // 9. Current-network tests: channel, signal, scan -- tests/channel_tests.cpp
-    // ----------------------------- As in section 7. The no-scan-results test is the list's: it is no part of
-    // the current-network phase.
+    // 9. Current-network tests: channel, signal, scan -- tests/channel_tests.cpp ----------------------------
+    // As in section 7. The no-scan-results test is the list's: it is no part of the current-network phase.
 
     void runCurrentNetworkCongestedChannelWithConfiguration(Configuration configuration,
                                                             Results resultsDictionary);
@@ -278,9 +269,8 @@ class WiFiProfileViewController final : public DiagnosticViewController,
     ArrayPointer wifiScanResults() const { return wifiScanResults_.get(); }
     void setWifiScanResults(ArrayPointer results) { wifiScanResults_.set(std::move(results)); }
 
-    // 10. Selected-network tests -- tests/selected_network_tests.cpp
-    // ----------------------------------------- Each calls the current-network test of its name with
-    // `configuration` and `selectedNetworkData`.
+    // 10. Selected-network tests -- tests/selected_network_tests.cpp ----------------------------------------
+    // Each calls the current-network test of its name with `configuration` and `selectedNetworkData`.
 
     void runSelectedNetworkLongBeaconInterval();
     void runSelectedNetworkNoSecurity();
@@ -299,10 +289,10 @@ class WiFiProfileViewController final : public DiagnosticViewController,
     void runSelectedNetworkConflictingCountryCode();
     void runSelectedNetworkPoorSignal();
 
-    // 11. Scan list model -- network_list/scan_list_model.cpp
-    // ---------------------------------------------------------- The list is built in the background, in a
-    // job that holds copies of all that it depends on, and published on the main queue by the step that shows
-    // it. So the table's data source never changes under the table, and no lock is needed.
+    // 11. Scan list model -- network_list/scan_list_model.cpp -----------------------------------------------
+    // The list is built in the background, in a job that holds copies of all that it depends on, and
+    // published on the main queue by the step that shows it. So the table's data source never changes under
+    // the table, and no lock is needed.
 
     /// Rebuilds the job's collections from its scan: one entry per name, the strongest; the joined access
     /// point only in `distinctNetworks`; the joined network's other access points nowhere. *Background*.
@@ -338,9 +328,8 @@ class WiFiProfileViewController final : public DiagnosticViewController,
     /// Whether the row that scans again may be used: once the first list is shown.
     bool refreshEnabled() const { return refreshEnabled_; }
 
-    // 12. Incremental list update -- network_list/list_update.cpp
-    // ------------------------------------------------------ All *Main*. Networks are matched by name, exactly:
-    // one that changed its strength keeps its row.
+    // 12. Incremental list update -- network_list/list_update.cpp -------------------------------------------
+    // All *Main*. Networks are matched by name, exactly: one that changed its strength keeps its row.
 
     /// Inserts the rows of the first list.
     void loadInitialNetworkList();
@@ -349,8 +338,8 @@ class WiFiProfileViewController final : public DiagnosticViewController,
     void deleteLostNetworks();
     void insertNewNetworks();
 
-    // 13. Selection, confirmation, other network -- network_list/selection.cpp
-    // ----------------------------------------- All *Main*. The selection is a name and nothing else.
+    // 13. Selection, confirmation, other network -- network_list/selection.cpp ------------------------------
+    // All *Main*. The selection is a name and nothing else.
 
     /// Asks the user to confirm the network (null: the selected name, which no scan has shown); "yes" makes it
     /// the selected one where `shouldUpdate` says so, and runs the tests.
@@ -375,8 +364,8 @@ class WiFiProfileViewController final : public DiagnosticViewController,
         return previousSelectedNetworkName_;
     }
 
-    // 14. Network list table -- network_list/table.cpp
-    // ----------------------------------------------------------------- All *Main*, but for the spinner.
+    // 14. Network list table -- network_list/table.cpp ------------------------------------------------------
+    // All *Main*, but for the spinner.
 
     /// Runs the first scan in the background and shows the list; returns at once.
     void displayNetworkList();
@@ -412,8 +401,8 @@ class WiFiProfileViewController final : public DiagnosticViewController,
     static constexpr int kBarPositionTopAttached = 3;
     int positionForBar() const { return kBarPositionTopAttached; }
 
-    // 15. Screen layout and views -- network_list/screen_layout.cpp
-    // ---------------------------------------------------- All *Main*. Null before the views are built.
+    // 15. Screen layout and views -- network_list/screen_layout.cpp -----------------------------------------
+    // All *Main*. Null before the views are built.
 
     /// Builds the screen. The argument is not consulted: the table is always there.
     void setupViewWithNetworkList(bool withNetworkList);

@@ -103,7 +103,7 @@ S
 scan() {
     local dev=$1 i; shift
     ip link set "$dev" up
-    for i in 1 2 3 4 5; do iw dev "$dev" scan "$@" 2>/dev/null && return; sleep 0.5; done
+    for i in 1 2 3 4 5; do timeout 60 iw dev "$dev" scan "$@" 2>/dev/null && return; sleep 0.5; done
     return 1
 }
 

@@ -34,7 +34,9 @@ inline std::shared_ptr<WiFiProfileViewController> controllerFor(Platform& platfo
 struct DiagnosticRun {
     explicit DiagnosticRun(NetworkList list = NetworkList::hidden,
                            std::optional<std::string> networkName = std::nullopt)
-        : controller(controllerFor(device.platform, request(list, std::move(networkName)))) {}
+        : controller(controllerFor(device.platform, request(list, std::move(networkName)))) {
+        device.screen.setRootViewController(controller);
+    }
 
     /// Starts the run and takes every step until nothing is left to do.
     void runToEnd() {

@@ -1,0 +1,48 @@
+# What one does with the project from its root, on Debian 12. All but `build` first install what is missing.
+SHELL := /bin/bash
+LAB := verification/lab
+JOBS := $(shell nproc)
+FUZZ_SECONDS ?= 600
+MONKEY_EVENTS ?= 1000000
+
+.PHONY: help run test build bench lab fuzz monkey
+help:
+	@echo "make run      build, and profile this machine's Wi-Fi (without a radio: replay the demo recording)"
+	@echo "make build    build/wifi-profile"
+	@echo "make test     all tests but those of the lab"
+	@echo "make lab      system tests in a virtual machine with simulated radios"
+	@echo "make bench    benchmarks: a table, and build/bench.json"
+	@echo "make fuzz     each fuzz target for FUZZ_SECONDS ($(FUZZ_SECONDS))"
+	@echo "make monkey   MONKEY_EVENTS ($(MONKEY_EVENTS)) random events against the headless screen"
+
+build:
+	@cmake --preset dev > /dev/null
+	@cmake --build build -j $(JOBS)
+
+# Standard output is the result's alone.
+run:
+	@{ verification/install_packages build test && $(MAKE) -s build; } >&2
+	@if compgen -G '/sys/class/ieee80211/*' > /dev/null; then exec build/wifi-profile run; \
+	else echo "No Wi-Fi radio here: replaying the demo recording 'home'." >&2; exec build/wifi-profile run --demo home; fi
+
+test:
+	@verification/run_tests
+
+lab:
+	@verification/install_packages build test lab
+	@$(MAKE) -s build
+	@$(LAB)/setup --uml
+	@$(LAB)/run-scenarios
+
+bench:
+	@verification/install_packages build test
+	@verification/run_bench
+
+fuzz:
+	@verification/install_packages build test fuzz
+	@verification/run_fuzz $(FUZZ_SECONDS)
+
+monkey:
+	@verification/install_packages build test
+	@$(MAKE) -s build
+	@WP_MONKEY_EVENTS=$(MONKEY_EVENTS) ctest --test-dir build -R Monkey --output-on-failure --no-tests=error

@@ -1,0 +1,159 @@
+#include "exchange/anonymise.h"
+
+#include <algorithm>
+#include <array>
+
+#include "exchange/anonymous_addresses.h"
+#include "exchange/anonymous_names.h"
+#include "platform/records.h"
+
+namespace wp {
+namespace {
+
+/// Info keys whose values say nothing about whose network it is.
+constexpr std::array<std::string_view, 6> kKeptKeys{"AdoptedCountryCode", "IPv4ConfigMethod",
+                                                    "IPv6ConfigMethod",   "MarlixModelName",
+                                                    "Security",           "SupportedPHYModes"};
+/// Info keys whose texts are network names, also of networks that nothing else mentions.
+constexpr std::array<std::string_view, 3> kNameKeys{"NetworkName", "SSID", "networkName"};
+
+template <std::size_t count>
+bool contains(const std::array<std::string_view, count>& keys, std::string_view key) {
+    return std::find(keys.begin(), keys.end(), key) != keys.end();
+}
+
+/// Calls `visit(key, value)` for every entry of the value's dictionaries, at any depth.
+template <class Visit>
+void forEachEntry(const Value& value, const Visit& visit) {
+    if (const auto* array = value.as<ArrayPointer>(); array && *array) {
+        for (const Value& element : **array) forEachEntry(element, visit);
+    } else if (const auto* dictionary = value.as<DictionaryPointer>(); dictionary && *dictionary) {
+        for (const auto& [key, entry] : (*dictionary)->entries()) {
+            visit(key, entry);
+            forEachEntry(entry, visit);
+        }
+    }
+}
+
+/// Every network name that the recording mentions.
+class NameCollector {
+  public:
+    std::set<std::string> collect(const Recording& recording) {
+        for (const DiagnosticsStatusResponse& status : recording.status)
+            if (status.status) add(status.status->ssid);
+        for (const RecordedAnswer& answer : recording.answers) {
+            add(answer.networkName);
+            if (!answer.response.results) continue;
+            for (const DiagnosticsTestResultPointer& result : *answer.response.results)
+                if (result && result->info) addFrom(result->info);
+        }
+        return std::move(names_);
+    }
+
+  private:
+    void add(const std::optional<std::string>& name) {
+        if (name) names_.insert(*name);
+    }
+    void addFromRecord(const Value& value) {
+        if (auto preferred = value.asRecord<PreferredNetworkRecord>()) add(preferred->ssid);
+        if (auto heard = value.asRecord<WiFiScanResult>()) add(heard->ssid);
+    }
+    void addFrom(const DictionaryPointer& info) {
+        forEachEntry(info, [this](const std::string& key, const Value& value) {
+            addFromRecord(value);
+            if (const auto* array = value.as<ArrayPointer>(); array && *array)
+                for (const Value& element : **array) addFromRecord(element);
+            if (const auto* text = value.as<std::string>(); text && contains(kNameKeys, key)) add(*text);
+        });
+    }
+
+    std::set<std::string> names_;
+};
+
+class Anonymiser {
+  public:
+    explicit Anonymiser(const Recording& recording) : names_(NameCollector().collect(recording)) {}
+
+    void replaceIn(Recording& recording) {
+        recording.description = sentence(recording.description);
+        for (DiagnosticsStatusResponse& status : recording.status) {
+            if (status.status) status.status = std::make_shared<const WiFiStatus>(record(*status.status));
+            replaceIn(status.error);
+        }
+        for (RecordedAnswer& answer : recording.answers) {
+            if (answer.networkName) answer.networkName = names_.replaced(*answer.networkName);
+            replaceIn(answer.response.error);
+            if (!answer.response.results) continue;
+            for (DiagnosticsTestResultPointer& result : *answer.response.results) replaceIn(result);
+        }
+    }
+
+  private:
+    std::string sentence(const std::string& text) {
+        return addresses_.replacedWithin(names_.replacedWithin(text));
+    }
+
+    void replaceIn(std::optional<Error>& error) {
+        if (error) error->message = sentence(error->message);
+    }
+
+    void replaceIn(DiagnosticsTestResultPointer& result) {
+        if (!result || !result->info) return;
+        Dictionary::Entries entries = result->info->entries();
+        for (auto& [key, value] : entries)
+            if (!contains(kKeptKeys, key)) value = replaced(value);
+        result = std::make_shared<const DiagnosticsTestResult>(
+            DiagnosticsTestResult{result->result, result->didPass, Dictionary::make(std::move(entries))});
+    }
+
+    Value replaced(const Value& value) {
+        if (const auto* text = value.as<std::string>()) {
+            std::string name = names_.replaced(*text);
+            return name == *text ? addresses_.replacedWithin(*text) : name;
+        }
+        if (const auto* array = value.as<ArrayPointer>(); array && *array) {
+            Array elements;
+            for (const Value& element : **array) elements.push_back(replaced(element));
+            return elements;
+        }
+        if (const auto* dictionary = value.as<DictionaryPointer>(); dictionary && *dictionary) {
+            Dictionary::Entries entries;
+            for (const auto& [key, entry] : (*dictionary)->entries())
+                entries.emplace(addresses_.replacedWithin(names_.replaced(key)), replaced(entry));
+            return Dictionary::make(std::move(entries));
+        }
+        return replacedRecord(value);
+    }
+
+    Value replacedRecord(const Value& value) {
+        if (auto heard = value.asRecord<WiFiScanResult>())
+            return std::make_shared<const WiFiScanResult>(record(*heard));
+        if (auto preferred = value.asRecord<PreferredNetworkRecord>()) {
+            auto copy = std::make_shared<PreferredNetworkRecord>(*preferred);
+            if (copy->ssid) copy->ssid = names_.replaced(*copy->ssid);
+            return copy;
+        }
+        return value;
+    }
+
+    /// A scan entry or a status.
+    template <class Named>
+    Named record(Named copy) {
+        if (copy.ssid) copy.ssid = names_.replaced(*copy.ssid);
+        if (copy.bssid) copy.bssid = addresses_.hardwareAddress(*copy.bssid);
+        return copy;
+    }
+
+    AnonymousNames names_;
+    AnonymousAddresses addresses_;
+};
+
+}  // namespace
+
+Recording anonymised(const Recording& recording) {
+    Recording copy = recording;
+    Anonymiser(recording).replaceIn(copy);
+    return copy;
+}
+
+}  // namespace wp

@@ -1,0 +1,19 @@
+#pragma once
+
+#include "exchange/recording.h"
+
+namespace wp {
+
+/// The recording with every network name and every address replaced, the same one always by the same. *Any*
+/// thread.
+///
+/// Names become "Net 0001" and so on in the order in which they sort, with words behind that keep short (to 8
+/// characters), middling (to 16) and long ones apart, and with their ending "_nomap" as it was spelled. Hardware
+/// addresses become locally administered ones, public IPv4 addresses ones of 198.18.0.0/15, IPv6 addresses
+/// ones of the same kind (link-local, unique local, else 2001:db8::/32). Addresses are found in every text;
+/// names in the fields and info values that hold them, in values that equal one, and as words inside error
+/// messages and the description. Values with a meaning of their own (security, PHY modes, country code,
+/// address configuration, a base station's model) and interface names stay.
+Recording anonymised(const Recording& recording);
+
+}  // namespace wp

@@ -1,0 +1,30 @@
+#pragma once
+
+#include <cstdint>
+#include <map>
+#include <string>
+#include <string_view>
+
+namespace wp {
+
+/// Replacements for hardware and IP addresses, given out in the order in which addresses turn up. Not for
+/// several threads at once.
+class AnonymousAddresses {
+  public:
+    /// The replacement of a BSSID field, whatever its form.
+    std::string hardwareAddress(const std::string& address);
+
+    /// The text with each address in it replaced.
+    std::string replacedWithin(std::string_view text);
+
+  private:
+    std::string replacement(const std::string& word);
+    std::string ipv4(const std::string& word);
+    std::string ipv6(const std::string& word);
+
+    std::map<std::string, std::uint32_t> hardware_;
+    std::map<std::string, std::uint32_t> ipv4_;
+    std::map<std::string, std::uint32_t> ipv6_;
+};
+
+}  // namespace wp

@@ -1,0 +1,86 @@
+#include "exchange/anonymise.h"
+
+#include <gtest/gtest.h>
+
+#include "exchange/anonymous_addresses.h"
+#include "exchange/anonymous_names.h"
+
+namespace wp {
+namespace {
+
+const std::string kFolder = WP_SOURCE_DIR "/verification/unit/exchange/recordings/";
+
+TEST(Anonymise, ReplacesNamesAndAddressesThroughoutARecording) {
+    Recording original = std::get<Recording>(loadRecording(kFolder + "neighbourhood.json"));
+
+    std::string text = recordingText(anonymised(original));
+
+    EXPECT_EQ(text,
+              recordingText(std::get<Recording>(loadRecording(kFolder + "neighbourhood_anonymised.json"))));
+    for (const char* secret : {"Ann", "Zed", "café", "Typed", "aa:bb", "AA:BB", "aa-bb", "8.8.8.8", "1.1.1.1",
+                               "9.9.9.9", "2a00", "ccff"})
+        EXPECT_EQ(text.find(secret), std::string::npos) << secret;
+}
+
+TEST(Anonymise, LeavesTheOriginalAlone) {
+    Recording original = std::get<Recording>(loadRecording(kFolder + "neighbourhood.json"));
+    std::string before = recordingText(original);
+    anonymised(original);
+    EXPECT_EQ(recordingText(original), before);
+}
+
+TEST(Anonymise, NumbersNamesAsTheySortAndKeepsTheirLengthApart) {
+    AnonymousNames names({"", "zoo", "Alpha", "beta network", "Gamma, a network with a name", "x_noMAP"});
+
+    EXPECT_EQ(names.replaced("Alpha"), "Net 0001");
+    EXPECT_EQ(names.replaced("beta network"), "Net 0002 nearby");
+    EXPECT_EQ(names.replaced("Gamma, a network with a name"), "Net 0003 with a long name");
+    EXPECT_EQ(names.replaced("x_noMAP"), "Net 0004_noMAP");
+    EXPECT_EQ(names.replaced("zoo"), "Net 0005");
+    EXPECT_EQ(names.replaced("alpha"), "alpha");
+    EXPECT_EQ(names.replaced(""), "");
+}
+
+TEST(Anonymise, ReplacesNamesInSentencesOnlyAsWords) {
+    AnonymousNames names({"Home", "Home Office", "is", "東京"});
+
+    EXPECT_EQ(names.replacedWithin("'Home Office' is not Home, nor Homes"),
+              "'Net 0002 nearby' is not Net 0001, nor Homes");
+    EXPECT_EQ(names.replacedWithin("<東京>"), "<Net 0004>");
+}
+
+TEST(Anonymise, GivesTheSameAddressTheSameReplacement) {
+    AnonymousAddresses addresses;
+
+    EXPECT_EQ(addresses.hardwareAddress("aa:bb:cc:dd:ee:ff"), "02:00:00:00:00:01");
+    EXPECT_EQ(addresses.hardwareAddress("00:11:22:33:44:55"), "02:00:00:00:00:02");
+    EXPECT_EQ(addresses.hardwareAddress("AA:BB:CC:DD:EE:FF"), "02:00:00:00:00:01");
+    EXPECT_EQ(addresses.replacedWithin("AP aa-bb-cc-dd-ee-ff, or 00:11:22:33:44:55."),
+              "AP 02-00-00-00-00-01, or 02:00:00:00:00:02.");
+    EXPECT_EQ(addresses.hardwareAddress("ff:ff:ff:ff:ff:ff"), "ff:ff:ff:ff:ff:ff");
+    EXPECT_EQ(addresses.hardwareAddress("not an address"), "02:00:00:00:00:03");
+    EXPECT_EQ(addresses.hardwareAddress(""), "");
+}
+
+TEST(Anonymise, ReplacesPublicIPAddressesAndKeepsPrivateOnes) {
+    AnonymousAddresses addresses;
+
+    EXPECT_EQ(addresses.replacedWithin("8.8.8.8, 8.8.4.4/24 and 8.8.8.8:53."),
+              "198.18.0.1, 198.18.0.2/24 and 198.18.0.1:53.");
+    for (const char* kept : {"192.168.0.1", "10.1.2.3", "172.16.0.1", "127.0.0.1", "169.254.1.1", "0.0.0.0",
+                             "224.0.0.1", "255.255.255.0", "100.64.0.1", "::", "::1", "ff02::1"})
+        EXPECT_EQ(addresses.replacedWithin(kept), kept);
+    EXPECT_EQ(addresses.replacedWithin("fe80::1%wlan0"), "fe80::1%wlan0");
+    EXPECT_EQ(addresses.replacedWithin("[2a00:1450:0::9]:443"), "[2001:db8::2]:443");
+    EXPECT_EQ(addresses.replacedWithin("fd12:3456::1"), "fd00::3");
+}
+
+TEST(Anonymise, TakesNothingElseForAnAddress) {
+    AnonymousAddresses addresses;
+    for (const char* text : {"802.11ac", "1.2.3", "12:30:45", "dead beef", "x02:00:00:00:00:01", "8.8.8.8x",
+                             "02:00:00:00:00:01:02", "version 6.1.0-13", "cafés", "2024-05-01", "face::g"})
+        EXPECT_EQ(addresses.replacedWithin(text), text);
+}
+
+}  // namespace
+}  // namespace wp
