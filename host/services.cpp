@@ -1,7 +1,13 @@
 #include "host/services.h"
 
+#include <filesystem>
+
+#include "exchange/anonymise.h"
+#include "exchange/live.h"
+#include "exchange/recorder.h"
 #include "exchange/replay.h"
 #include "host/exit.h"
+#include "host/extension_module.h"
 
 namespace wp::host {
 namespace {
@@ -26,13 +32,77 @@ class ReplayServices final : public Services {
     bool isAutomated_;
 };
 
+/// The program that looks at this machine; it stands beside this one.
+constexpr const char* kServiceFileName = "wifi-profile-service";
+
+LiveServiceOptions liveOptions(const RunOptions& options, DiagnosticsLog& log) {
+    LiveServiceOptions live;
+    live.program = (programFolder() / kServiceFileName).string();
+    if (options.interfaceName) live.arguments = {"--interface", *options.interfaceName};
+    live.note = [&log](std::string_view text) { log.note(text); };
+    return live;
+}
+
+class LiveServices final : public Services {
+  public:
+    LiveServices(const RunOptions& options, const Preparation& prepared, DiagnosticsLog& log)
+        : service_(liveOptions(options, log)), capabilities_(prepared.configuration.capabilities) {}
+
+    DiagnosticsClient& diagnosticsClient() override { return service_.diagnostics(); }
+    WiFiManagerService& wifiManager() override { return service_.wifi(); }
+    CapabilityQuery& capabilities() override { return capabilities_; }
+    bool isAutomated() const override { return false; }
+
+  private:
+    LiveService service_;
+    StatedCapabilities capabilities_;
+};
+
+/// Writes down what other services answer.
+class RecordedServices final : public Services {
+  public:
+    RecordedServices(std::unique_ptr<Services> services, const RunOptions& options,
+                     const Preparation& prepared)
+        : services_(std::move(services)),
+          recorder_(services_->diagnosticsClient(), services_->wifiManager(), services_->capabilities()),
+          file_(*prepared.record),
+          isAnonymous_(options.anonymise) {
+        recorder_.setAutomation(isAutomated() || options.automationFile);
+        if (prepared.recording) recorder_.setDescription(prepared.recording->description);
+    }
+
+    DiagnosticsClient& diagnosticsClient() override { return recorder_.diagnostics(); }
+    WiFiManagerService& wifiManager() override { return recorder_.wifi(); }
+    CapabilityQuery& capabilities() override { return recorder_.capabilities(); }
+    bool isAutomated() const override { return services_->isAutomated(); }
+    void writeRecording() override {
+        Recording recording = recorder_.recording();
+        file_.write(recordingText(isAnonymous_ ? anonymised(recording) : recording));
+    }
+
+  private:
+    std::unique_ptr<Services> services_;
+    Recorder recorder_;
+    OutputFile file_;
+    bool isAnonymous_;
+};
+
+std::unique_ptr<Services> answeringServices(const RunOptions& options, const Preparation& prepared,
+                                            MainQueue& mainQueue, DiagnosticsLog& log) {
+    if (prepared.recording) return std::make_unique<ReplayServices>(prepared.recording, mainQueue);
+    std::string service = (programFolder() / kServiceFileName).string();
+    if (!std::filesystem::exists(service))
+        fail(service + ": not found; a live run needs it beside the program (--replay and --demo do not)");
+    return std::make_unique<LiveServices>(options, prepared, log);
+}
+
 }  // namespace
 
 std::unique_ptr<Services> makeServices(const RunOptions& options, const Preparation& prepared,
-                                       MainQueue& mainQueue, DiagnosticsLog&) {
-    if (options.recordFile) refuse("--record: this build cannot record yet");
-    if (!prepared.recording) refuse("this build cannot run live yet; give --replay FILE");
-    return std::make_unique<ReplayServices>(prepared.recording, mainQueue);
+                                       MainQueue& mainQueue, DiagnosticsLog& log) {
+    std::unique_ptr<Services> services = answeringServices(options, prepared, mainQueue, log);
+    if (!prepared.record) return services;
+    return std::make_unique<RecordedServices>(std::move(services), options, prepared);
 }
 
 }  // namespace wp::host

@@ -119,9 +119,9 @@ TEST_F(OutputFileTest, AFailedWriteLeavesTheOldFileAndNoOther) {
 
 TEST_F(OutputFileTest, APlaceThatCannotBeWrittenIsRefusedBeforeTheRun) {
     EXPECT_EQ(refusalOf(folder_.string()), "--output: " + folder_.string() + ": is a folder; give a file");
-    EXPECT_EQ(refusalOf(path("no/such/file")), "--output: " + path("no/such/file") +
-                                                   ": cannot be written: folder " + path("no/such") +
-                                                   ": No such file or directory");
+    EXPECT_EQ(
+        refusalOf(path("no/such/file")),
+        "--output: " + path("no/such/file") + ": cannot be written: its folder: No such file or directory");
     put("plain", "");
     EXPECT_EQ(refusalOf(path("plain/file")),
               "--output: " + path("plain/file") + ": cannot be written: Not a directory");
