@@ -49,7 +49,9 @@ class Run {
           module_(options.extension),
           log_(STDERR_FILENO, progressFor(prepared.screen)),
           mainQueue_(activity_),
-          interruption_({[this] { onInterrupted(); }, [] { restoreTerminal(); }}, options.timeout),
+          interruption_(std::make_unique<Interruption>(
+              Interruption::Actions{[this] { onInterrupted(); }, [] { restoreTerminal(); }},
+              options.timeout)),
           backgroundQueue_(activity_),
           services_(makeServices(options, prepared, mainQueue_, log_)),
           progress_(services_->diagnosticsClient(), log_),
@@ -69,9 +71,11 @@ class Run {
 
     /// What a failure on the way left running ends before anything that it uses goes.
     ~Run() {
-        if (DiagnosticsClient* client = cancellable_) client->cancelAllRequests();
+        if (isUnderWay_) progress_.cancelAllRequests();
         backgroundQueue_.drain(BackgroundQueue::Delayed::drop);
         mainQueue_.close();
+        // Its thread reaches for the services.
+        interruption_.reset();
     }
     Run(const Run&) = delete;
     Run& operator=(const Run&) = delete;
@@ -87,7 +91,7 @@ class Run {
     void onInterrupted();
     void setUp();
     std::optional<std::string> drive();
-    bool isBrokenOff() const { return interruption_.exitStatus() || hasLeft_; }
+    bool isBrokenOff() const { return interruption_->exitStatus() || hasLeft_; }
     bool isOver() const { return isBrokenOff() || isFinished_; }
     void tearDown(bool hasObstacle);
     int report(const std::optional<std::string>& obstacle);
@@ -99,10 +103,11 @@ class Run {
     DiagnosticsLog log_;
     Activity activity_;
     MainQueue mainQueue_;
-    std::atomic<DiagnosticsClient*> cancellable_ = nullptr;
+    /// Whether there is something to cancel.
+    std::atomic<bool> isUnderWay_ = false;
     std::atomic<bool> isFinished_ = false;
     bool hasLeft_ = false;
-    Interruption interruption_;
+    std::unique_ptr<Interruption> interruption_;
     BackgroundQueue backgroundQueue_;
     std::unique_ptr<Services> services_;
     ProgressClient progress_;
@@ -117,7 +122,10 @@ class Run {
 void Run::onInterrupted() {
     // What still runs ends with errors that nobody has asked about.
     log_.mute();
-    if (DiagnosticsClient* client = cancellable_) client->cancelAllRequests();
+    if (isUnderWay_) {
+        services_->stopRecording();
+        progress_.cancelAllRequests();
+    }
     mainQueue_.wake();
 }
 
@@ -144,7 +152,7 @@ void Run::setUp() {
 std::optional<std::string> Run::drive() {
     std::unique_ptr<ui::FrontEnd> frontEnd = makeFrontEnd(prepared_.screen, screen_, mainQueue_);
     if (prepared_.screen == ScreenChoice::terminal && isatty(STDERR_FILENO)) log_.hold();
-    cancellable_ = &progress_;
+    isUnderWay_ = true;
     if (!isBrokenOff()) controller_->start();
     remote::RemoteControl remote({screen_, *frontEnd, mainQueue_, activity_, [this] { return isOver(); },
                                   [this](std::string_view line) { transcript_->add(line); }});
@@ -152,18 +160,20 @@ std::optional<std::string> Run::drive() {
 }
 
 void Run::tearDown(bool hasObstacle) {
-    if (isBrokenOff() || hasObstacle) log_.mute();
+    if (isBrokenOff() || hasObstacle) {
+        log_.mute();
+        services_->stopRecording();
+    }
     controller_->teardown();
     // The dictionaries of the result are written to until no block is left that could.
     backgroundQueue_.drain(BackgroundQueue::Delayed::drop);
-    cancellable_ = nullptr;
     mainQueue_.close();
     log_.release();
     log_.eraseProgress();
 }
 
 int Run::report(const std::optional<std::string>& obstacle) {
-    std::optional<int> interrupted = interruption_.exitStatus();
+    std::optional<int> interrupted = interruption_->exitStatus();
     bool hasResult = !isBrokenOff() && !obstacle;
     if (hasResult) writeResult();
     automation_.write();

@@ -1,6 +1,8 @@
 #include "host/services.h"
 
 #include <filesystem>
+#include <mutex>
+#include <optional>
 
 #include "exchange/anonymise.h"
 #include "exchange/live.h"
@@ -75,8 +77,13 @@ class RecordedServices final : public Services {
     WiFiManagerService& wifiManager() override { return recorder_.wifi(); }
     CapabilityQuery& capabilities() override { return recorder_.capabilities(); }
     bool isAutomated() const override { return services_->isAutomated(); }
+    void stopRecording() override {
+        std::lock_guard lock(mutex_);
+        if (!stopped_) stopped_ = recorder_.recording();
+    }
     void writeRecording() override {
-        Recording recording = recorder_.recording();
+        stopRecording();
+        const Recording& recording = *stopped_;
         file_.write(recordingText(isAnonymous_ ? anonymised(recording) : recording));
     }
 
@@ -85,6 +92,8 @@ class RecordedServices final : public Services {
     Recorder recorder_;
     OutputFile file_;
     bool isAnonymous_;
+    std::mutex mutex_;
+    std::optional<Recording> stopped_;
 };
 
 std::unique_ptr<Services> answeringServices(const RunOptions& options, const Preparation& prepared,

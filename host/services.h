@@ -22,7 +22,10 @@ class Services {
     virtual CapabilityQuery& capabilities() = 0;
     /// Whether a recording says that test automation was enabled.
     virtual bool isAutomated() const = 0;
-    /// Writes what was answered so far where that was asked for. Throws `Exit` (status 1) on failure.
+    /// What is answered from now on is not recorded: the run is broken off, and what still runs gets errors that
+    /// say nothing about the device. *Any*.
+    virtual void stopRecording() {}
+    /// Writes what was recorded where that was asked for. Throws `Exit` (status 1) on failure.
     virtual void writeRecording() {}
 };
 
