@@ -10,7 +10,8 @@ namespace wp {
 /// What a test asks about.
 enum class Subject {
     device,   ///< this device's own configuration; a network's name in the request plays no part
-    network,  ///< the joined network, or the one that the request names
+    joined,   ///< the joined network, whatever the request names
+    network,  ///< the network that the request names, else the joined one
     scan,     ///< the list of networks, always from a new scan
 };
 

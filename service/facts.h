@@ -71,5 +71,6 @@ struct Facts {
 /// The kinds of facts, to say which ones a test needs. `judged` stands for where the judged access point is
 /// found: `link` for the joined network, `nearby` for a named one.
 enum class Fact { judged, link, nearby, station, survey, regulation, addresses, gatewayEcho };
+constexpr std::size_t kFactCount = static_cast<std::size_t>(Fact::gatewayEcho) + 1;
 
 }  // namespace wp

@@ -1,0 +1,137 @@
+#include "linux/gather.h"
+
+#include <linux/rtnetlink.h>
+#include <net/if.h>
+#include <sys/ioctl.h>
+#include <sys/socket.h>
+
+#include <algorithm>
+
+#include "linux/netlink_socket.h"
+#include "linux/route_messages.h"
+
+namespace wp {
+namespace {
+
+using std::chrono::milliseconds;
+
+constexpr int kSignalSamples = 5;
+constexpr milliseconds kBetweenSamples{250};
+
+bool isUp(const std::string& interfaceName) {
+    const Descriptor any(socket(AF_INET, SOCK_DGRAM | SOCK_CLOEXEC, 0));
+    ifreq request{};
+    if (!any || interfaceName.size() >= sizeof request.ifr_name) return false;
+    interfaceName.copy(request.ifr_name, interfaceName.size());
+    return ioctl(any.number(), SIOCGIFFLAGS, &request) == 0 && (request.ifr_flags & IFF_UP) != 0;
+}
+
+/// Of several access points that one link is joined to at once, the strongest.
+std::optional<AccessPoint> joinedAmong(std::vector<AccessPoint> accessPoints) {
+    std::optional<AccessPoint> joined;
+    for (AccessPoint& each : accessPoints) {
+        if (each.joined && (!joined || each.signal > joined->signal)) joined = std::move(each);
+    }
+    return joined;
+}
+
+Known<RadioInterface> chooseInterface(const std::vector<RadioInterface>& stations,
+                                      const std::optional<std::string>& wanted) {
+    if (wanted) {
+        const auto named = std::ranges::find(stations, *wanted, &RadioInterface::name);
+        if (named == stations.end())
+            return failure(Reason::noInterface, "no Wi-Fi interface named " + *wanted);
+        return *named;
+    }
+    if (stations.empty()) return failure(Reason::noInterface, "no Wi-Fi interface");
+    const auto joined =
+        std::ranges::find_if(stations, [](auto& each) { return each.joinedName.has_value(); });
+    return joined == stations.end() ? stations.front() : *joined;
+}
+
+/// All messages of one kind about addresses or routes.
+template <class Header>
+Known<std::vector<std::uint8_t>> routeDump(std::uint16_t type, const std::string& what, const Until& until) {
+    Known<NetlinkSocket> socket = NetlinkSocket::open(NETLINK_ROUTE);
+    if (!socket) return socket.error();
+    NetlinkRequest request(type, NLM_F_DUMP);
+    request.header<Header>() = {};  // of both families
+    const NetlinkAnswer answer = socket->ask(request, until);
+    if (answer.error != 0) return failureOf(answer.error, what);
+    return answer.messages;
+}
+
+Error notJoined(const Link& link) {
+    const std::string reason = link.up ? " is not joined to a network" : " is down";
+    return failure(link.up ? Reason::notJoined : Reason::noInterface, link.interfaceName + reason);
+}
+
+}  // namespace
+
+Known<std::vector<RadioInterface>> gatherStationInterfaces(const Until& until) {
+    Known<RadioSocket> radio = RadioSocket::open(until);
+    if (!radio) return radio.error();
+    Known<std::vector<RadioInterface>> interfaces = radio->interfaces(until);
+    if (interfaces) std::erase_if(*interfaces, [](const RadioInterface& each) { return !each.isStation(); });
+    return interfaces;
+}
+
+Known<Link> gatherLink(const std::optional<std::string>& wantedInterface, const Until& until) {
+    const Known<std::vector<RadioInterface>> stations = gatherStationInterfaces(until);
+    if (!stations) return stations.error();
+    const Known<RadioInterface> chosen = chooseInterface(*stations, wantedInterface);
+    if (!chosen) return chosen.error();
+    Link link{chosen->name, chosen->index, chosen->radio, isUp(chosen->name), std::nullopt};
+    if (!link.up) return link;
+    Known<RadioSocket> radio = RadioSocket::open(until);
+    if (!radio) return radio.error();
+    Known<std::vector<AccessPoint>> known = radio->accessPoints(link.interfaceIndex, until);
+    if (!known) return known.error();
+    link.joined = joinedAmong(std::move(*known));
+    return link;
+}
+
+Known<Station> gatherStation(const Link& link, const Until& until) {
+    if (!link.joined) return notJoined(link);
+    Known<RadioSocket> radio = RadioSocket::open(until);
+    if (!radio) return radio.error();
+    Known<Station> station = radio->station(link.interfaceIndex, until);
+    for (int sample = 1; station && sample < kSignalSamples; ++sample) {
+        if (waitReadable(-1, until.within(kBetweenSamples)) == Wait::stopped) {
+            return waitFailure(Wait::stopped, "signal");
+        }
+        const Known<Station> next = radio->station(link.interfaceIndex, until);
+        if (!next) break;  // the link went away meanwhile: what was heard of it stands
+        std::ranges::copy(next->signals, std::back_inserter(station->signals));
+    }
+    return station;
+}
+
+Known<Survey> gatherSurvey(const Link& link, const Until& until) {
+    Known<RadioSocket> radio = RadioSocket::open(until);
+    if (!radio) return radio.error();
+    return radio->survey(link.interfaceIndex, until);
+}
+
+Known<Regulation> gatherRegulation(const Link& link, const Until& until) {
+    Known<RadioSocket> radio = RadioSocket::open(until);
+    if (!radio) return radio.error();
+    return radio->regulation(link.radio, until);
+}
+
+Known<Addresses> gatherAddresses(const Link& link, const Until& until) {
+    const auto dump = routeDump<ifaddrmsg>(RTM_GETADDR, "addresses", until);
+    if (!dump) return dump.error();
+    return readAddresses(*dump, link.interfaceIndex);
+}
+
+Known<Echo> gatherGatewayEcho(const Link& link, EchoSocket& socket, const Until& until) {
+    if (!link.joined) return notJoined(link);
+    const auto dump = routeDump<rtmsg>(RTM_GETROUTE, "routes", until);
+    if (!dump) return dump.error();
+    const std::vector<Gateway> gateways = readGateways(*dump, link.interfaceIndex);
+    if (gateways.empty()) return failure(Reason::notJoined, link.interfaceName + " has no default route");
+    return socket.ask(gateways.front(), link.interfaceName, link.interfaceIndex, until);
+}
+
+}  // namespace wp

@@ -1,0 +1,29 @@
+#pragma once
+
+#include <optional>
+#include <string>
+
+#include "linux/echo_socket.h"
+#include "linux/radio_socket.h"
+#include "linux/scanner.h"
+#include "service/facts.h"
+
+namespace wp {
+
+// One function for each kind of fact. Each blocks its thread until it has the fact, cannot have it, or `until`
+// ends it, and changes nothing on the machine but the scan that it was asked for. *Any* thread.
+
+/// The Wi-Fi interface to look at: the named one, else the first that has joined a network, else the first.
+Known<Link> gatherLink(const std::optional<std::string>& wantedInterface, const Until& until);
+
+/// The link's parameters and its signal, sampled over one second.
+Known<Station> gatherStation(const Link& link, const Until& until);
+Known<Survey> gatherSurvey(const Link& link, const Until& until);
+Known<Regulation> gatherRegulation(const Link& link, const Until& until);
+Known<Addresses> gatherAddresses(const Link& link, const Until& until);
+Known<Echo> gatherGatewayEcho(const Link& link, EchoSocket& socket, const Until& until);
+
+/// All station interfaces of this machine.
+Known<std::vector<RadioInterface>> gatherStationInterfaces(const Until& until);
+
+}  // namespace wp

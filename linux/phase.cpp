@@ -1,0 +1,79 @@
+#include "linux/phase.h"
+
+#include <algorithm>
+
+#include "linux/fact_table.h"
+
+namespace wp {
+
+Phase::Phase(PhaseTopic topic, Sources& sources, Workers& workers, std::shared_ptr<const StopSignal> stop,
+             std::function<void()> onProgress)
+    : topic_(std::move(topic)),
+      sources_(sources),
+      workers_(workers),
+      stop_(std::move(stop)),
+      onProgress_(std::move(onProgress)) {
+    facts_.named = topic_.named;
+}
+
+std::optional<Fact> Phase::resolved(Fact fact) const {
+    if (fact == Fact::judged) return topic_.named ? Fact::nearby : Fact::link;
+    // The link says nothing about a network that is not joined.
+    if (fact == Fact::station && topic_.named) return std::nullopt;
+    return fact;
+}
+
+void Phase::want(Fact fact) {
+    const std::optional<Fact> meant = resolved(fact);
+    if (!meant || state(*meant) != State::idle) return;
+    state(*meant) = State::wanted;
+    for (const Fact need : rowOf(*meant).needs) want(need);
+}
+
+void Phase::prepare(const NumberedTest& test) {
+    for (const Fact fact : test.needs) want(fact);
+    const bool aboutNetwork = test.subject == Subject::network || test.subject == Subject::joined;
+    for (const NumberedTest& other : numberedTests()) {
+        if (!aboutNetwork || other.subject == Subject::device || other.subject == Subject::scan) continue;
+        if (other.subject == Subject::joined && topic_.named) continue;
+        for (const Fact fact : other.needs) want(fact);
+    }
+    launchWhatCan();
+}
+
+bool Phase::isReady(const NumberedTest& test) const {
+    return std::ranges::all_of(test.needs, [&](Fact fact) {
+        const std::optional<Fact> meant = resolved(fact);
+        return !meant || state(*meant) == State::done;
+    });
+}
+
+void Phase::launchWhatCan() {
+    for (std::size_t i = 0; i < states_.size(); ++i) {
+        const Fact fact = static_cast<Fact>(i);
+        if (state(fact) != State::wanted) continue;
+        const FactRow& row = rowOf(fact);
+        const auto isDone = [&](Fact other) { return state(other) == State::done; };
+        const auto isOver = [&](Fact other) {
+            return state(other) == State::done || state(other) == State::idle;
+        };
+        if (std::ranges::all_of(row.needs, isDone) && std::ranges::all_of(row.after, isOver)) launch(fact);
+    }
+}
+
+void Phase::launch(Fact fact) {
+    state(fact) = State::running;
+    const FactRow& row = rowOf(fact);
+    workers_.start([self = shared_from_this(), &row]() -> Workers::Publication {
+        const Until until{self->stop_, Clock::now() + row.most};
+        Store store = row.gather(self->facts_, self->topic_, self->sources_, until);
+        return [self, &row, store = std::move(store)] {
+            store(self->facts_);
+            self->state(row.fact) = State::done;
+            self->launchWhatCan();
+            self->onProgress_();
+        };
+    });
+}
+
+}  // namespace wp

@@ -1,0 +1,65 @@
+#pragma once
+
+#include <array>
+#include <functional>
+#include <memory>
+
+#include "linux/gather.h"
+#include "linux/workers.h"
+#include "service/catalogue.h"
+
+namespace wp {
+
+/// What the workers of all phases share: each is safe to use from several threads.
+struct Sources {
+    std::optional<std::string> interfaceName;  ///< as the user named it
+    Scanner scanner;
+    EchoSocket gatewayEcho;
+};
+
+/// What one phase is about.
+struct PhaseTopic {
+    Subject subject = Subject::joined;
+    std::optional<NetworkName> named;
+    std::chrono::milliseconds oldestScan{0};
+    friend bool operator==(const PhaseTopic&, const PhaseTopic&) = default;
+};
+
+/// The facts of a row of requests with the same configuration. Each fact is gathered once, on a thread of its own
+/// as soon as what it builds on is there; requests wait for their facts. Owner's thread; workers read only facts
+/// that are complete.
+class Phase : public std::enable_shared_from_this<Phase> {
+  public:
+    Phase(PhaseTopic topic, Sources& sources, Workers& workers, std::shared_ptr<const StopSignal> stop,
+          std::function<void()> onProgress);
+
+    const PhaseTopic& topic() const { return topic_; }
+    const Facts& facts() const { return facts_; }
+
+    /// Sees to it that the facts of the test are gathered; with the first test about a network, all that the
+    /// phase's other tests will need too, so that the phase takes as long as its slowest fact.
+    void prepare(const NumberedTest& test);
+    /// Whether all facts of the test are there, or known not to be had.
+    bool isReady(const NumberedTest& test) const;
+
+  private:
+    enum class State { idle, wanted, running, done };
+
+    State& state(Fact fact) { return states_[static_cast<std::size_t>(fact)]; }
+    State state(Fact fact) const { return states_[static_cast<std::size_t>(fact)]; }
+    /// The fact that stands for this one in this phase; nothing when the phase needs none.
+    std::optional<Fact> resolved(Fact fact) const;
+    void want(Fact fact);
+    void launchWhatCan();
+    void launch(Fact fact);
+
+    PhaseTopic topic_;
+    Sources& sources_;
+    Workers& workers_;
+    std::shared_ptr<const StopSignal> stop_;
+    std::function<void()> onProgress_;
+    Facts facts_;
+    std::array<State, kFactCount> states_{};
+};
+
+}  // namespace wp
