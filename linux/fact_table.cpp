@@ -36,6 +36,14 @@ Store nearby(const Facts& facts, const PhaseTopic& topic, Sources& sources, cons
     });
 }
 
+Store listened(const Facts& facts, const PhaseTopic& topic, Sources& sources, const Until& until) {
+    return fromLink(facts, &Facts::listened, [&](const Link& found) -> Known<std::vector<AccessPoint>> {
+        if (!found.up) return failure(Reason::noInterface, found.interfaceName + " is down");
+        return sources.scanner.listen({found.interfaceIndex, found.radio, topic.oldestScan, std::nullopt},
+                                      until);
+    });
+}
+
 Store station(const Facts& facts, const PhaseTopic&, Sources&, const Until& until) {
     return fromLink(facts, &Facts::station, [&](const Link& found) { return gatherStation(found, until); });
 }
@@ -62,17 +70,19 @@ Store gatewayEcho(const Facts& facts, const PhaseTopic&, Sources& sources, const
 constexpr Fact kLink[] = {Fact::link};
 // A scan leaves the channel for a while; echo requests would be lost and delayed meanwhile.
 constexpr Fact kPings[] = {Fact::gatewayEcho};
+constexpr Fact kPingsAndScan[] = {Fact::gatewayEcho, Fact::nearby};
 
 // clang-format off
 constexpr FactRow kRows[] = {
-    // fact              needs   after   most    gather
-    {Fact::link,         {},     {},     3s,     link},
-    {Fact::nearby,       kLink,  kPings, 25s,    nearby},   // a joined radio scans two bands in about 9 s
-    {Fact::station,      kLink,  {},     3s,     station},
-    {Fact::survey,       kLink,  {},     3s,     survey},
-    {Fact::regulation,   kLink,  {},     3s,     regulation},
-    {Fact::addresses,    kLink,  {},     3s,     addresses},
-    {Fact::gatewayEcho,  kLink,  {},     4s,     gatewayEcho},
+    // fact              needs   after          most  gather
+    {Fact::link,         {},     {},            3s,   link},
+    {Fact::nearby,       kLink,  kPings,        25s,  nearby},   // a joined radio scans two bands in about 9 s
+    {Fact::listened,     kLink,  kPingsAndScan, 20s, listened},
+    {Fact::station,      kLink,  {},            3s,   station},
+    {Fact::survey,       kLink,  {},            3s,   survey},
+    {Fact::regulation,   kLink,  {},            3s,   regulation},
+    {Fact::addresses,    kLink,  {},            3s,   addresses},
+    {Fact::gatewayEcho,  kLink,  {},            4s,   gatewayEcho},
 };
 // clang-format on
 

@@ -16,7 +16,10 @@ constexpr int kStartAttempts = 4;
 class ScanRun {
   public:
     ScanRun(RadioSocket& radio, const ScanWish& wish, const Until& until)
-        : radio_(radio), wish_(wish), until_(until), startedAt_(bootMilliseconds()) {}
+        : radio_(radio), wish_(wish), until_(until), startedAt_(bootMilliseconds()) {
+        if (const Known<RadioAbilities> abilities = radio_.abilities(wish_.radio, until_))
+            abilities_ = *abilities;
+    }
 
     Known<ScanReport> run() {
         if (const Known<RadioAbilities> abilities = radio_.abilities(wish_.radio, until_))
@@ -26,6 +29,19 @@ class ScanRun {
         Known<std::vector<AccessPoint>> found = results();
         if (!found) return found.error();
         if (wish_.named) found = withBeacons(std::move(*found));
+        if (!found) return found.error();
+        return ScanReport{std::move(*found), completedAt};
+    }
+
+    /// Listens on the channels that a scan visits briefly. On the others a scan only listens anyway.
+    Known<ScanReport> listen() {
+        ScanOrder order{{}, false, {}};
+        for (const RadioChannel& channel : abilities_.channels) {
+            if (!channel.disabled && !channel.passive) order.frequencies.push_back(channel.frequency);
+        }
+        if (std::optional<Error> error = complete(order)) return *error;
+        const std::int64_t completedAt = bootMilliseconds();
+        Known<std::vector<AccessPoint>> found = results();
         if (!found) return found.error();
         return ScanReport{std::move(*found), completedAt};
     }
@@ -44,8 +60,9 @@ class ScanRun {
             abilities_.channels, [](const RadioChannel& channel) { return !channel.disabled; }));
     }
 
-    bool coversEverything(const ScanEvent& event) const {
-        return !wish_.named && event.probedForAll && event.frequencies >= usableChannels();
+    bool isAsGood(const ScanEvent& event, const ScanOrder& order) const {
+        return order.probeForAll && order.names.empty() && event.probedForAll &&
+               event.frequencies >= usableChannels();
     }
 
     /// Scans until a scan of this order, or as good a one of somebody else, is complete.
@@ -60,7 +77,7 @@ class ScanRun {
                 return event.error();
             }
             const bool finished = event->kind == ScanEvent::Kind::finished;
-            if (finished && (error == 0 || coversEverything(*event))) return std::nullopt;
+            if (finished && (error == 0 || isAsGood(*event, order))) return std::nullopt;
             if (!finished && error == 0 && std::exchange(aborted, true)) break;
         }
         return failure(Reason::timeout, "scans were aborted or the radio was busy with others'");
@@ -87,8 +104,9 @@ class ScanRun {
         for (int attempt = 0; attempt < kListenAttempts; ++attempt) {
             ScanOrder order{{}, false, {}};
             for (const AccessPoint& each : found) {
-                if (each.says.name == *wish_.named && !each.says.hidesName)
-                    order.frequencies.push_back(each.frequency);
+                const bool lacksBeacon = each.says.name == *wish_.named && !each.says.hidesName;
+                const bool isListed = std::ranges::count(order.frequencies, each.frequency) > 0;
+                if (lacksBeacon && !isListed) order.frequencies.push_back(each.frequency);
             }
             if (order.frequencies.empty()) break;
             if (const std::optional<Error> error = complete(order)) break;
@@ -112,23 +130,61 @@ bool sees(const std::vector<AccessPoint>& found, const std::optional<NetworkName
     });
 }
 
+/// Without permission to scan, what the system itself has heard lately may do, if it is young enough.
+Known<std::vector<AccessPoint>> withoutScan(RadioSocket& radio, const ScanWish& wish, const Error& denied,
+                                            const Until& until) {
+    Known<std::vector<AccessPoint>> known = radio.accessPoints(wish.interfaceIndex, until);
+    if (!known) return known;
+    const std::int64_t oldest = bootMilliseconds() - wish.oldest.count();
+    std::erase_if(*known, [&](const AccessPoint& each) {
+        return !each.joined && (!each.lastSeen || *each.lastSeen < oldest);
+    });
+    const bool heardOthers =
+        std::ranges::any_of(*known, [](const AccessPoint& each) { return !each.joined; });
+    if (wish.oldest.count() == 0 || !heardOthers) return denied;
+    return known;
+}
+
+/// A socket that is told when scans are over.
+Known<RadioSocket> openRadio(const Until& until) {
+    Known<RadioSocket> radio = RadioSocket::open(until);
+    if (radio && !radio->listenForScans()) {
+        return failure(Reason::unavailable, "the kernel does not tell when a scan is over");
+    }
+    return radio;
+}
+
 }  // namespace
+
+bool Scanner::Remembered::serves(const ScanWish& wish) const {
+    return wish.oldest.count() > 0 && interfaceIndex == wish.interfaceIndex &&
+           bootMilliseconds() - report.completedAt <= wish.oldest.count();
+}
 
 Known<std::vector<AccessPoint>> Scanner::scan(const ScanWish& wish, const Until& until) {
     const std::lock_guard lock(scanning_);
-    const std::int64_t now = bootMilliseconds();
-    if (last_ && last_->first == wish.interfaceIndex &&
-        now - last_->second.completedAt <= wish.oldest.count() && wish.oldest.count() > 0 &&
-        sees(last_->second.accessPoints, wish.named)) {
-        return last_->second.accessPoints;
+    if (scanned_ && scanned_->serves(wish) && sees(scanned_->report.accessPoints, wish.named)) {
+        return scanned_->report.accessPoints;
     }
-    Known<RadioSocket> radio = RadioSocket::open(until);
+    Known<RadioSocket> radio = openRadio(until);
     if (!radio) return radio.error();
-    if (!radio->listenForScans())
-        return failure(Reason::unavailable, "the kernel does not tell when a scan is over");
     const Known<ScanReport> report = ScanRun(*radio, wish, until).run();
+    if (!report && report.error().code == static_cast<int>(Reason::notPermitted)) {
+        return withoutScan(*radio, wish, report.error(), until);
+    }
     if (!report) return report.error();
-    last_ = {wish.interfaceIndex, *report};
+    scanned_ = Remembered{wish.interfaceIndex, *report};
+    return report->accessPoints;
+}
+
+Known<std::vector<AccessPoint>> Scanner::listen(const ScanWish& wish, const Until& until) {
+    const std::lock_guard lock(scanning_);
+    if (listened_ && listened_->serves(wish)) return listened_->report.accessPoints;
+    Known<RadioSocket> radio = openRadio(until);
+    if (!radio) return radio.error();
+    const Known<ScanReport> report = ScanRun(*radio, wish, until).listen();
+    if (!report) return report.error();
+    listened_ = Remembered{wish.interfaceIndex, *report};
     return report->accessPoints;
 }
 

@@ -28,9 +28,20 @@ class Scanner {
     /// joined when it covers the radio's channels. An error says why there can be none.
     Known<std::vector<AccessPoint>> scan(const ScanWish& wish, const Until& until);
 
+    /// What the latest listening of at most this age heard, or a new one: as long on each channel as access points
+    /// take between two beacons, where a scan would only call briefly. The wish's name plays no part.
+    Known<std::vector<AccessPoint>> listen(const ScanWish& wish, const Until& until);
+
   private:
+    struct Remembered {
+        std::uint32_t interfaceIndex = 0;
+        ScanReport report;
+        bool serves(const ScanWish& wish) const;
+    };
+
     std::mutex scanning_;
-    std::optional<std::pair<std::uint32_t, ScanReport>> last_;  ///< by interface
+    std::optional<Remembered> scanned_;
+    std::optional<Remembered> listened_;
 };
 
 }  // namespace wp

@@ -16,6 +16,7 @@ constexpr Fact kStation[] = {Fact::judged, Fact::station};
 constexpr Fact kSignal[] = {Fact::judged, Fact::station, Fact::survey};
 constexpr Fact kCountry[] = {Fact::judged, Fact::nearby, Fact::regulation};
 constexpr Fact kNearby[] = {Fact::nearby};
+constexpr Fact kListened[] = {Fact::nearby, Fact::listened};
 constexpr Fact kAddresses[] = {Fact::link, Fact::addresses};
 constexpr Fact kGateway[] = {Fact::gatewayEcho};
 
@@ -43,7 +44,7 @@ constexpr NumberedTest kTests[] = {
     {27, Subject::joined,  kJudged,      usesFortyMegahertzIn2GHz},
     {28, Subject::network, kCountry,     countryCodesConflict},
     {29, Subject::device,  {},           nullptr},
-    {30, Subject::joined,  kNearby,      foundHiddenNetworks},
+    {30, Subject::joined,  kListened,    foundHiddenNetworks},
     {31, Subject::scan,    kNearby,      foundNoNetworks},
     {32, Subject::network, kSignal,      signalIsPoor},
     {33, Subject::network, {},           nullptr},

@@ -61,6 +61,7 @@ struct Facts {
     std::optional<NetworkName> named;  ///< the network asked about; absent: the one that is joined
     Known<Link> link;
     Known<std::vector<AccessPoint>> nearby;  ///< all access points of the scan, the joined one included
+    Known<std::vector<AccessPoint>> listened;  ///< what beacons tell that a scan is too short to hear
     Known<Station> station;
     Known<Survey> survey;
     Known<Regulation> regulation;
@@ -70,7 +71,7 @@ struct Facts {
 
 /// The kinds of facts, to say which ones a test needs. `judged` stands for where the judged access point is
 /// found: `link` for the joined network, `nearby` for a named one.
-enum class Fact { judged, link, nearby, station, survey, regulation, addresses, gatewayEcho };
+enum class Fact { judged, link, nearby, listened, station, survey, regulation, addresses, gatewayEcho };
 constexpr std::size_t kFactCount = static_cast<std::size_t>(Fact::gatewayEcho) + 1;
 
 }  // namespace wp

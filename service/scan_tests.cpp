@@ -32,10 +32,14 @@ Value recordOf(const AccessPoint& accessPoint) {
 
 Outcome foundHiddenNetworks(const Facts& facts) {
     if (!facts.nearby) return facts.nearby.error();
-    const std::set<MacAddress> named = addressesWithName(*facts.nearby);
+    if (!facts.listened) return facts.listened.error();
+    // An access point that hides its name answers no scan: its beacon must be waited for.
+    std::vector<AccessPoint> all = *facts.nearby;
+    all.insert(all.end(), facts.listened->begin(), facts.listened->end());
+    std::set<MacAddress> told = addressesWithName(all);
     Array hidden;
-    for (const AccessPoint& each : *facts.nearby) {
-        if (each.says.name.absent() && !named.contains(each.address)) hidden.push_back(recordOf(each));
+    for (const AccessPoint& each : all) {
+        if (each.says.name.absent() && told.insert(each.address).second) hidden.push_back(recordOf(each));
     }
     const bool found = !hidden.empty();
     return problem(found, {{"ScanResults", std::move(hidden)}});

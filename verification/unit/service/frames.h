@@ -78,6 +78,7 @@ inline Facts joinedTo(std::vector<AccessPoint> nearby) {
     Facts facts;
     facts.link = Link{"wlan0", 3, 0, true, nearby.front()};
     facts.nearby = std::move(nearby);
+    facts.listened = std::vector<AccessPoint>();
     return facts;
 }
 
@@ -87,6 +88,7 @@ inline Facts askedAbout(std::string_view name, std::vector<AccessPoint> nearby) 
     facts.named = nameFromText(name);
     facts.link = Link{"wlan0", 3, 0, true, std::nullopt};
     facts.nearby = std::move(nearby);
+    facts.listened = std::vector<AccessPoint>();
     return facts;
 }
 

@@ -38,6 +38,7 @@ TEST(ScanTests, ListAllAccessPointsHiddenOnesToo) {
 TEST(ScanTests, FindNoNetworksInAnEmptyScan) {
     Facts facts;
     facts.nearby = std::vector<AccessPoint>();
+    facts.listened = std::vector<AccessPoint>();
 
     EXPECT_TRUE(resultOf(31, facts));
     EXPECT_FALSE(verdictOf(31, facts)->didPass);
@@ -56,6 +57,24 @@ TEST(ScanTests, CountHiddenAccessPointsThatHaveNotToldTheirName) {
     ASSERT_EQ(1U, scanIn(30, facts).size());
     EXPECT_EQ(textOf(first.address), scanIn(30, facts)[0]->bssid);
     EXPECT_EQ(3U, scanIn(31, facts).size());
+}
+
+TEST(ScanTests, CountHiddenAccessPointsThatOnlyListeningHeardOnce) {
+    const AccessPoint scanned = heard(nameElement(""));
+    const AccessPoint listenedTo = heard(nameElement(""));
+    Facts facts = joinedTo({heard(nameElement("Home")), scanned});
+    facts.listened = std::vector<AccessPoint>{scanned, listenedTo};
+
+    EXPECT_EQ(2U, scanIn(30, facts).size());
+    EXPECT_EQ(2U, scanIn(31, facts).size());
+}
+
+TEST(ScanTests, CannotTellAboutHiddenNetworksWithoutListening) {
+    Facts facts = joinedTo({heard(nameElement("Home"))});
+    facts.listened = failure(Reason::timeout, "listening took too long");
+
+    EXPECT_EQ(7, errorOf(30, facts));
+    EXPECT_FALSE(resultOf(31, facts));
 }
 
 TEST(ScanTests, CannotTellWithoutAScan) {
