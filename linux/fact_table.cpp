@@ -1,6 +1,7 @@
 #include "linux/fact_table.h"
 
 #include <algorithm>
+#include <limits>
 
 namespace wp {
 namespace {
@@ -9,62 +10,77 @@ using namespace std::chrono_literals;
 
 /// A store of what the function makes of the link, or of the reason why there is no link.
 template <class T, class Gather>
-Store fromLink(const Facts& facts, Known<T> Facts::*place, Gather gather) {
-    Known<T> found = facts.link ? gather(*facts.link) : Known<T>(facts.link.error());
+Store fromLink(const Gathering& g, Known<T> Facts::*place, Gather gather) {
+    Known<T> found = g.facts.link ? gather(*g.facts.link) : Known<T>(g.facts.link.error());
     return [place, found = std::move(found)](Facts& into) { into.*place = found; };
 }
 
-Known<Link> linkOf(const PhaseTopic& topic, Sources& sources, const Until& until) {
-    Known<Link> link = gatherLink(sources.interfaceName, until);
-    const bool aboutJoined =
-        topic.subject != Subject::device && topic.subject != Subject::scan && !topic.named;
+Known<Link> linkOf(const Gathering& g) {
+    Known<Link> link = gatherLink(g.sources.interfaceName, g.until);
+    const bool aboutJoined = g.topic.subject == Subject::network && !g.topic.named;
     if (aboutJoined && link && link->joined && optsOutOfTests(link->joined->says.name)) {
         return failure(Reason::badConfiguration, "the network's name asks not to be looked at (_nomap)");
     }
     return link;
 }
 
-Store link(const Facts&, const PhaseTopic& topic, Sources& sources, const Until& until) {
-    return [found = linkOf(topic, sources, until)](Facts& into) { into.link = found; };
+/// A scan that was complete after the phase's first request serves the whole phase, whatever age was asked for.
+std::int64_t freshEnough(const Gathering& g) {
+    return std::min(g.startOfPhase, bootMilliseconds() - g.topic.oldestScan.count());
 }
 
-Store nearby(const Facts& facts, const PhaseTopic& topic, Sources& sources, const Until& until) {
-    return fromLink(facts, &Facts::nearby, [&](const Link& found) -> Known<std::vector<AccessPoint>> {
-        if (!found.up) return failure(Reason::noInterface, found.interfaceName + " is down");
-        return sources.scanner.scan({found.interfaceIndex, found.radio, topic.oldestScan, topic.named},
-                                    until);
+/// The list wants all that answer, and every time anew; the tests also want to know who hides, and in one go.
+ScanWish wishOf(const Gathering& g, const Link& link) {
+    if (g.topic.subject != Subject::scan) {
+        return {link.interfaceIndex, link.radio, freshEnough(g), ScanWish::Manner::listening, g.topic.named};
+    }
+    constexpr std::int64_t kNever = std::numeric_limits<std::int64_t>::max();
+    return {link.interfaceIndex, link.radio, kNever, ScanWish::Manner::calling, std::nullopt};
+}
+
+Error isDown(const Link& link) {
+    return failure(Reason::noInterface, link.interfaceName + " is down");
+}
+
+Store link(const Gathering& g) {
+    return [found = linkOf(g)](Facts& into) { into.link = found; };
+}
+
+Store nearby(const Gathering& g) {
+    return fromLink(g, &Facts::nearby, [&](const Link& found) -> Known<std::vector<AccessPoint>> {
+        if (!found.up) return isDown(found);
+        return g.sources.scanner.scan(wishOf(g, found), g.until);
     });
 }
 
-Store listened(const Facts& facts, const PhaseTopic& topic, Sources& sources, const Until& until) {
-    return fromLink(facts, &Facts::listened, [&](const Link& found) -> Known<std::vector<AccessPoint>> {
-        if (!found.up) return failure(Reason::noInterface, found.interfaceName + " is down");
-        return sources.scanner.listen({found.interfaceIndex, found.radio, topic.oldestScan, std::nullopt},
-                                      until);
+Store listened(const Gathering& g) {
+    return fromLink(g, &Facts::listened, [&](const Link& found) -> Known<std::vector<AccessPoint>> {
+        if (!found.up) return isDown(found);
+        return g.sources.scanner.listen(wishOf(g, found), g.until);
     });
 }
 
-Store station(const Facts& facts, const PhaseTopic&, Sources&, const Until& until) {
-    return fromLink(facts, &Facts::station, [&](const Link& found) { return gatherStation(found, until); });
+Store station(const Gathering& g) {
+    return fromLink(g, &Facts::station, [&](const Link& found) { return gatherStation(found, g.until); });
 }
 
-Store survey(const Facts& facts, const PhaseTopic&, Sources&, const Until& until) {
-    return fromLink(facts, &Facts::survey, [&](const Link& found) { return gatherSurvey(found, until); });
+Store survey(const Gathering& g) {
+    return fromLink(g, &Facts::survey, [&](const Link& found) { return gatherSurvey(found, g.until); });
 }
 
-Store regulation(const Facts& facts, const PhaseTopic&, Sources&, const Until& until) {
-    return fromLink(facts, &Facts::regulation,
-                    [&](const Link& found) { return gatherRegulation(found, until); });
+Store regulation(const Gathering& g) {
+    return fromLink(g, &Facts::regulation,
+                    [&](const Link& found) { return gatherRegulation(found, g.until); });
 }
 
-Store addresses(const Facts& facts, const PhaseTopic&, Sources&, const Until& until) {
-    return fromLink(facts, &Facts::addresses,
-                    [&](const Link& found) { return gatherAddresses(found, until); });
+Store addresses(const Gathering& g) {
+    return fromLink(g, &Facts::addresses, [&](const Link& found) { return gatherAddresses(found, g.until); });
 }
 
-Store gatewayEcho(const Facts& facts, const PhaseTopic&, Sources& sources, const Until& until) {
-    return fromLink(facts, &Facts::gatewayEcho,
-                    [&](const Link& found) { return gatherGatewayEcho(found, sources.gatewayEcho, until); });
+Store gatewayEcho(const Gathering& g) {
+    return fromLink(g, &Facts::gatewayEcho, [&](const Link& found) {
+        return gatherGatewayEcho(found, g.sources.gatewayEcho, g.until);
+    });
 }
 
 constexpr Fact kLink[] = {Fact::link};
@@ -76,7 +92,7 @@ constexpr Fact kPingsAndScan[] = {Fact::gatewayEcho, Fact::nearby};
 constexpr FactRow kRows[] = {
     // fact              needs   after          most  gather
     {Fact::link,         {},     {},            3s,   link},
-    {Fact::nearby,       kLink,  kPings,        25s,  nearby},   // a joined radio scans two bands in about 9 s
+    {Fact::nearby,       kLink,  kPings,        30s,  nearby},   // a joined radio listens through two bands in 16 s
     {Fact::listened,     kLink,  kPingsAndScan, 20s, listened},
     {Fact::station,      kLink,  {},            3s,   station},
     {Fact::survey,       kLink,  {},            3s,   survey},

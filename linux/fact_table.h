@@ -10,14 +10,22 @@ namespace wp {
 /// Puts what was gathered into its place. Owner's thread.
 using Store = std::function<void(Facts& facts)>;
 
+/// What a worker goes by.
+struct Gathering {
+    const Facts& facts;  ///< only those that the row needs may be read
+    const PhaseTopic& topic;
+    std::int64_t startOfPhase;  ///< ms on the clock that counts suspended time too
+    Sources& sources;
+    Until until;
+};
+
 /// How one fact is had.
 struct FactRow {
     Fact fact;
     std::span<const Fact> needs;  ///< facts that it builds on
     std::span<const Fact> after;  ///< facts that it must not disturb: it waits while they are being gathered
-    std::chrono::milliseconds most;  ///< how long it may take
-    /// On a worker's thread; reads only the facts that it needs.
-    Store (*gather)(const Facts& facts, const PhaseTopic& topic, Sources& sources, const Until& until);
+    std::chrono::milliseconds most;               ///< how long it may take
+    Store (*gather)(const Gathering& gathering);  ///< on a worker's thread
 };
 
 /// The row of a fact. *Any* thread.

@@ -54,6 +54,7 @@ class Phase : public std::enable_shared_from_this<Phase> {
     void launch(Fact fact);
 
     PhaseTopic topic_;
+    std::int64_t startedAt_ = bootMilliseconds();
     Sources& sources_;
     Workers& workers_;
     std::shared_ptr<const StopSignal> stop_;

@@ -22,28 +22,18 @@ class ScanRun {
     }
 
     Known<ScanReport> run() {
-        if (const Known<RadioAbilities> abilities = radio_.abilities(wish_.radio, until_))
-            abilities_ = *abilities;
-        if (std::optional<Error> error = complete(fullOrder())) return *error;
-        const std::int64_t completedAt = bootMilliseconds();
-        Known<std::vector<AccessPoint>> found = results();
-        if (!found) return found.error();
-        if (wish_.named) found = withBeacons(std::move(*found));
-        if (!found) return found.error();
-        return ScanReport{std::move(*found), completedAt};
+        Known<ScanReport> report = complete(fullOrder());
+        if (report && wish_.named) return withBeacons(std::move(*report));
+        return report;
     }
 
-    /// Listens on the channels that a scan visits briefly. On the others a scan only listens anyway.
+    /// Listens on the channels that a calling scan visits briefly. On the others it only listens anyway.
     Known<ScanReport> listen() {
         ScanOrder order{{}, false, {}};
         for (const RadioChannel& channel : abilities_.channels) {
             if (!channel.disabled && !channel.passive) order.frequencies.push_back(channel.frequency);
         }
-        if (std::optional<Error> error = complete(order)) return *error;
-        const std::int64_t completedAt = bootMilliseconds();
-        Known<std::vector<AccessPoint>> found = results();
-        if (!found) return found.error();
-        return ScanReport{std::move(*found), completedAt};
+        return complete(order);
     }
 
   private:
@@ -52,6 +42,7 @@ class ScanRun {
         if (wish_.named) order.names.push_back(*wish_.named);
         // A radio that can ask for one name only asks for the one that is wanted; all others are heard all the same.
         order.probeForAll = order.names.size() < std::max<std::size_t>(abilities_.namesPerScan, 1);
+        if (!wish_.named && wish_.manner == ScanWish::Manner::listening) order.probeForAll = false;
         return order;
     }
 
@@ -65,8 +56,17 @@ class ScanRun {
                event.frequencies >= usableChannels();
     }
 
+    /// What a scan of this order found, and when it was over.
+    Known<ScanReport> complete(const ScanOrder& order) {
+        if (const std::optional<Error> error = scan(order)) return *error;
+        const std::int64_t completedAt = bootMilliseconds();
+        Known<std::vector<AccessPoint>> found = results();
+        if (!found) return found.error();
+        return ScanReport{std::move(*found), completedAt};
+    }
+
     /// Scans until a scan of this order, or as good a one of somebody else, is complete.
-    std::optional<Error> complete(const ScanOrder& order) {
+    std::optional<Error> scan(const ScanOrder& order) {
         bool aborted = false;
         for (int attempt = 0; attempt < kStartAttempts; ++attempt) {
             const int error = radio_.startScan(wish_.interfaceIndex, order, until_);
@@ -88,33 +88,34 @@ class ScanRun {
         return failureOf(error, "scan");
     }
 
-    /// What was heard since the run began, and the joined access point, which the kernel keeps up to date.
+    /// What was heard since the run began or is young enough, and the joined access point, which the kernel keeps up
+    /// to date.
     Known<std::vector<AccessPoint>> results() {
         Known<std::vector<AccessPoint>> found = radio_.accessPoints(wish_.interfaceIndex, until_);
         if (!found) return found;
+        const std::int64_t oldest = std::min(startedAt_, wish_.freshSince);
         std::erase_if(*found, [&](const AccessPoint& each) {
-            return !each.joined && each.lastSeen && *each.lastSeen < startedAt_;
+            return !each.joined && each.lastSeen && *each.lastSeen < oldest;
         });
         return found;
     }
 
     /// Listens on the channels of the named network until a beacon of each of its access points was heard: only a
     /// beacon tells whether the name is hidden.
-    Known<std::vector<AccessPoint>> withBeacons(std::vector<AccessPoint> found) {
+    Known<ScanReport> withBeacons(ScanReport report) {
         for (int attempt = 0; attempt < kListenAttempts; ++attempt) {
             ScanOrder order{{}, false, {}};
-            for (const AccessPoint& each : found) {
+            for (const AccessPoint& each : report.accessPoints) {
                 const bool lacksBeacon = each.says.name == *wish_.named && !each.says.hidesName;
                 const bool isListed = std::ranges::count(order.frequencies, each.frequency) > 0;
                 if (lacksBeacon && !isListed) order.frequencies.push_back(each.frequency);
             }
             if (order.frequencies.empty()) break;
-            if (const std::optional<Error> error = complete(order)) break;
-            Known<std::vector<AccessPoint>> again = results();
-            if (!again) return again;
-            found = std::move(*again);
+            Known<ScanReport> again = complete(order);
+            if (!again) break;
+            report = std::move(*again);
         }
-        return found;
+        return report;
     }
 
     RadioSocket& radio_;
@@ -135,13 +136,12 @@ Known<std::vector<AccessPoint>> withoutScan(RadioSocket& radio, const ScanWish& 
                                             const Until& until) {
     Known<std::vector<AccessPoint>> known = radio.accessPoints(wish.interfaceIndex, until);
     if (!known) return known;
-    const std::int64_t oldest = bootMilliseconds() - wish.oldest.count();
     std::erase_if(*known, [&](const AccessPoint& each) {
-        return !each.joined && (!each.lastSeen || *each.lastSeen < oldest);
+        return !each.joined && (!each.lastSeen || *each.lastSeen < wish.freshSince);
     });
     const bool heardOthers =
         std::ranges::any_of(*known, [](const AccessPoint& each) { return !each.joined; });
-    if (wish.oldest.count() == 0 || !heardOthers) return denied;
+    if (!heardOthers) return denied;
     return known;
 }
 
@@ -157,8 +157,7 @@ Known<RadioSocket> openRadio(const Until& until) {
 }  // namespace
 
 bool Scanner::Remembered::serves(const ScanWish& wish) const {
-    return wish.oldest.count() > 0 && interfaceIndex == wish.interfaceIndex &&
-           bootMilliseconds() - report.completedAt <= wish.oldest.count();
+    return interfaceIndex == wish.interfaceIndex && report.completedAt >= wish.freshSince;
 }
 
 Known<std::vector<AccessPoint>> Scanner::scan(const ScanWish& wish, const Until& until) {
@@ -174,6 +173,7 @@ Known<std::vector<AccessPoint>> Scanner::scan(const ScanWish& wish, const Until&
     }
     if (!report) return report.error();
     scanned_ = Remembered{wish.interfaceIndex, *report};
+    if (!wish.named && wish.manner == ScanWish::Manner::listening) listened_ = scanned_;
     return report->accessPoints;
 }
 

@@ -16,20 +16,25 @@ struct ScanReport {
 struct ScanWish {
     std::uint32_t interfaceIndex = 0;
     std::uint32_t radio = 0;
-    std::chrono::milliseconds oldest{0};  ///< how old a scan may be; 0: a new one
-    std::optional<NetworkName>
-        named;  ///< a network that must be looked for by name, and whose beacon is wanted
+    /// A scan that was complete at this time or later will do, in ms on the clock that counts suspended time too.
+    std::int64_t freshSince = 0;
+    /// `calling` asks who is there and hears slow and faint access points too. `listening` stays on each channel
+    /// as long as access points take between two beacons, and so hears those that hide and answer nobody.
+    enum class Manner { calling, listening };
+    Manner manner = Manner::calling;
+    /// A network that must be called by name, and whose beacon is wanted.
+    std::optional<NetworkName> named;
 };
 
 /// Scans, and remembers the last scan longer than the kernel does. *Any* thread; one scan at a time.
 class Scanner {
   public:
-    /// What the latest scan of at most this age found, or a new scan. A scan that somebody else has started is
+    /// What the latest scan that is fresh enough found, or a new scan. A scan that somebody else has started is
     /// joined when it covers the radio's channels. An error says why there can be none.
     Known<std::vector<AccessPoint>> scan(const ScanWish& wish, const Until& until);
 
-    /// What the latest listening of at most this age heard, or a new one: as long on each channel as access points
-    /// take between two beacons, where a scan would only call briefly. The wish's name plays no part.
+    /// What the latest listening that is fresh enough heard, or what is now heard on the channels that a calling scan
+    /// visits too briefly. Manner and name of the wish play no part.
     Known<std::vector<AccessPoint>> listen(const ScanWish& wish, const Until& until);
 
   private:
