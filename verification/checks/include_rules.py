@@ -17,7 +17,7 @@ MAY_INCLUDE = {
     "network_list": ["platform", "lifecycle"],
     "service": ["platform"],
     "exchange": ["platform"],
-    "linux": ["platform", "service", "exchange/codec.h", "exchange/json_reader.h",
+    "linux": ["platform", "service", "exchange/codec.h", "exchange/wire.h", "exchange/json_reader.h",
               "exchange/object_reader.h", "exchange/place.h"],
     "screens/remote": ["platform"],
     "screens/headless": ["platform", "screens/remote"],
