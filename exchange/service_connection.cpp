@@ -193,7 +193,7 @@ bool ServiceConnection::receive() {
 }
 
 Error ServiceConnection::endOfService() {
-    constexpr milliseconds untilEnded(200);
+    constexpr milliseconds untilEnded(1000);
     std::optional<std::string> how = process_->waitForEnd(untilEnded);
     return {kUnavailable,
             how ? "wifi-profile-service ended (" + *how + ")" : "wifi-profile-service closed the connection"};
