@@ -106,7 +106,7 @@ class Recorder::Tape {
         std::lock_guard lock(mutex_);
         power_ = power;
         bool isWish = wish_ == power;
-        wish_.reset();
+        if (isWish) wish_.reset();
         if (!isWish && registered_) recording_.events.push_back({since(*registered_), power});
     }
 

@@ -10,6 +10,7 @@
 #include "platform/activity.h"
 #include "platform/json_writer.h"
 #include "platform/main_queue.h"
+#include "verification/unit/fakes/fake_wifi_manager.h"
 
 namespace wp {
 namespace {
@@ -219,6 +220,34 @@ TEST(Recorder, SaysThatAWishForPowerWasIgnored) {
     listening.client_->setPower(1);
     listening.mainQueue_.runPending();
     EXPECT_EQ(listening.recorder_.recording().wifi.setPower, WiFiDescription::SetPower::ignored);
+}
+
+TEST(Recorder, LeavesOutAFulfilledWishAlsoBehindAChangeFromOutside) {
+    RecordingPointer nothing = stated(R"("answers": [])");
+    ReplayDiagnosticsClient diagnostics(nothing);
+    ReplayCapabilityQuery capabilities(nothing);
+    fakes::FakeWiFiManager wifi;
+    wifi.setInitialPower(0);
+    wifi.setObeysSetPower(false);
+    Recorder recorder(diagnostics, wifi, capabilities);
+    Activity activity;
+    MainQueue mainQueue(activity);
+    auto client = recorder.wifi().createClient(0);
+    client->scheduleWithRunLoop(mainQueue);
+    auto device = client->copyDevices().at(0);
+    client->power();
+    device->registerPowerCallback([] {});
+
+    client->setPower(1);
+    for (int power : {0, 1}) {
+        wifi.turnPower(power);
+        mainQueue.runPending();
+    }
+
+    Recording recording = recorder.recording();
+    ASSERT_EQ(recording.events.size(), 1U);
+    EXPECT_FALSE(recording.events[0].power);
+    EXPECT_EQ(recording.wifi.setPower, WiFiDescription::SetPower::works);
 }
 
 TEST(Recorder, SavesForItsOwnerAlone) {
