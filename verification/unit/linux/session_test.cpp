@@ -1,0 +1,211 @@
+#include "linux/session.h"
+
+#include <gtest/gtest.h>
+#include <sys/socket.h>
+
+#include <thread>
+
+#include "platform/records.h"
+
+namespace wp {
+namespace {
+
+Known<PhaseTopic> topic(int test, Dictionary::Entries configuration) {
+    return topicOf(*findTest(test), Dictionary::make(std::move(configuration)));
+}
+
+TEST(Topic, TakesAgeAndNameFromTheConfiguration) {
+    const auto found = topic(34, {{"MaxScanCacheAge", 1.5}, {"NetworkName", "Office"}});
+
+    ASSERT_TRUE(found);
+    EXPECT_EQ(std::chrono::milliseconds(1500), found->oldestScan);
+    EXPECT_EQ(nameFromText("Office"), found->named);
+}
+
+TEST(Topic, FindsTheBytesOfAnEscapedNameAgain) {
+    const std::uint8_t bytes[] = {'a', 0xFF};
+
+    EXPECT_EQ(NetworkName(bytes), topic(34, {{"NetworkName", "a\\xFF"}})->named);
+}
+
+TEST(Topic, OfTestsOfTheDeviceAndOfTheJoinedNetworkHasNoName) {
+    for (const int test : {14, 3, 35, 31})
+        EXPECT_FALSE(topic(test, {{"NetworkName", "Office"}})->named) << test;
+}
+
+TEST(Topic, IsOneForAllTestsOfTheSameNetwork) {
+    EXPECT_EQ(*topic(34, {{"MaxScanCacheAge", 60}}), *topic(3, {{"MaxScanCacheAge", 60}}));
+    EXPECT_NE(*topic(34, {{"MaxScanCacheAge", 60}}), *topic(34, {{"MaxScanCacheAge", 0}}));
+    EXPECT_NE(*topic(34, {}), *topic(34, {{"NetworkName", "Office"}}));
+}
+
+TEST(Topic, RefusesWhatNoNetworkCanBe) {
+    const Dictionary::Entries refused[] = {
+        {{"NetworkName", std::string(33, 'a')}}, {{"NetworkName", 7}},          {{"NetworkName", ""}},
+        {{"NetworkName", "Cafe_NoMap"}},         {{"MaxScanCacheAge", "soon"}}, {{"MaxScanCacheAge", -1}},
+    };
+    for (const Dictionary::Entries& each : refused) {
+        const auto found = topic(34, each);
+        ASSERT_FALSE(found);
+        EXPECT_EQ(9, found.error().code);
+    }
+}
+
+TEST(Topic, IsAboutTheJoinedNetworkWithoutAConfiguration) {
+    const auto found = topicOf(*findTest(34), nullptr);
+
+    ASSERT_TRUE(found);
+    EXPECT_FALSE(found->named);
+}
+
+/// A session on a thread of its own, and the host's end of its wire.
+class Conversation {
+  public:
+    Conversation() {
+        int ends[2];
+        EXPECT_EQ(0, socketpair(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0, ends));
+        host_.emplace(Descriptor(ends[0]));
+        service_ = std::thread([end = ends[1]] {
+            LineSocket wire{Descriptor(end)};
+            Sources sources;
+            // No machine has an interface of this name: what is asked here ends with an error at once or soon.
+            sources.interfaceName = "no-such-wifi";
+            PowerSwitch power;
+            Session(wire, sources, power).run();
+        });
+    }
+    ~Conversation() {
+        host_.reset();
+        service_.join();
+    }
+
+    void say(std::string_view line) { host_->send(line); }
+
+    /// The next line that the service says.
+    std::string hear() {
+        for (;;) {
+            if (std::optional<std::string> line = host_->nextLine()) return *line;
+            if (!host_->receive()) return "closed";
+        }
+    }
+
+    /// The answer to the request of this number.
+    WireAnswer answer(std::uint64_t id) {
+        for (;;) {
+            const WireMessage message = readMessage(hear());
+            const auto* answer = std::get_if<WireAnswer>(&message);
+            if (answer != nullptr && answer->id == id) return *answer;
+        }
+    }
+
+  private:
+    std::optional<LineSocket> host_;
+    std::thread service_;
+};
+
+TEST(Session, AnswersATestThatCannotBeMadeWithItsReason) {
+    Conversation conversation;
+
+    conversation.say(
+        "{\"id\":1,\"request\":\"test\",\"test\":34,\"configuration\":{\"MaxScanCacheAge\":0}}\n");
+    const DiagnosticsTestResponse response = testAnswer(conversation.answer(1));
+
+    ASSERT_TRUE(response.error);
+    EXPECT_NE(0, response.error->code);
+    EXPECT_FALSE(response.error->message.empty());
+}
+
+TEST(Session, AnswersATestThatDoesNotExist) {
+    Conversation conversation;
+
+    conversation.say("{\"id\":1,\"request\":\"test\",\"test\":5}\n");
+
+    EXPECT_EQ("no test 5 (code 9)", testAnswer(conversation.answer(1)).error->text());
+}
+
+TEST(Session, SaysWhatItDidNotUnderstandAndGoesOn) {
+    Conversation conversation;
+
+    conversation.say("nonsense\n{\"id\":2,\"request\":\"status\"}\n");
+    const WireMessage first = readMessage(conversation.hear());
+
+    EXPECT_TRUE(std::holds_alternative<Note>(first));
+    EXPECT_TRUE(statusAnswer(conversation.answer(2)).error);
+}
+
+TEST(Session, DescribesAMachineWithoutTheInterface) {
+    Conversation conversation;
+
+    conversation.say("{\"id\":3,\"request\":\"wifi\"}\n");
+    const WiFiResponse response = wifiAnswer(conversation.answer(3));
+
+    ASSERT_TRUE(response.wifi);
+    EXPECT_TRUE(response.wifi->devices.empty());
+    EXPECT_FALSE(response.wifi->power);
+}
+
+TEST(Session, AnswersEachRequestOnceWhateverIsCancelledMeanwhile) {
+    Conversation conversation;
+    constexpr std::uint64_t kRequests = 200;
+    std::string lines;
+    for (std::uint64_t id = 1; id <= kRequests; ++id) {
+        const char* const kind = id % 3 == 0 ? "\"status\"" : "\"test\",\"test\":34";
+        lines += "{\"id\":" + std::to_string(id) + ",\"request\":" + kind + "}\n";
+        if (id % 7 == 0) lines += "{\"request\":\"cancel\"}\n{\"request\":\"cancel\"}\n";
+    }
+
+    conversation.say(lines);
+    std::vector<int> answers(kRequests + 1);
+    for (std::uint64_t heard = 0; heard < kRequests; ++heard) {
+        const WireMessage message = readMessage(conversation.hear());
+        ASSERT_TRUE(std::holds_alternative<WireAnswer>(message));
+        ++answers.at(std::get<WireAnswer>(message).id);
+    }
+
+    EXPECT_EQ(std::vector<int>(kRequests, 1), std::vector<int>(answers.begin() + 1, answers.end()));
+}
+
+TEST(Session, ServesRequestsAfterItWasCancelled) {
+    Conversation conversation;
+
+    conversation.say("{\"request\":\"cancel\"}\n{\"id\":1,\"request\":\"test\",\"test\":34}\n");
+
+    EXPECT_NE(kCancelledCode, testAnswer(conversation.answer(1)).error->code);
+}
+
+TEST(Session, EndsInTheMiddleOfItsWorkWhenTheWireIsClosed) {
+    Conversation conversation;
+
+    conversation.say("{\"id\":1,\"request\":\"test\",\"test\":31}\n{\"id\":2,\"request\":\"status\"}\n");
+}
+
+TEST(LineSocket, PutsLinesTogetherFromPieces) {
+    int ends[2];
+    ASSERT_EQ(0, socketpair(AF_UNIX, SOCK_STREAM, 0, ends));
+    LineSocket reader{Descriptor(ends[0])};
+    LineSocket writer{Descriptor(ends[1])};
+
+    writer.send("one\ntw");
+    EXPECT_TRUE(reader.receive());
+    EXPECT_EQ("one", reader.nextLine());
+    EXPECT_EQ(std::nullopt, reader.nextLine());
+    writer.send("o\n");
+    EXPECT_TRUE(reader.receive());
+
+    EXPECT_EQ("two", reader.nextLine());
+}
+
+TEST(StopSignal, EndsAWaitAndStaysRaised) {
+    const auto stop = std::make_shared<StopSignal>();
+    std::thread other([stop] { stop->raise(); });
+
+    const Wait wait = waitReadable(-1, {stop, Clock::now() + std::chrono::hours(1)});
+    other.join();
+    stop->raise();
+
+    EXPECT_EQ(Wait::stopped, wait);
+    EXPECT_TRUE(stop->raised());
+}
+
+}  // namespace
+}  // namespace wp
