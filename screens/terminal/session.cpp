@@ -112,6 +112,7 @@ void Session::configure() {
     keypad(stdscr, TRUE);
     nodelay(stdscr, TRUE);
     set_escdelay(kEscapeDelay);
+    typeahead(-1);  // a picture is drawn whole, also when the next key is there already
     curs_set(0);
     const char* noColour = std::getenv("NO_COLOR");
     bool isColourWanted = noColour == nullptr || *noColour == '\0';
