@@ -86,8 +86,6 @@ void refuseOneFileForTwo(const RunOptions& options) {
 Preparation prepare(const RunOptions& options) {
     if (options.format != OutputFormat::json)
         refuse("--format: this build writes no report yet; leave it out to get the result as JSON");
-    if (options.showEndpoints)
-        refuse("--show-endpoints: this build's service cannot tell yet what it would contact");
     Preparation prepared;
     prepared.locale = localeOf(options);
     prepared.parameters = requestParameters(options);

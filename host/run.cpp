@@ -17,6 +17,7 @@
 #include "host/preparation.h"
 #include "host/progress_client.h"
 #include "host/result_document.h"
+#include "host/service_program.h"
 #include "host/services.h"
 #include "host/transcript.h"
 #include "platform/activity.h"
@@ -191,9 +192,18 @@ void Run::writeResult() {
         fail("standard output: the result cannot be written: " + *error);
 }
 
+int showEndpoints(const RunOptions& options) {
+    if (options.configFile) readConfiguration(*options.configFile);
+    std::string endpoints = contactedEndpoints(options.configFile.value_or(""));
+    if (std::optional<std::string> error = writeAll(STDOUT_FILENO, endpoints))
+        fail("standard output: cannot be written: " + *error);
+    return exit_status::ok;
+}
+
 }  // namespace
 
 int runDiagnostic(const RunOptions& options) {
+    if (options.showEndpoints) return showEndpoints(options);
     Preparation prepared = prepare(options);
     return Run(options, prepared).perform();
 }

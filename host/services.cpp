@@ -9,7 +9,7 @@
 #include "exchange/recorder.h"
 #include "exchange/replay.h"
 #include "host/exit.h"
-#include "host/extension_module.h"
+#include "host/service_program.h"
 
 namespace wp::host {
 namespace {
@@ -34,13 +34,11 @@ class ReplayServices final : public Services {
     bool isAutomated_;
 };
 
-/// The program that looks at this machine; it stands beside this one.
-constexpr const char* kServiceFileName = "wifi-profile-service";
-
 LiveServiceOptions liveOptions(const RunOptions& options, DiagnosticsLog& log) {
     LiveServiceOptions live;
-    live.program = (programFolder() / kServiceFileName).string();
+    live.program = serviceProgram();
     if (options.interfaceName) live.arguments = {"--interface", *options.interfaceName};
+    if (options.configFile) live.arguments.insert(live.arguments.end(), {"--config", *options.configFile});
     live.note = [&log](std::string_view text) { log.note(text); };
     return live;
 }
@@ -99,7 +97,7 @@ class RecordedServices final : public Services {
 std::unique_ptr<Services> answeringServices(const RunOptions& options, const Preparation& prepared,
                                             MainQueue& mainQueue, DiagnosticsLog& log) {
     if (prepared.recording) return std::make_unique<ReplayServices>(prepared.recording, mainQueue);
-    std::string service = (programFolder() / kServiceFileName).string();
+    std::string service = serviceProgram();
     if (!std::filesystem::exists(service))
         fail(service + ": not found; a live run needs it beside the program (--replay and --demo do not)");
     return std::make_unique<LiveServices>(options, prepared, log);
