@@ -5,10 +5,7 @@
 #include <vector>
 
 #include "exchange/json_reader.h"
-#include "service/bluetooth.h"
-#include "service/congestion.h"
-#include "service/maker.h"
-#include "service/saved_networks.h"
+#include "service/settings.h"
 
 namespace wp {
 
@@ -29,18 +26,15 @@ struct Endpoints {
     std::string certificateAuthorities;
 };
 
-struct Thresholds {
-    BluetoothLimits bluetooth;
-    SavedNetworkLimits saved;
-    CongestionLimits congestion;
-};
-
 /// What a device maker, an operator or a user sets in place of the defaults.
 struct Config {
     Endpoints endpoints;
     Thresholds thresholds;
     Vendors vendors;
     std::string peerLinkIndicator;  ///< a file that holds 1 while the maker's peer link is in real-time mode
+
+    /// What the verdicts go by.
+    Settings settings() const { return {thresholds, vendors, {endpoints.vendorBodyPrefix}}; }
 
     /// The defaults; the makers in them are examples that no device matches.
     static Config defaults();

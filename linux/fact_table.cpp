@@ -3,6 +3,9 @@
 #include <algorithm>
 #include <limits>
 
+#include "linux/gather_reach.h"
+#include "linux/gather_setup.h"
+
 namespace wp {
 namespace {
 
@@ -83,10 +86,88 @@ Store gatewayEcho(const Gathering& g) {
     });
 }
 
+Store setup(const Gathering& g) {
+    return fromLink(g, &Facts::setup, [&](const Link& found) { return gatherSetup(found, g.until); });
+}
+
+Store saved(const Gathering& g) {
+    return fromLink(g, &Facts::saved, [&](const Link& found) { return gatherSaved(found, g.until); });
+}
+
+Store bluetooth(const Gathering& g) {
+    return [found = gatherBluetooth(g.until)](Facts& into) { into.bluetooth = found; };
+}
+
+Store driverSharesAirtime(const Gathering& g) {
+    return fromLink(g, &Facts::driverSharesAirtime,
+                    [](const Link& found) { return gatherAirtimeSharing(found); });
+}
+
+Store peerLinks(const Gathering& g) {
+    return fromLink(g, &Facts::peerLinks, [&](const Link& found) {
+        return gatherPeerLinks(found, g.sources.config.peerLinkIndicator, g.until);
+    });
+}
+
+Store airtime(const Gathering& g) {
+    return fromLink(g, &Facts::airtime, [&](const Link& found) { return gatherAirtime(found, g.until); });
+}
+
+Store allowedChannels(const Gathering& g) {
+    return fromLink(g, &Facts::allowedChannels,
+                    [&](const Link& found) { return gatherAllowedChannels(found, g.until); });
+}
+
+Store outsideEcho(const Gathering& g) {
+    return fromLink(g, &Facts::outsideEcho, [&](const Link& found) {
+        return gatherOutsideEcho(found, g.sources.config.endpoints, g.sources.outsideEcho, g.until);
+    });
+}
+
+/// A store of what the function makes of the link and its set-up, or of the reason why one of them is missing.
+template <class T, class Gather>
+Store fromSetup(const Gathering& g, Known<T> Facts::*place, Gather gather) {
+    return fromLink(g, place, [&](const Link& found) -> Known<T> {
+        if (!g.facts.setup) return g.facts.setup.error();
+        return gather(found, *g.facts.setup);
+    });
+}
+
+Store nameAnswer(const Gathering& g) {
+    return fromSetup(g, &Facts::nameAnswer, [&](const Link& found, const LinkSetup& how) {
+        return gatherNameAnswer(found, how, g.sources.config.endpoints, g.until);
+    });
+}
+
+Store portal(const Gathering& g) {
+    return fromSetup(g, &Facts::portal, [&](const Link& found, const LinkSetup& how) {
+        return gatherPortal(found, how, g.sources.config.endpoints, g.until);
+    });
+}
+
+Store vendorService(const Gathering& g) {
+    return fromSetup(g, &Facts::vendorService, [&](const Link& found, const LinkSetup& how) {
+        return gatherVendorService(found, how, g.sources.config.endpoints, g.until);
+    });
+}
+
+Store router(const Gathering& g) {
+    return fromLink(g, &Facts::router, [&](const Link& found) { return gatherRouter(found, g.until); });
+}
+
+Store translation(const Gathering& g) {
+    return fromSetup(g, &Facts::translation, [&](const Link& found, const LinkSetup& how) {
+        const auto told = g.facts.router ? g.facts.router->external : std::nullopt;
+        return gatherTranslation(found, how, told, g.sources.config.endpoints, g.until);
+    });
+}
+
 constexpr Fact kLink[] = {Fact::link};
 // A scan leaves the channel for a while; echo requests would be lost and delayed meanwhile.
-constexpr Fact kPings[] = {Fact::gatewayEcho};
-constexpr Fact kPingsAndScan[] = {Fact::gatewayEcho, Fact::nearby};
+constexpr Fact kPings[] = {Fact::gatewayEcho, Fact::outsideEcho};
+constexpr Fact kSetup[] = {Fact::link, Fact::setup};
+constexpr Fact kTranslation[] = {Fact::link, Fact::setup, Fact::router};
+constexpr Fact kPingsAndScan[] = {Fact::gatewayEcho, Fact::outsideEcho, Fact::nearby};
 
 // clang-format off
 constexpr FactRow kRows[] = {
@@ -98,7 +179,20 @@ constexpr FactRow kRows[] = {
     {Fact::survey,       kLink,  {},            3s,   survey},
     {Fact::regulation,   kLink,  {},            3s,   regulation},
     {Fact::addresses,    kLink,  {},            3s,   addresses},
-    {Fact::gatewayEcho,  kLink,  {},            4s,   gatewayEcho},
+    {Fact::gatewayEcho,  kLink,  {},     4s,     gatewayEcho},
+    {Fact::setup,        kLink,  {},     4s,     setup},
+    {Fact::saved,        kLink,  {},     4s,     saved},
+    {Fact::bluetooth,    {},     {},     3s,     bluetooth},
+    {Fact::driverSharesAirtime, kLink, {}, 1s,   driverSharesAirtime},
+    {Fact::peerLinks,    kLink,  {},     3s,     peerLinks},
+    {Fact::airtime,      kLink,  {},     4s,     airtime},
+    {Fact::allowedChannels, kLink, {},   3s,     allowedChannels},
+    {Fact::outsideEcho,  kLink,  {},     4s,     outsideEcho},
+    {Fact::nameAnswer,   kSetup, {},     4s,     nameAnswer},
+    {Fact::portal,       kSetup, {},     5s,     portal},
+    {Fact::vendorService, kSetup, {},    5s,     vendorService},
+    {Fact::router,       kLink,  {},     4s,     router},
+    {Fact::translation,  kTranslation, {}, 3s,   translation},
 };
 // clang-format on
 

@@ -17,6 +17,7 @@ using std::chrono::milliseconds;
 
 constexpr int kSignalSamples = 5;
 constexpr milliseconds kBetweenSamples{250};
+constexpr milliseconds kCountedTime{1000};
 
 bool isUp(const std::string& interfaceName) {
     const Descriptor any(socket(AF_INET, SOCK_DGRAM | SOCK_CLOEXEC, 0));
@@ -111,6 +112,31 @@ Known<Survey> gatherSurvey(const Link& link, const Until& until) {
     Known<RadioSocket> radio = RadioSocket::open(until);
     if (!radio) return radio.error();
     return radio->survey(link.interfaceIndex, until);
+}
+
+Known<Airtime> gatherAirtime(const Link& link, const Until& until) {
+    Known<RadioSocket> radio = RadioSocket::open(until);
+    if (!radio) return radio.error();
+    const Known<Airtime> before = radio->airtime(link.interfaceIndex, until);
+    if (!before) return before.error();
+    // Counters have steps of about 10 ms: within a second that is one in a hundred.
+    if (waitReadable(-1, until.within(kCountedTime)) == Wait::stopped)
+        return waitFailure(Wait::stopped, "airtime");
+    const Known<Airtime> after = radio->airtime(link.interfaceIndex, until);
+    if (!after) return after.error();
+    return airtimeBetween(*before, *after);
+}
+
+Known<AllowedChannels> gatherAllowedChannels(const Link& link, const Until& until) {
+    Known<RadioSocket> radio = RadioSocket::open(until);
+    if (!radio) return radio.error();
+    const Known<RadioAbilities> abilities = radio->abilities(link.radio, until);
+    if (!abilities) return abilities.error();
+    AllowedChannels allowed;
+    for (const RadioChannel& each : abilities->channels) {
+        if (!each.disabled) allowed.push_back({each.frequency, each.passive, each.radar});
+    }
+    return allowed;
 }
 
 Known<Regulation> gatherRegulation(const Link& link, const Until& until) {

@@ -23,6 +23,11 @@ Known<Regulation> gatherRegulation(const Link& link, const Until& until);
 Known<Addresses> gatherAddresses(const Link& link, const Until& until);
 Known<Echo> gatherGatewayEcho(const Link& link, EchoSocket& socket, const Until& until);
 
+/// What the radio counted on each channel within one second.
+Known<Airtime> gatherAirtime(const Link& link, const Until& until);
+/// The channels that the radio and the regulatory domain allow.
+Known<AllowedChannels> gatherAllowedChannels(const Link& link, const Until& until);
+
 /// All station interfaces of this machine.
 Known<std::vector<RadioInterface>> gatherStationInterfaces(const Until& until);
 

@@ -1,24 +1,28 @@
 #include <sys/socket.h>
 
 #include <cstdio>
+#include <cstdlib>
 #include <cstring>
 #include <optional>
 #include <string>
 #include <string_view>
 
+#include "linux/config.h"
 #include "linux/privileges.h"
 #include "linux/session.h"
 
 namespace {
 
 constexpr const char* kUsage =
-    "usage: wifi-profile-service [--interface NAME]\n"
+    "usage: wifi-profile-service [--interface NAME] [--config FILE] [--show-endpoints]\n"
     "\n"
     "Answers the questions of wifi-profile about the Wi-Fi of this machine. It is started by wifi-profile, "
     "with a\n"
     "connected socket as descriptor 3.\n"
     "\n"
     "  --interface NAME  the Wi-Fi interface to look at\n"
+    "  --config FILE     endpoints, vendors and thresholds, over those of the system and the user\n"
+    "  --show-endpoints  prints whom the tests contact, and ends\n"
     "  --help            this text\n"
     "  --version         the version\n";
 
@@ -26,7 +30,19 @@ constexpr int kUnusable = 2;
 
 struct Options {
     std::optional<std::string> interfaceName;
+    std::string config;
+    bool showEndpoints = false;
 };
+
+/// The configuration, or the line that says what is wrong with it.
+std::variant<wp::Config, std::string> readConfig(const std::string& named) {
+    const char* const folder = std::getenv("XDG_CONFIG_HOME");
+    const char* const home = std::getenv("HOME");
+    const std::string user = folder != nullptr ? folder
+                             : home != nullptr ? std::string(home) + "/.config"
+                                               : "";
+    return wp::loadConfig(wp::configFiles(user), named);
+}
 
 /// The options, or an exit status.
 std::variant<Options, int> readOptions(int count, char** arguments) {
@@ -43,8 +59,14 @@ std::variant<Options, int> readOptions(int count, char** arguments) {
         }
         if (argument == "--interface" && i + 1 < count) {
             options.interfaceName = arguments[++i];
+        } else if (argument == "--config" && i + 1 < count) {
+            options.config = arguments[++i];
+        } else if (argument == "--show-endpoints") {
+            options.showEndpoints = true;
         } else {
-            const char* const what = argument == "--interface" ? "needs a name" : "is not an option";
+            const char* const what = argument == "--interface" ? "needs a name"
+                                     : argument == "--config"  ? "needs a file"
+                                                               : "is not an option";
             std::fprintf(stderr, "wifi-profile-service: %s %s\n", arguments[i], what);
             return kUnusable;
         }
@@ -63,6 +85,16 @@ bool isSocket(int descriptor) {
 int main(int count, char** arguments) {
     const std::variant<Options, int> read = readOptions(count, arguments);
     if (const int* status = std::get_if<int>(&read)) return *status;
+    const Options& options = std::get<Options>(read);
+    const std::variant<wp::Config, std::string> config = readConfig(options.config);
+    if (const std::string* fault = std::get_if<std::string>(&config)) {
+        std::fprintf(stderr, "wifi-profile-service: %s\n", fault->c_str());
+        return kUnusable;
+    }
+    if (options.showEndpoints) {
+        std::puts(wp::endpointsAsJson(std::get<wp::Config>(config)).c_str());
+        return 0;
+    }
     if (!isSocket(wp::kWireDescriptor)) {
         std::fputs(
             "wifi-profile-service: descriptor 3 is no connected socket; this program is started by "
@@ -71,7 +103,8 @@ int main(int count, char** arguments) {
         return kUnusable;
     }
     wp::Sources sources;
-    sources.interfaceName = std::get<Options>(read).interfaceName;
+    sources.interfaceName = options.interfaceName;
+    sources.config = std::get<wp::Config>(config);
     wp::PowerSwitch power;
     const wp::Privileges privileges = wp::dropPrivileges();
 

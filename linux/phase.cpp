@@ -6,6 +6,27 @@
 
 namespace wp {
 
+namespace {
+
+bool isAboutLink(Fact fact) {
+    switch (fact) {
+        case Fact::station:
+        case Fact::gatewayEcho:
+        case Fact::setup:
+        case Fact::outsideEcho:
+        case Fact::nameAnswer:
+        case Fact::portal:
+        case Fact::vendorService:
+        case Fact::router:
+        case Fact::translation:
+            return true;
+        default:
+            return false;
+    }
+}
+
+}  // namespace
+
 Phase::Phase(PhaseTopic topic, Sources& sources, Workers& workers, std::shared_ptr<const StopSignal> stop,
              std::function<void()> onProgress)
     : topic_(std::move(topic)),
@@ -14,12 +35,13 @@ Phase::Phase(PhaseTopic topic, Sources& sources, Workers& workers, std::shared_p
       stop_(std::move(stop)),
       onProgress_(std::move(onProgress)) {
     facts_.named = topic_.named;
+    facts_.settings = sources_.config.settings();
 }
 
 std::optional<Fact> Phase::resolved(Fact fact) const {
     if (fact == Fact::judged) return topic_.named ? Fact::nearby : Fact::link;
     // The link says nothing about a network that is not joined.
-    if (fact == Fact::station && topic_.named) return std::nullopt;
+    if (topic_.named && isAboutLink(fact)) return std::nullopt;
     return fact;
 }
 
@@ -34,6 +56,10 @@ void Phase::prepare(const NumberedTest& test) {
     for (const Fact fact : test.needs) want(fact);
     const bool aboutNetwork = test.subject == Subject::network || test.subject == Subject::joined;
     for (const NumberedTest& other : numberedTests()) {
+        // The device's own tests come in a row too, and none of their facts is about a network.
+        if (test.subject == Subject::device && other.subject == Subject::device) {
+            for (const Fact fact : other.needs) want(fact);
+        }
         if (!aboutNetwork || other.subject == Subject::device || other.subject == Subject::scan) continue;
         if (other.subject == Subject::joined && topic_.named) continue;
         for (const Fact fact : other.needs) want(fact);

@@ -4,6 +4,7 @@
 #include <functional>
 #include <memory>
 
+#include "linux/config.h"
 #include "linux/gather.h"
 #include "linux/workers.h"
 #include "service/catalogue.h"
@@ -15,6 +16,8 @@ struct Sources {
     std::optional<std::string> interfaceName;  ///< as the user named it
     Scanner scanner;
     EchoSocket gatewayEcho;
+    EchoSocket outsideEcho;
+    Config config = Config::defaults();
 };
 
 /// What one phase is about.

@@ -193,6 +193,26 @@ Survey readSurvey(Bytes buffer) {
     return survey;
 }
 
+Airtime readAirtime(Bytes buffer) {
+    Airtime airtime;
+    forEachOf(NL80211_CMD_NEW_SURVEY_RESULTS, buffer, [&](const Attributes& message) {
+        const Attributes info = message.nested(NL80211_ATTR_SURVEY_INFO);
+        const auto frequency = info.number<std::uint32_t>(NL80211_SURVEY_INFO_FREQUENCY);
+        const auto time = info.number<std::uint64_t>(NL80211_SURVEY_INFO_TIME);
+        if (!frequency || !time) return;
+        ChannelTime channel;
+        channel.frequency = *frequency;
+        channel.inUse = info.has(NL80211_SURVEY_INFO_IN_USE);
+        channel.time = *time;
+        channel.busy = info.number<std::uint64_t>(NL80211_SURVEY_INFO_TIME_BUSY);
+        channel.transmit = info.number<std::uint64_t>(NL80211_SURVEY_INFO_TIME_TX).value_or(0);
+        channel.receiveOwn = info.number<std::uint64_t>(NL80211_SURVEY_INFO_TIME_BSS_RX).value_or(0);
+        if (const auto noise = info.number<std::int8_t>(NL80211_SURVEY_INFO_NOISE)) channel.noise = *noise;
+        airtime.push_back(channel);
+    });
+    return airtime;
+}
+
 std::optional<Regulation> readRegulation(Bytes buffer, std::uint32_t radio) {
     std::optional<Regulation> system;
     std::optional<Regulation> own;

@@ -40,6 +40,8 @@ std::vector<AccessPoint> readAccessPoints(Bytes buffer, std::int64_t now);
 std::optional<Station> readStation(Bytes buffer);
 
 Survey readSurvey(Bytes buffer);
+/// What the radio has counted on each channel so far; channels on which it counts no time are left out.
+Airtime readAirtime(Bytes buffer);
 
 /// The domain of the radio, where it manages its own, else that of the whole system.
 std::optional<Regulation> readRegulation(Bytes buffer, std::uint32_t radio);

@@ -138,6 +138,12 @@ Known<Survey> RadioSocket::survey(std::uint32_t interfaceIndex, const Until& unt
     return readSurvey(answer.messages);
 }
 
+Known<Airtime> RadioSocket::airtime(std::uint32_t interfaceIndex, const Until& until) {
+    const NetlinkAnswer answer = ask(NL80211_CMD_GET_SURVEY, NLM_F_DUMP, interfaceIndex, until);
+    if (answer.error != 0) return failureOf(answer.error, "survey");
+    return readAirtime(answer.messages);
+}
+
 Known<Regulation> RadioSocket::regulation(std::uint32_t radio, const Until& until) {
     const NetlinkAnswer answer = askAboutRadio(NL80211_CMD_GET_REG, radio, until);
     if (answer.error != 0) return failureOf(answer.error, "regulatory domain");

@@ -27,6 +27,7 @@ class RadioSocket {
     Known<std::vector<AccessPoint>> accessPoints(std::uint32_t interfaceIndex, const Until& until);
     Known<Station> station(std::uint32_t interfaceIndex, const Until& until);
     Known<Survey> survey(std::uint32_t interfaceIndex, const Until& until);
+    Known<Airtime> airtime(std::uint32_t interfaceIndex, const Until& until);
     Known<Regulation> regulation(std::uint32_t radio, const Until& until);
     Known<RadioAbilities> abilities(std::uint32_t radio, const Until& until);
 

@@ -6,6 +6,9 @@
 
 #include "service/access_point.h"
 #include "service/known.h"
+#include "service/link_setup.h"
+#include "service/peer_link.h"
+#include "service/settings.h"
 
 namespace wp {
 
@@ -60,18 +63,55 @@ struct Echo {
 struct Facts {
     std::optional<NetworkName> named;  ///< the network asked about; absent: the one that is joined
     Known<Link> link;
-    Known<std::vector<AccessPoint>> nearby;  ///< all access points of the scan, the joined one included
+    Known<std::vector<AccessPoint>> nearby;    ///< all access points of the scan, the joined one included
     Known<std::vector<AccessPoint>> listened;  ///< what beacons tell that a scan is too short to hear
     Known<Station> station;
     Known<Survey> survey;
     Known<Regulation> regulation;
     Known<Addresses> addresses;
     Known<Echo> gatewayEcho;
+    Known<LinkSetup> setup;
+    Known<SavedNetworks> saved;
+    Known<Bluetooth> bluetooth;
+    Known<bool> driverSharesAirtime;
+    Known<PeerLinks> peerLinks;
+    Known<Airtime> airtime;
+    Known<AllowedChannels> allowedChannels;
+    Known<Echo> outsideEcho;
+    Known<NameAnswer> nameAnswer;
+    Known<PortalEvidence> portal;
+    Known<VendorContacts> vendorService;
+    Known<RouterAnswers> router;
+    Known<TranslationEvidence> translation;
+    Settings settings;  ///< not gathered, but set before all others
 };
 
 /// The kinds of facts, to say which ones a test needs. `judged` stands for where the judged access point is
 /// found: `link` for the joined network, `nearby` for a named one.
-enum class Fact { judged, link, nearby, listened, station, survey, regulation, addresses, gatewayEcho };
-constexpr std::size_t kFactCount = static_cast<std::size_t>(Fact::gatewayEcho) + 1;
+enum class Fact {
+    judged,
+    link,
+    nearby,
+    listened,
+    station,
+    survey,
+    regulation,
+    addresses,
+    gatewayEcho,
+    setup,
+    saved,
+    bluetooth,
+    driverSharesAirtime,
+    peerLinks,
+    airtime,
+    allowedChannels,
+    outsideEcho,
+    nameAnswer,
+    portal,
+    vendorService,
+    router,
+    translation,
+};
+constexpr std::size_t kFactCount = static_cast<std::size_t>(Fact::translation) + 1;
 
 }  // namespace wp

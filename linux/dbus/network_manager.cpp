@@ -128,6 +128,31 @@ std::vector<IPAddress> manualServers(const BusValue& settings) {
     return servers;
 }
 
+std::vector<IPAddress> networkManagerGlobalServers(Bus& bus, const Until& until) {
+    std::vector<IPAddress> servers;
+    const auto global = bus.property(kManager, kService, "GlobalDnsConfiguration", until);
+    if (!global) return servers;
+    for (const BusValue& each : (*global)["domains"]["*"]["servers"].list())
+        if (const auto address = IPAddress::fromText(each.text())) servers.push_back(*address);
+    return servers;
+}
+
+std::vector<IPAddress> networkManagerServersElsewhere(Bus& bus, const std::string& interfaceName,
+                                                      const Until& until) {
+    std::vector<IPAddress> servers, here;
+    const BusObject manager{kService, "/org/freedesktop/NetworkManager/DnsManager"};
+    const auto all = bus.property(manager, kService + ".DnsManager", "Configuration", until);
+    if (!all) return servers;
+    for (const BusValue& each : all->list())
+        for (const BusValue& text : each["nameservers"].list())
+            if (const auto address = IPAddress::fromText(text.text()))
+                (each["interface"].text() == interfaceName ? here : servers).push_back(*address);
+    std::erase_if(servers, [&](const IPAddress& each) {
+        return std::find(here.begin(), here.end(), each) != here.end();
+    });
+    return servers;
+}
+
 std::string proxyOf(const BusValue& settings) {
     const BusValue& proxy = settings["proxy"];
     // 1 is "auto": only with a script of its own is it the person's setting rather than the network's offer.

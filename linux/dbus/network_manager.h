@@ -30,6 +30,12 @@ std::string proxyOf(const BusValue& settings);
 /// The network of a connection's settings; absent for anything that is no network of this kind.
 std::optional<SavedNetwork> savedFromNetworkManager(const BusValue& settings);
 
+/// The name servers that a person set for all connections at once.
+std::vector<IPAddress> networkManagerGlobalServers(Bus& bus, const Until& until);
+/// The name servers that NetworkManager asks for the sake of other interfaces.
+std::vector<IPAddress> networkManagerServersElsewhere(Bus& bus, const std::string& interfaceName,
+                                                      const Until& until);
+
 /// All Wi-Fi networks that NetworkManager remembers. *Any* thread.
 Known<SavedNetworks> networkManagerNetworks(Bus& bus, const Until& until);
 

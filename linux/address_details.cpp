@@ -1,0 +1,78 @@
+#include "linux/address_details.h"
+
+#include <linux/if_addr.h>
+#include <linux/rtnetlink.h>
+
+#include "linux/netlink_socket.h"
+#include "linux/radio_socket.h"
+#include "linux/route_messages.h"
+
+namespace wp {
+namespace {
+
+constexpr std::uint32_t kForever = 0xFFFF'FFFF;
+// The attribute that says who made an address is younger than the system's headers: 1 loopback, 2 a router's
+// advertisement, 3 link-local.
+constexpr std::uint16_t kAddressOrigin = 11;
+constexpr std::uint8_t kMadeByAdvertisement = 2, kMadeAsLinkLocal = 3;
+
+bool lastsForever(const Attributes& attributes, std::uint32_t flags) {
+    const auto times = attributes.find(IFA_CACHEINFO);
+    ifa_cacheinfo info{};
+    if (times && times->size() >= sizeof info) std::memcpy(&info, times->data(), sizeof info);
+    return (flags & IFA_F_PERMANENT) != 0 && (!times || info.ifa_valid == kForever);
+}
+
+std::optional<AddressDetails> detailsOf(const ifaddrmsg& header, const Attributes& attributes) {
+    auto bytes = attributes.find(IFA_LOCAL);
+    if (!bytes) bytes = attributes.find(IFA_ADDRESS);
+    const auto address = bytes ? IPAddress::fromBytes(*bytes) : std::nullopt;
+    if (!address) return std::nullopt;
+    const std::uint32_t flags = attributes.number<std::uint32_t>(IFA_FLAGS).value_or(header.ifa_flags);
+    const std::uint8_t origin = attributes.number<std::uint8_t>(kAddressOrigin).value_or(0);
+    const bool kernelMade = origin == kMadeByAdvertisement || origin == kMadeAsLinkLocal;
+    return AddressDetails{{*address, lastsForever(attributes, flags), kernelMade}, header.ifa_prefixlen};
+}
+
+template <class Header>
+Known<std::vector<std::uint8_t>> dump(std::uint16_t type, const char* what, const Until& until) {
+    Known<NetlinkSocket> socket = NetlinkSocket::open(NETLINK_ROUTE);
+    if (!socket) return socket.error();
+    NetlinkRequest request(type, NLM_F_DUMP);
+    request.header<Header>() = {};  // of both families
+    NetlinkAnswer answer = socket->ask(request, until);
+    if (answer.error != 0) return failureOf(answer.error, what);
+    return std::move(answer.messages);
+}
+
+}  // namespace
+
+std::vector<AddressDetails> readAddressDetails(Bytes buffer, std::uint32_t interfaceIndex) {
+    std::vector<AddressDetails> all;
+    forEachContent(buffer, [&](const NetlinkMessage& message) {
+        ifaddrmsg header{};
+        if (message.type != RTM_NEWADDR || message.payload.size() < sizeof header) return;
+        std::memcpy(&header, message.payload.data(), sizeof header);
+        if (header.ifa_index != interfaceIndex) return;
+        if (auto details = detailsOf(header, message.attributesAfter(NLMSG_ALIGN(sizeof header))))
+            all.push_back(*details);
+    });
+    return all;
+}
+
+Known<std::vector<AddressDetails>> gatherAddressDetails(std::uint32_t interfaceIndex, const Until& until) {
+    const auto messages = dump<ifaddrmsg>(RTM_GETADDR, "addresses", until);
+    if (!messages) return messages.error();
+    return readAddressDetails(*messages, interfaceIndex);
+}
+
+Known<std::vector<IPAddress>> gatherGatewayAddresses(std::uint32_t interfaceIndex, const Until& until) {
+    const auto messages = dump<rtmsg>(RTM_GETROUTE, "routes", until);
+    if (!messages) return messages.error();
+    std::vector<IPAddress> gateways;
+    for (const Gateway& each : readGateways(*messages, interfaceIndex))
+        if (const auto address = IPAddress::fromBytes(each.bytes)) gateways.push_back(*address);
+    return gateways;
+}
+
+}  // namespace wp

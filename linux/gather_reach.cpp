@@ -1,0 +1,264 @@
+#include "linux/gather_reach.h"
+
+#include <algorithm>
+#include <ctime>
+#include <future>
+
+#include "linux/address_details.h"
+#include "linux/probe/name_lookup.h"
+#include "linux/probe/port_mapping.h"
+#include "linux/probe/portal_api.h"
+#include "linux/probe/ssdp_probe.h"
+#include "linux/probe/translation_probes.h"
+#include "linux/probe/web_client.h"
+
+namespace wp {
+namespace {
+
+using namespace std::chrono_literals;
+
+/// Once an answer is conclusive nothing else is waited for; what is not there after 3 s hardly comes within 5.
+constexpr auto kNameTime = 4s, kTranslationTime = 1s;
+
+Error notConfigured(const std::string& what) {
+    return failure(Reason::badConfiguration, "no endpoint is configured for " + what);
+}
+
+Error notJoined(const Link& link) {
+    return failure(Reason::notJoined, link.interfaceName + " is not joined to a network");
+}
+
+Gateway asTarget(const IPAddress& address) {
+    const Bytes bytes = address.bytes();
+    return {
+        address.isIPv4() ? Address::Family::ipv4 : Address::Family::ipv6, {bytes.begin(), bytes.end()}, 0};
+}
+
+/// A resolver on the device itself cannot be reached over the interface.
+NameServerSet serversOf(const Link& link, const LinkSetup& setup) {
+    const bool here =
+        std::ranges::any_of(setup.servers, [](const IPAddress& each) { return each.loopback(); });
+    return {setup.servers, here ? "" : link.interfaceName};
+}
+
+/// The addresses of a host, whose name may be an address itself.
+Known<std::vector<IPAddress>> addressesOf(const std::string& host, const Link& link, const LinkSetup& setup,
+                                          const Until& until) {
+    if (const auto address = IPAddress::fromText(host)) return std::vector<IPAddress>{*address};
+    const auto answer = lookUpName(host, serversOf(link, setup), until.within(kNameTime));
+    if (!answer) return answer.error();
+    return answer->addresses;
+}
+
+/// A request to a URL of the configuration, with the addresses of its host.
+Known<WebRequest> requestFor(const std::string& url, const Link& link, const LinkSetup& setup,
+                             const Endpoints& endpoints, const Until& until) {
+    const auto addresses = addressesOf(hostOf(url), link, setup, until);
+    if (!addresses) return addresses.error();
+    WebRequest request;
+    request.url = url;
+    request.interfaceName = link.interfaceName;
+    request.addresses = *addresses;
+    request.authorities = endpoints.certificateAuthorities;
+    return request;
+}
+
+PortalAnswer portalAnswer(const WebAnswer& answer, const WebRequest& request) {
+    PortalAnswer portal;
+    portal.end =
+        answer.end == WebAnswer::End::answered ? PortalAnswer::End::answered : PortalAnswer::End::noAnswer;
+    portal.status = answer.status;
+    portal.bodySize = answer.body.size();
+    portal.location = answer.location;
+    portal.server = answer.server;
+    if (!portal.server && !request.addresses.empty()) portal.server = request.addresses.front();
+    portal.why = answer.why;
+    return portal;
+}
+
+/// What the network declares. An API is believed only over a secure connection.
+Known<PortalDeclaration> askPortalApi(const Link& link, const LinkSetup& setup, const Endpoints& endpoints,
+                                      const Until& until) {
+    PortalDeclaration declaration;
+    declaration.unrestricted = meansNoPortal(setup.portalApi);
+    if (!setup.portalApi.starts_with("https://")) return declaration;
+    auto request = requestFor(setup.portalApi, link, setup, endpoints, until);
+    if (!request) return request.error();
+    request->headers = {"Accept: application/captive+json"};
+    request->longestBody = kLongestPortalAnswer;
+    const auto answers = runWebRequests({*request}, until);
+    if (!answers) return answers.error();
+    const WebAnswer& answer = answers->front();
+    if (answer.end == WebAnswer::End::answered && answer.status == 200)
+        declaration.captive = captiveFromApi(answer.body);
+    return declaration;
+}
+
+/// An open, redirecting or refusing plain answer decides alone; an empty page needs the other.
+bool decides(const std::optional<WebAnswer>& plain) {
+    if (!plain || plain->end != WebAnswer::End::answered) return false;
+    return plain->status == 204 || plain->status == 511 || (plain->status >= 300 && plain->status <= 399) ||
+           (plain->status == 200 && plain->body.size() > 1);
+}
+
+ServiceContact contactOf(const WebAnswer& answer) {
+    ServiceContact contact;
+    contact.why = answer.why;
+    contact.status = answer.status;
+    contact.body = answer.body;
+    switch (answer.end) {
+        case WebAnswer::End::answered:
+            contact.end = ServiceContact::End::reached;
+            break;
+        case WebAnswer::End::badCertificate:
+            contact.end = ServiceContact::End::badCertificate;
+            break;
+        case WebAnswer::End::failed:
+            contact.end = ServiceContact::End::failed;
+            break;
+    }
+    return contact;
+}
+
+/// The day on which the compiler saw this file, in seconds since 1970; the clock of a device that was without
+/// power is far before it.
+std::time_t buildDay() {
+    std::tm day{};
+    // "Nov 20 2026"
+    return ::strptime(__DATE__, "%b %d %Y", &day) != nullptr ? ::timegm(&day) : 0;
+}
+
+Known<ServiceContact> contact(const std::string& url, bool connectOnly, const Link& link,
+                              const LinkSetup& setup, const Endpoints& endpoints, const Until& until) {
+    if (url.empty() || url == "https://") return notConfigured("the vendor's service");
+    auto request = requestFor(url, link, setup, endpoints, until);
+    if (!request) return request.error();
+    request->connectOnly = connectOnly;
+    const auto answers = runWebRequests({*request}, until);
+    if (!answers) return answers.error();
+    return contactOf(answers->front());
+}
+
+/// Runs the function on a thread of its own.
+template <class Function>
+auto beside(Function function) {
+    return std::async(std::launch::async, std::move(function));
+}
+
+template <class T>
+std::optional<T> optionalOf(const Known<T>& known) {
+    return known ? std::optional<T>(*known) : std::nullopt;
+}
+
+Known<IPAddress> askStun(const Link& link, const LinkSetup& setup, const Endpoints& endpoints,
+                         const Until& until) {
+    const auto server = hostAndPort(endpoints.stun);
+    if (!server) return notConfigured("STUN");
+    const auto addresses = addressesOf(server->host, link, setup, until);
+    if (!addresses) return addresses.error();
+    for (const IPAddress& each : *addresses)
+        if (each.isIPv4()) return askMappedAddress(each, server->port, link.interfaceName, until);
+    return failure(Reason::unavailable, "the STUN server has no IPv4 address");
+}
+
+}  // namespace
+
+Known<Echo> gatherOutsideEcho(const Link& link, const Endpoints& endpoints, EchoSocket& socket,
+                              const Until& until) {
+    if (!link.joined) return notJoined(link);
+    const auto gateways = gatherGatewayAddresses(link.interfaceIndex, until);
+    if (!gateways) return gateways.error();
+    if (gateways->empty()) return failure(Reason::notJoined, link.interfaceName + " has no default route");
+    for (const bool ipv4 : {true, false}) {
+        const auto target = IPAddress::fromText(ipv4 ? endpoints.pingIPv4 : endpoints.pingIPv6);
+        const bool hasRoute =
+            std::ranges::any_of(*gateways, [ipv4](const IPAddress& each) { return each.isIPv4() == ipv4; });
+        if (target && hasRoute)
+            return socket.ask(asTarget(*target), link.interfaceName, link.interfaceIndex, until);
+    }
+    return notConfigured("the ping beyond the router");
+}
+
+Known<NameAnswer> gatherNameAnswer(const Link& link, const LinkSetup& setup, const Endpoints& endpoints,
+                                   const Until& until) {
+    if (!link.joined) return notJoined(link);
+    if (endpoints.nameWildcard.empty() && endpoints.name.empty()) return notConfigured("names");
+    const std::string name =
+        endpoints.nameWildcard.empty() ? endpoints.name : freshName(endpoints.nameWildcard);
+    return lookUpName(name, serversOf(link, setup), until.within(kNameTime));
+}
+
+Known<PortalEvidence> gatherPortal(const Link& link, const LinkSetup& setup, const Endpoints& endpoints,
+                                   const Until& until) {
+    if (!link.joined) return notJoined(link);
+    auto api = beside([&] { return askPortalApi(link, setup, endpoints, until); });
+    const std::string &plainUrl = endpoints.portalPlain, &secureUrl = endpoints.portalSecure;
+    auto secureRequest = beside([&] { return requestFor(secureUrl, link, setup, endpoints, until); });
+    const auto plain = requestFor(plainUrl, link, setup, endpoints, until);
+    const auto secure = secureRequest.get();
+    Known<std::vector<WebAnswer>> answers = failure(Reason::cancelled, "cancelled");
+    if (plain && secure)
+        answers = runWebRequests({*plain, *secure}, until, [](const auto& all) { return decides(all[0]); });
+    const auto declared = api.get();
+    if (!answers) return answers.error();
+    if (!declared) return declared.error();
+    if (plainUrl.empty() && !declared->captive) return notConfigured("the captive portal's probe");
+    return PortalEvidence{*declared, portalAnswer((*answers)[0], *plain),
+                          portalAnswer((*answers)[1], *secure)};
+}
+
+Known<VendorContacts> gatherVendorService(const Link& link, const LinkSetup& setup,
+                                          const Endpoints& endpoints, const Until& until) {
+    if (!link.joined) return notJoined(link);
+    auto retrieve =
+        beside([&] { return contact(endpoints.vendorUrl, false, link, setup, endpoints, until); });
+    VendorContacts contacts;
+    contacts.reach = contact("https://" + endpoints.vendorHost, true, link, setup, endpoints, until);
+    contacts.retrieve = retrieve.get();
+    contacts.clock.beforeBuild = std::time(nullptr) < buildDay();
+    return contacts;
+}
+
+Known<RouterAnswers> gatherRouter(const Link& link, const Until& until) {
+    if (!link.joined) return notJoined(link);
+    const auto gateways = gatherGatewayAddresses(link.interfaceIndex, until);
+    if (!gateways) return gateways.error();
+    if (gateways->empty() || !gateways->front().isIPv4())
+        return failure(Reason::notJoined, link.interfaceName + " has no default route for IPv4");
+    return askRouter({gateways->front(), link.interfaceName}, until);
+}
+
+Known<TranslationEvidence> gatherTranslation(const Link& link, const LinkSetup& setup,
+                                             const std::optional<IPAddress>& toldByRouter,
+                                             const Endpoints& endpoints, const Until& until) {
+    if (!link.joined) return notJoined(link);
+    const auto details = gatherAddressDetails(link.interfaceIndex, until);
+    if (!details) return details.error();
+    const auto gateways = gatherGatewayAddresses(link.interfaceIndex, until);
+    if (!gateways) return gateways.error();
+    TranslationEvidence evidence;
+    for (const AddressDetails& each : *details)
+        if (each.assigned.address.isIPv4() && !each.assigned.address.linkLocal())
+            evidence.own.push_back({each.assigned.address, each.prefixLength});
+    if (evidence.own.empty()) return failure(Reason::notJoined, link.interfaceName + " has no IPv4 address");
+    const auto router = std::ranges::find_if(*gateways, &IPAddress::isIPv4);
+    if (router == gateways->end()) return failure(Reason::notJoined, "there is no default route for IPv4");
+
+    const Until each = until.within(kTranslationTime);
+    auto external = beside([&] {
+        return askExternalAddress(*router, kPortMappingPort, evidence.own.front().address, link.interfaceName,
+                                  each);
+    });
+    auto mapped = beside([&] { return askStun(link, setup, endpoints, each); });
+    const auto target = IPAddress::fromText(endpoints.pingIPv4);
+    const auto hops = target ? listHops(*target, link.interfaceName, each)
+                             : Known<std::vector<std::optional<IPAddress>>>(notConfigured("the way out"));
+    evidence.mapped = optionalOf(mapped.get());
+    evidence.gatewayExternal = optionalOf(external.get());
+    if (!evidence.gatewayExternal) evidence.gatewayExternal = toldByRouter;
+    if (hops) evidence.hops = *hops;
+    if (until.stop->raised()) return waitFailure(Wait::stopped, "the way out");
+    return evidence;
+}
+
+}  // namespace wp

@@ -1,0 +1,253 @@
+#include "linux/gather_setup.h"
+
+#include <algorithm>
+#include <cstdlib>
+#include <ctime>
+#include <filesystem>
+
+#include "linux/address_details.h"
+#include "linux/dbus/bluez.h"
+#include "linux/dbus/iwd.h"
+#include "linux/dbus/network_manager.h"
+#include "linux/dbus/resolved.h"
+#include "linux/dbus/supplicant.h"
+#include "linux/files/dhcp_clients.h"
+#include "linux/files/leases.h"
+#include "linux/files/networkd.h"
+#include "linux/files/proxy_settings.h"
+#include "linux/probe/portal_api.h"
+#include "linux/radio_socket.h"
+#include "service/plain_text.h"
+
+namespace wp {
+namespace {
+
+using Servers = std::vector<IPAddress>;
+
+void add(Servers& servers, const Servers& more) {
+    for (const IPAddress& each : more)
+        if (std::ranges::find(servers, each) == servers.end()) servers.push_back(each);
+}
+
+Servers without(Servers servers, const Servers& others) {
+    std::erase_if(servers,
+                  [&](const IPAddress& each) { return std::ranges::find(others, each) != others.end(); });
+    return servers;
+}
+
+bool areHidden(const Servers& servers) {
+    return std::ranges::any_of(servers, [](const IPAddress& each) { return each.loopback(); });
+}
+
+Servers fromWords(const std::string& words) {
+    Servers servers;
+    std::string spaced = words;
+    std::ranges::replace(spaced, ',', ' ');
+    for (const std::string& word : wordsOf(spaced))
+        if (const auto address = IPAddress::fromText(word)) servers.push_back(*address);
+    return servers;
+}
+
+const std::string& optionOf(const std::map<std::string, std::string>& lease, const char* name) {
+    static const std::string kNone;
+    const auto found = lease.find(name);
+    return found == lease.end() ? kNone : found->second;
+}
+
+/// The servers of the resolver's file; in place of a resolver on the device those that it asks for the link.
+Servers effectiveServers(Known<Bus>& bus, const Link& link, const Servers& ofManager, const Until& until) {
+    const auto file = readSmallFile("/etc/resolv.conf");
+    Servers servers = file ? serversFromResolverFile(*file) : Servers();
+    if (!areHidden(servers) || !bus) return servers;
+    const auto asked = resolvedServers(*bus, link.interfaceIndex, until);
+    if (!asked && ofManager.empty()) return servers;
+    std::erase_if(servers, [](const IPAddress& each) { return each.loopback(); });
+    add(servers, asked ? *asked : ofManager);
+    return servers;
+}
+
+Known<std::string> methodOf(const BusValue& settings, const char* family) {
+    const std::string method = settings[family]["method"].text();
+    if (!method.empty()) return method;
+    return failure(Reason::notJoined, "NetworkManager has no active connection on the interface");
+}
+
+LinkSetup setupFromNetworkManager(Known<Bus>& bus, const Link& link, const NetworkManagerLink& managed,
+                                  const Until& until) {
+    LinkSetup setup;
+    setup.methods = {methodOf(managed.settings, "ipv4"), methodOf(managed.settings, "ipv6")};
+    NameServers names;
+    names.manual = manualServers(managed.settings);
+    add(names.manual, networkManagerGlobalServers(*bus, until));
+    names.offerKnown = true;
+    names.offered = fromWords(optionOf(managed.lease4, "domain_name_servers"));
+    add(names.offered, fromWords(optionOf(managed.lease6, "dhcp6_name_servers")));
+    // What stands in the settings of IPv6 and was not entered came with a router's advertisement.
+    for (const IPAddress& each : without(managed.servers, names.manual))
+        if (!each.isIPv4()) names.offered.push_back(each);
+    // Another interface's servers are no setting of this one.
+    names.effective = without(effectiveServers(bus, link, managed.servers, until),
+                              networkManagerServersElsewhere(*bus, link.interfaceName, until));
+    setup.servers = managed.servers;
+    setup.nameServers = std::move(names);
+    setup.portalApi = portalApiIn(managed.lease4);
+    if (setup.portalApi.empty()) setup.portalApi = portalApiIn(managed.lease6);
+    setup.leaseText = plainText(optionOf(managed.lease4, "vendor_encapsulated_options") + " " +
+                                optionOf(managed.lease4, "vendor_class_identifier"));
+    return setup;
+}
+
+LinkSetup setupFromNetworkd(Known<Bus>& bus, const Link& link, const NetworkdLink& managed,
+                            const Until& until) {
+    LinkSetup setup;
+    setup.methods = managed.methods;
+    NameServers names{managed.manualServers, {}, managed.offeredServers, true};
+    Servers own = managed.manualServers;
+    add(own, managed.offeredServers);
+    names.effective = effectiveServers(bus, link, own, until);
+    // Servers of a router's advertisement stand nowhere but in the list that is asked.
+    if (*managed.methods.ipv6 == "auto")
+        for (const IPAddress& each : names.effective)
+            if (!each.isIPv4()) names.offered.push_back(each);
+    setup.servers = own.empty() ? names.effective : own;
+    setup.nameServers = std::move(names);
+    setup.portalApi = managed.portalApi;
+    setup.leaseText = managed.vendorText;
+    return setup;
+}
+
+KernelIPv6 kernelSwitches(const std::string& interfaceName) {
+    const auto number = [&](const char* name) {
+        const auto text = readSmallFile("/proc/sys/net/ipv6/conf/" + interfaceName + "/" + name, 64);
+        return text ? std::atoi(text->c_str()) : -1;
+    };
+    // Without the folder the kernel has no IPv6 at all.
+    return {number("disable_ipv6") != 0, number("accept_ra") > 0};
+}
+
+Known<LinkSetup> setupFromKernel(Known<Bus>& bus, const Link& link, const Until& until) {
+    const auto details = gatherAddressDetails(link.interfaceIndex, until);
+    if (!details) return details.error();
+    std::vector<AssignedAddress> assigned;
+    for (const AddressDetails& each : *details) assigned.push_back(each.assigned);
+    const auto lease = findLease(link.interfaceName, std::time(nullptr));
+    const bool client = lease || dhcpClientRuns(link.interfaceName);
+    LinkSetup setup;
+    setup.methods = {methodFromIPv4Addresses(assigned, client),
+                     methodFromIPv6Addresses(assigned, kernelSwitches(link.interfaceName))};
+    NameServers names;
+    names.offerKnown = lease.has_value();
+    if (lease) names.offered = lease->servers;
+    names.effective = effectiveServers(bus, link, {}, until);
+    setup.servers = lease && !lease->servers.empty() ? lease->servers : names.effective;
+    setup.nameServers = std::move(names);
+    if (lease) {
+        setup.portalApi = lease->portalApi;
+        setup.leaseText = lease->vendorText;
+    }
+    return setup;
+}
+
+WebProxyPlaces allProxies(const BusValue& settings) {
+    WebProxyPlaces places = findProxies([](const char* name) -> const char* { return std::getenv(name); });
+    const std::string ofProfile = proxyOf(settings);
+    if (!ofProfile.empty()) places.push_back(ofProfile);
+    return places;
+}
+
+bool isStopped(const Error& error) {
+    return error.code == static_cast<int>(Reason::cancelled);
+}
+
+std::optional<std::string> driverOf(const Link& link, const std::string& root) {
+    std::error_code failed;
+    const auto target = std::filesystem::read_symlink(
+        root + "/sys/class/net/" + link.interfaceName + "/device/driver", failed);
+    if (failed) return std::nullopt;
+    return target.filename().string();
+}
+
+/// The parameter of a driver's module that says whether airtime is shared.
+struct Switch {
+    const char* driver;
+    const char* parameter;
+};
+// Of the drivers that have one that can be read without privileges (kernel documentation of ath9k and iwlwifi).
+constexpr Switch kSwitches[] = {
+    {"iwlwifi", "iwlwifi/parameters/bt_coex_active"},
+    {"ath9k", "ath9k/parameters/btcoex_enable"},
+};
+
+bool isPeerLink(std::uint32_t type) {
+    constexpr std::uint32_t kClient = 8, kOwner = 9, kAwareness = 12;  // nl80211_iftype
+    return type == kClient || type == kOwner || type == kAwareness;
+}
+
+}  // namespace
+
+Known<LinkSetup> gatherSetup(const Link& link, const Until& until) {
+    Known<Bus> bus = Bus::system();
+    Known<NetworkManagerLink> managed =
+        bus ? readNetworkManagerLink(*bus, link.interfaceName, until) : bus.error();
+    if (!managed && isStopped(managed.error())) return managed.error();
+    Known<LinkSetup> setup;
+    if (managed) {
+        setup = setupFromNetworkManager(bus, link, *managed, until);
+    } else if (const auto networkd = readNetworkdLink(link.interfaceIndex)) {
+        setup = setupFromNetworkd(bus, link, *networkd, until);
+    } else {
+        setup = setupFromKernel(bus, link, until);
+    }
+    if (!setup) return setup;
+    setup->proxies = allProxies(managed ? managed->settings : BusValue());
+    return setup;
+}
+
+Known<SavedNetworks> gatherSaved(const Link& link, const Until& until) {
+    Known<Bus> bus = Bus::system();
+    if (!bus) return bus.error();
+    const auto managed = readNetworkManagerLink(*bus, link.interfaceName, until);
+    if (managed) return networkManagerNetworks(*bus, until);
+    if (isStopped(managed.error())) return managed.error();
+    const auto objects = iwdObjects(*bus, until);
+    if (objects && !iwdDevice(*objects, link.interfaceName).empty()) return iwdNetworks(*objects);
+    const auto interface = supplicantInterface(*bus, link.interfaceName, until);
+    if (interface) return supplicantNetworks(*bus, *interface, until);
+    if (isStopped(interface.error()) || interface.error().code == static_cast<int>(Reason::notPermitted))
+        return interface.error();
+    return failure(Reason::unavailable,
+                   "no connection manager on the message bus keeps networks for " + link.interfaceName);
+}
+
+Known<Bluetooth> gatherBluetooth(const Until& until) {
+    Known<Bus> bus = Bus::system();
+    return readBluetooth(bus, bluetoothControllerExists(), until);
+}
+
+Known<bool> gatherAirtimeSharing(const Link& link, const std::string& root) {
+    const auto driver = driverOf(link, root);
+    for (const Switch& each : kSwitches) {
+        if (driver != each.driver) continue;
+        const auto text = readSmallFile(root + "/sys/module/" + each.parameter, 64);
+        if (text && !text->empty()) return text->front() == 'Y' || text->front() == '1';
+    }
+    return failure(Reason::unsupported, "the driver " + driver.value_or("(unknown)") +
+                                            " does not tell whether it shares airtime with Bluetooth");
+}
+
+Known<PeerLinks> gatherPeerLinks(const Link& link, const std::string& indicator, const Until& until) {
+    Known<RadioSocket> radio = RadioSocket::open(until);
+    if (!radio) return radio.error();
+    const auto interfaces = radio->interfaces(until);
+    if (!interfaces) return interfaces.error();
+    PeerLinks links;
+    links.stationFrequency = link.joined ? link.joined->frequency : 0;
+    for (const RadioInterface& each : *interfaces)
+        if (each.radio == link.radio && isPeerLink(each.type))
+            links.links.push_back({each.name, each.frequency.value_or(0)});
+    const auto text = indicator.empty() ? std::nullopt : readSmallFile(indicator, 64);
+    if (text) links.indicated = text->starts_with("1");
+    return links;
+}
+
+}  // namespace wp

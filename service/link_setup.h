@@ -1,0 +1,38 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "service/address_configuration.h"
+#include "service/captive_portal.h"
+#include "service/double_translation.h"
+#include "service/maker.h"
+#include "service/reachability.h"
+
+namespace wp {
+
+/// How the interface is set up, by its connection manager, else by what the kernel and the files of the system
+/// give away.
+struct LinkSetup {
+    AddressMethods methods;
+    Known<NameServers> nameServers;
+    Known<WebProxyPlaces> proxies;
+    std::vector<IPAddress> servers;  ///< whom to ask for names over this interface
+    std::string portalApi;           ///< what the lease names; empty where it names none
+    std::string leaseText;           ///< the vendor's text in the lease
+};
+
+/// What the router says of itself on the local network.
+struct RouterAnswers {
+    RouterDescription description;
+    std::optional<IPAddress> external;  ///< its outer address
+};
+
+/// What became of the two requests to the vendor's service.
+struct VendorContacts {
+    Known<ServiceContact> reach;
+    Known<ServiceContact> retrieve;
+    ClockCheck clock;
+};
+
+}  // namespace wp

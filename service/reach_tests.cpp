@@ -1,0 +1,94 @@
+#include "service/reach_tests.h"
+
+#include <algorithm>
+
+#include "service/connectivity_tests.h"
+#include "service/judged.h"
+
+namespace wp {
+namespace {
+
+const AccessPoint* joined(const Facts& facts) {
+    return facts.link && facts.link->joined ? &*facts.link->joined : nullptr;
+}
+
+AirFacts airOf(const Facts& facts) {
+    return {facts.nearby, facts.airtime, facts.allowedChannels};
+}
+
+/// Whether the scan heard the name from more than one access point.
+bool heardFromSeveral(const Facts& facts, const NetworkName& name) {
+    if (!facts.nearby || name.absent()) return false;
+    return std::ranges::count_if(*facts.nearby,
+                                 [&](const AccessPoint& each) { return each.says.name == name; }) > 1;
+}
+
+}  // namespace
+
+Outcome outsideAnswers(const Facts& facts) {
+    if (!facts.outsideEcho) return facts.outsideEcho.error();
+    const bool answered =
+        std::ranges::any_of(facts.outsideEcho->roundTrips, [](const auto& time) { return time.has_value(); });
+    return works(answered,
+                 {{"PingResult", std::make_shared<PingStatistics>(statisticsOf(*facts.outsideEcho))}});
+}
+
+Outcome namesResolve(const Facts& facts) {
+    return resolvesNames(facts.nameAnswer);
+}
+
+Outcome isTranslatedTwice(const Facts& facts) {
+    return hasDoubleTranslation(facts.translation);
+}
+
+Outcome vendorIsReached(const Facts& facts) {
+    if (!facts.vendorService) return facts.vendorService.error();
+    return reachesVendor(facts.vendorService->reach, facts.vendorService->clock);
+}
+
+Outcome vendorContentArrives(const Facts& facts) {
+    if (!facts.vendorService) return facts.vendorService.error();
+    return retrievesFromVendor(facts.vendorService->retrieve, facts.settings.vendorContent,
+                               facts.vendorService->clock);
+}
+
+Outcome channelIsFull(const Facts& facts) {
+    const auto judged = judgedAccessPoint(facts);
+    if (!judged) return judged.error();
+    return channelIsCongested(**judged, airOf(facts), joined(facts), facts.settings.thresholds.congestion);
+}
+
+Outcome band2IsFull(const Facts& facts) {
+    return band2IsCongested(airOf(facts), joined(facts), facts.settings.thresholds.congestion);
+}
+
+Outcome band5IsFull(const Facts& facts) {
+    return band5IsCongested(airOf(facts), joined(facts), facts.settings.thresholds.congestion);
+}
+
+Outcome isVendorsBaseStation(const Facts& facts) {
+    const auto judged = judgedAccessPoint(facts);
+    if (!judged) return judged.error();
+    std::optional<RouterDescription> router;
+    if (!facts.named && facts.router) router = facts.router->description;
+    return isVendorBaseStation(**judged, router, facts.settings.vendors.baseStation);
+}
+
+Outcome isVendorsHotspot(const Facts& facts) {
+    const auto judged = judgedAccessPoint(facts);
+    if (!judged) return judged.error();
+    const std::string leaseText = !facts.named && facts.setup ? facts.setup->leaseText : std::string();
+    return isVendorHotspot(**judged, leaseText, facts.settings.vendors.hotspot);
+}
+
+Outcome hasPortal(const Facts& facts) {
+    if (facts.named)
+        return isRememberedAsCaptive(facts.saved, *facts.named, heardFromSeveral(facts, *facts.named));
+    const AccessPoint* own = joined(facts);
+    if (facts.link && own == nullptr)
+        return failure(Reason::notJoined, facts.link->interfaceName + " is not joined to a network");
+    if (!facts.link) return facts.link.error();
+    return isCaptive(facts.portal, facts.saved, own->says.name, heardFromSeveral(facts, own->says.name));
+}
+
+}  // namespace wp
