@@ -96,7 +96,7 @@ ip addr replace "$ip/$mask" dev "$interface"
 [ -z "$dns" ] || { rm -f /etc/resolv.conf; for d in $dns; do echo "nameserver $d"; done > /etc/resolv.conf; }
 S
     chmod +x "$dir/udhcpc"
-    busybox udhcpc -i "$1" -n -q -t 5 -s "$dir/udhcpc" > "$dir/udhcpc.log" 2>&1
+    busybox udhcpc -i "$1" -n -t 5 -s "$dir/udhcpc" > "$dir/udhcpc.log" 2>&1
 }
 
 # scan X [iw scan arguments]: a fresh scan, retried while the radio is busy.
@@ -150,4 +150,41 @@ class Portal(http.server.BaseHTTPRequestHandler):
 http.server.ThreadingHTTPServer((host, 80), Portal).serve_forever()
 P
     wait_for 10 in_ap "$1" busybox wget -q -O /dev/null "http://$addr/login"
+}
+
+# no_internet X: nothing lies beyond access point X; without it a scenario has an `internet` there.
+no_internet() { :; }
+
+# internet X [behaviours]: what the tests contact lies beyond access point X, see the head of `internet`; every name
+# leads there (for an access point with an address). The program's configuration names it.
+internet() {
+    local dev=$1 there=203.0.113.10 dir=/run/lab; shift
+    mkdir -p $dir/$dev
+    [ -s $dir/ca.pem ] || openssl req -x509 -newkey ec -pkeyopt ec_paramgen_curve:P-256 -nodes -subj /CN=lab -days 3650 \
+        -addext 'subjectAltName=DNS:portal.example,DNS:vendor.example,DNS:api.example' \
+        -keyout $dir/key.pem -out $dir/ca.pem 2> /dev/null
+    in_ap "$dev" ip addr add $there/32 dev lo 2> /dev/null
+    names_lead "$dev" $there
+    # A home's one translation, unless the behaviours say something else.
+    [ $# -gt 0 ] || set -- nat=203.0.113.77 mapped=203.0.113.77
+    : > "$dir/$dev/internet.log"
+    in_ap "$dev" "$LAB_DIR/internet" $there $dir/ca.pem $dir/key.pem "$@" > "$dir/$dev/internet.log" 2>&1 &
+    wait_for 20 grep -q ready "$dir/$dev/internet.log" || { cat "$dir/$dev/internet.log"; return 1; }
+    mkdir -p /etc/wifi-profile
+    cat > /etc/wifi-profile/config.json <<C
+{"endpoints": {"pingIPv4": "$there", "pingIPv6": "2001:db8:1::1", "name": "host.example",
+  "portalPlain": "http://portal.example/204", "portalSecure": "https://portal.example/204",
+  "vendorHost": "vendor.example:443", "vendorUrl": "https://vendor.example/vendor", "stun": "$there:3478",
+  "certificateAuthorities": "$dir/ca.pem"}}
+C
+}
+
+# names_lead X ADDRESS: DNS on access point X answers that address for every name from now on.
+names_lead() {
+    local dir=/run/lab/$1
+    kill "$(cat "$dir/dnsmasq.pid")"; wait_for 5 test ! -e "$dir/dnsmasq.pid"
+    local net; net=$(ip -n "ap-$1" -4 -o addr show dev "$1" | sed 's,.*inet \([0-9.]*\)\.[0-9]*/.*,\1,')
+    in_ap "$1" dnsmasq --interface="$1" --bind-interfaces --no-resolv --no-hosts --conf-file=/dev/null \
+        --dhcp-range="$net.50,$net.99,1h" --dhcp-leasefile="$dir/leases" --address="/#/$2" \
+        --pid-file="$dir/dnsmasq.pid" --log-facility="$dir/dnsmasq.log" --user=root "${@:3}"
 }

@@ -9,10 +9,17 @@ def _here_document(lines: list[str]) -> str:
     return "<<'LINES'\n" + "\n".join(lines) + "\nLINES\n"
 
 
-def _ap(arguments: list[str], lines: list[str]) -> str:
+def _ap(scenario: Scenario, arguments: list[str], lines: list[str]) -> str:
     device = arguments[0]
     address = arguments[1] if len(arguments) > 1 else "-"
-    return f"ap {device} {address} {_here_document(lines)}"
+    text = f"ap {device} {address} {_here_document(lines)}"
+    return text if address == "-" or _says_what_lies_beyond(scenario, device) else text + f"internet {device}\n"
+
+
+def _says_what_lies_beyond(scenario: Scenario, device: str) -> bool:
+    """Whether the set-up calls `internet` or `no_internet` itself."""
+    steps = (line.split() for _, _, lines in scenario.steps for line in lines)
+    return any(words[:2] in (["internet", device], ["no_internet", device]) for words in steps)
 
 
 def _station(scenario: Scenario, arguments: list[str], lines: list[str]) -> str:
@@ -32,7 +39,7 @@ def set_up(scenario: Scenario) -> str:
     text += f"country {scenario.headers.get('country', 'US')}\n" if scenario.radios() else ""
     for kind, arguments, lines in scenario.steps:
         if kind == "ap":
-            text += _ap(arguments, lines)
+            text += _ap(scenario, arguments, lines)
         elif kind == "station":
             text += _station(scenario, arguments, lines)
         else:

@@ -176,7 +176,9 @@ TEST(DeviceDescription, LooksNoEntityUpAndStopsAtWhatIsNotWellFormed) {
               "");
     EXPECT_EQ(manufacturer("<r><manufacturer>A</b></manufacturer></r>"), "");
     EXPECT_EQ(manufacturer("<r><manufacturer>A</manufacturer>"), "A");
-    EXPECT_EQ(manufacturer(std::string(kLongestXml, ' ') + "<r><manufacturer>A</manufacturer></r>"), "");
+    std::string tooLong = "<r><manufacturer>A</manufacturer></r>";
+    tooLong.resize(kLongestXml + 1, ' ');
+    EXPECT_EQ(manufacturer(tooLong), "");
     std::string deep;
     for (std::size_t i = 0; i < kDeepestXml; ++i) deep += "<d>";
     EXPECT_EQ(manufacturer(deep + "<manufacturer>A</manufacturer>"), "");
