@@ -24,7 +24,9 @@ Configuration readObject(const Value& json) {
         configuration.capabilities = readCapabilities(*capabilities, Place(top, "capabilities"));
     for (const char* section : {"endpoints", "vendors", "thresholds"}) {
         const Value* value = reader.find(section);
-        if (value && !value->as<DictionaryPointer>()) Place(top, section).refuse("must be an object");
+        if (!value) continue;
+        if (!value->as<DictionaryPointer>()) Place(top, section).refuse("must be an object");
+        configuration.concernsService = true;
     }
     reader.finish();
     return configuration;
@@ -37,9 +39,7 @@ Configuration readConfiguration(const std::string& file) {
     std::variant<Value, Refusal> json = readJSON(readFile("--config", file));
     if (const Refusal* refusal = std::get_if<Refusal>(&json)) refuse(place + refusal->text());
     try {
-        Configuration configuration = readObject(std::get<Value>(json));
-        configuration.file = file;
-        return configuration;
+        return readObject(std::get<Value>(json));
     } catch (const Refused& refused) {
         refuse(place + refused.what());
     }

@@ -1,7 +1,6 @@
 #pragma once
 
 #include <map>
-#include <optional>
 #include <string>
 
 #include "platform/capabilities.h"
@@ -10,7 +9,7 @@ namespace wp::host {
 
 /// What the host itself takes from the configuration file; the rest of it is the service's.
 struct Configuration {
-    std::optional<std::string> file;  ///< handed on to the service
+    bool concernsService = false;  ///< whether the service must be handed the file
     std::map<std::string, bool, std::less<>> capabilities;
 };
 

@@ -34,7 +34,7 @@ class ReplayServices final : public Services {
     bool isAutomated_;
 };
 
-LiveServiceOptions liveOptions(const RunOptions& options, DiagnosticsLog& log) {
+LiveServiceOptions liveOptions(const RunOptions& options, const Preparation& prepared, DiagnosticsLog& log) {
     LiveServiceOptions live;
     live.program = serviceProgram();
     if (options.interfaceName) live.arguments = {"--interface", *options.interfaceName};
@@ -46,7 +46,7 @@ LiveServiceOptions liveOptions(const RunOptions& options, DiagnosticsLog& log) {
 class LiveServices final : public Services {
   public:
     LiveServices(const RunOptions& options, const Preparation& prepared, DiagnosticsLog& log)
-        : service_(liveOptions(options, log)), capabilities_(prepared.configuration.capabilities) {}
+        : service_(liveOptions(options, prepared, log)), capabilities_(prepared.configuration.capabilities) {}
 
     DiagnosticsClient& diagnosticsClient() override { return service_.diagnostics(); }
     WiFiManagerService& wifiManager() override { return service_.wifi(); }
