@@ -38,7 +38,8 @@ LiveServiceOptions liveOptions(const RunOptions& options, const Preparation& pre
     LiveServiceOptions live;
     live.program = serviceProgram();
     if (options.interfaceName) live.arguments = {"--interface", *options.interfaceName};
-    if (options.configFile) live.arguments.insert(live.arguments.end(), {"--config", *options.configFile});
+    if (prepared.configuration.concernsService)
+        live.arguments.insert(live.arguments.end(), {"--config", *options.configFile});
     live.note = [&log](std::string_view text) { log.note(text); };
     return live;
 }
