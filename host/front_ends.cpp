@@ -20,18 +20,23 @@ class NoScreen final : public ui::FrontEnd {
     MainQueue& queue_;
 };
 
-std::unique_ptr<ui::FrontEnd> makeTerminal(ui::Screen& screen, MainQueue& queue) {
-    terminal::TerminalScreen::Opened opened = terminal::TerminalScreen::open(screen, queue);
+std::unique_ptr<ui::FrontEnd> makeTerminal(ui::Screen& screen, MainQueue& queue,
+                                           const Localization& localization) {
+    terminal::Texts texts{
+        localization.localizedString("KEY_MOVE"), localization.localizedString("KEY_SELECT"),
+        localization.localizedString("KEY_BACK"), localization.localizedString("WINDOW_TOO_SMALL")};
+    terminal::TerminalScreen::Opened opened = terminal::TerminalScreen::open(screen, queue, std::move(texts));
     if (const std::string* why = std::get_if<std::string>(&opened)) refuse("--screen: terminal: " + *why);
     return std::get<std::unique_ptr<terminal::TerminalScreen>>(std::move(opened));
 }
 
 }  // namespace
 
-std::unique_ptr<ui::FrontEnd> makeFrontEnd(ScreenChoice choice, ui::Screen& screen, MainQueue& queue) {
+std::unique_ptr<ui::FrontEnd> makeFrontEnd(ScreenChoice choice, ui::Screen& screen, MainQueue& queue,
+                                           const Localization& localization) {
     switch (choice) {
         case ScreenChoice::terminal:
-            return makeTerminal(screen, queue);
+            return makeTerminal(screen, queue, localization);
         case ScreenChoice::headless:
             return std::make_unique<headless::HeadlessScreen>(screen, queue);
         default:

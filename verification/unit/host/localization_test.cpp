@@ -28,6 +28,10 @@ const std::set<std::string> kKeys = {
     "SELECTED_NETWORK",
     "OTHER_NETWORK_PLACEHOLDER",
     "WLAN_DIAGNOSTICS",
+    "KEY_MOVE",
+    "KEY_SELECT",
+    "KEY_BACK",
+    "WINDOW_TOO_SMALL",
     "WIFI_DIAGNOSTICS",
     "WIFI_DESCRIPTION",
 };
