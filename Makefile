@@ -5,7 +5,9 @@ JOBS := $(shell nproc)
 FUZZ_SECONDS ?= 600
 MONKEY_EVENTS ?= 1000000
 
-.PHONY: help run test build bench lab fuzz monkey
+PROGRAM := wifi-profile wifi-profile-service wifi-profile-extension
+
+.PHONY: help run test build build-all bench lab fuzz monkey
 help:
 	@echo "make run      build, and profile this machine's Wi-Fi (without a radio: replay the demo recording)"
 	@echo "make build    build/wifi-profile"
@@ -16,6 +18,11 @@ help:
 	@echo "make monkey   MONKEY_EVENTS ($(MONKEY_EVENTS)) random events against the headless screen"
 
 build:
+	@cmake --preset dev > /dev/null
+	@cmake --build build -j $(JOBS) --target $(PROGRAM)
+
+# The tests too.
+build-all:
 	@cmake --preset dev > /dev/null
 	@cmake --build build -j $(JOBS)
 
@@ -44,5 +51,5 @@ fuzz:
 
 monkey:
 	@verification/install_packages build test
-	@$(MAKE) -s build
+	@$(MAKE) -s build-all
 	@WP_MONKEY_EVENTS=$(MONKEY_EVENTS) ctest --test-dir build -R Monkey --output-on-failure --no-tests=error
