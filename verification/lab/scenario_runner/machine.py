@@ -16,7 +16,6 @@ LAB = Path(__file__).resolve().parent.parent
 SHARE = 8
 
 
-
 def kind(asked: str | None) -> str:
     """Which machine run-in-lab takes."""
     cache = Path(os.environ.get("LAB_CACHE", LAB / ".cache"))
