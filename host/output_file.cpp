@@ -59,15 +59,22 @@ void syncFolder(const fs::path& folder) {
     close(descriptor);
 }
 
-/// Where the bytes go in the end: a link stays a link.
-fs::path resolved(const std::string& path) {
-    std::error_code error;
-    fs::path absolute = fs::absolute(path, error);
-    fs::path target = fs::weakly_canonical(absolute, error);
-    return error ? absolute : target;
-}
-
 }  // namespace
+
+fs::path finalFile(const std::string& path) {
+    constexpr int kMostLinks = 40;  // as many as the system follows
+    std::error_code error;
+    fs::path file = fs::absolute(path, error);
+    for (int links = 0; links <= kMostLinks; ++links) {
+        fs::path target = fs::weakly_canonical(file, error);
+        if (error) return file;
+        // A link to a file that is not there yet is no canonical path: it is followed by hand.
+        fs::path next = fs::read_symlink(target, error);
+        if (error) return target;
+        file = target.parent_path() / next;
+    }
+    return file;
+}
 
 std::optional<std::string> writeAll(int descriptor, std::string_view bytes) {
     while (!bytes.empty()) {
@@ -91,7 +98,7 @@ OutputFile::OutputFile(std::string option, std::string path, std::optional<mode_
     } else if (errno != ENOENT || path_.ends_with('/')) {
         refuse(place + "cannot be written: " + (errno == ENOENT ? "no such folder" : errorText()));
     }
-    fs::path folder = resolved(path_).parent_path();
+    fs::path folder = finalFile(path_).parent_path();
     if (access(folder.c_str(), W_OK | X_OK) != 0)
         refuse(place + "cannot be written: its folder: " + errorText());
 }
@@ -113,7 +120,7 @@ void OutputFile::writeInPlace(std::string_view bytes) const {
 }
 
 void OutputFile::replace(std::string_view bytes) const {
-    std::string target = resolved(path_).string();
+    std::string target = finalFile(path_).string();
     NewFile file(target);
     if (file.descriptor() < 0) failToWrite(errorText());
     struct stat earlier {};

@@ -2,6 +2,7 @@
 
 #include <sys/types.h>
 
+#include <filesystem>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -10,6 +11,9 @@ namespace wp::host {
 
 /// Writes all bytes to the descriptor; the error's text on failure. *Any*.
 std::optional<std::string> writeAll(int descriptor, std::string_view bytes);
+
+/// The file that the path leads to in the end, all links followed, whether there is one yet or not. *Any*.
+std::filesystem::path finalFile(const std::string& path);
 
 /// A file that is written whole or not at all: the bytes go to a new file beside it, which takes its place
 /// when they are on the disk. An earlier file keeps its mode, and survives every failure. What is no regular

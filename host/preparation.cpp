@@ -74,11 +74,16 @@ void refuseOneFileForTwo(const RunOptions& options) {
         {"--record", &options.recordFile},
         {"--automation", &options.automationFile},
         {"--transcript", &options.transcriptFile}};
-    for (std::size_t i = 0; i < std::size(files); ++i)
-        for (std::size_t j = i + 1; j < std::size(files); ++j)
-            if (*files[i].second && **files[i].second != "/dev/null" && *files[i].second == *files[j].second)
-                refuse(std::string(files[j].first) + ": " + **files[j].second + ": is the file of " +
-                       files[i].first + " too; give another");
+    for (std::size_t i = 0; i < std::size(files); ++i) {
+        const std::optional<std::string>& first = *files[i].second;
+        if (!first || *first == "/dev/null") continue;
+        for (std::size_t j = i + 1; j < std::size(files); ++j) {
+            const std::optional<std::string>& second = *files[j].second;
+            if (!second || finalFile(*first) != finalFile(*second)) continue;
+            refuse(std::string(files[j].first) + ": " + *second + ": is the file of " + files[i].first +
+                   " too; give another");
+        }
+    }
 }
 
 }  // namespace

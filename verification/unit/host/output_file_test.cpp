@@ -93,6 +93,26 @@ TEST_F(OutputFileTest, ALinkStaysALink) {
     EXPECT_EQ(content(path("target.json")), "new");
 }
 
+TEST_F(OutputFileTest, ALinkToAFileThatIsNotThereYetStaysALink) {
+    fs::create_symlink("second.json", path("first.json"));
+    fs::create_symlink("target.json", path("second.json"));
+
+    OutputFile("--output", path("first.json")).write("new");
+
+    EXPECT_TRUE(fs::is_symlink(path("first.json")));
+    EXPECT_TRUE(fs::is_symlink(path("second.json")));
+    EXPECT_EQ(content(path("target.json")), "new");
+}
+
+TEST_F(OutputFileTest, EverySpellingOfAPathLeadsToTheSameFile) {
+    fs::create_symlink("result.json", path("link.json"));
+    fs::path result = finalFile(path("result.json"));
+
+    EXPECT_EQ(finalFile(path("./result.json")), result);
+    EXPECT_EQ(finalFile(path("link.json")), result);
+    EXPECT_NE(finalFile(path("other.json")), result);
+}
+
 TEST_F(OutputFileTest, AFailedWriteLeavesTheOldFileAndNoOther) {
     put("result.json", "old");
     OutputFile file("--output", path("result.json"));
