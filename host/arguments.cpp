@@ -166,6 +166,9 @@ void refuseConflicts(const RunOptions& options) {
     }
     if (options.replayFile && options.demo)
         refuse("--demo: not together with --replay; a run replays one recording");
+    if (options.recordFile == "-") refuse("--record: \"-\" is no file; standard output carries the result");
+    if (options.automationFile == "-")
+        refuse("--automation: \"-\" is no file; standard output carries the result");
     if (options.anonymise && !options.recordFile)
         refuse("--anonymise: needs --record FILE; it changes what is recorded");
     if (options.transcriptFile == "-" && !options.outputFile)

@@ -139,6 +139,10 @@ TEST(Arguments, OptionsThatNeedOneAnotherAreRefusedAlone) {
               "--demo: not together with --replay; a run replays one recording");
     EXPECT_EQ(refusalOf({"run", "--anonymise"}),
               "--anonymise: needs --record FILE; it changes what is recorded");
+    EXPECT_EQ(refusalOf({"run", "--record", "-"}),
+              "--record: \"-\" is no file; standard output carries the result");
+    EXPECT_EQ(refusalOf({"run", "--automation", "-"}),
+              "--automation: \"-\" is no file; standard output carries the result");
     EXPECT_EQ(refusalOf({"run", "--transcript", "-"}),
               "--transcript: \"-\" needs --output FILE, because standard output carries the result");
 }
