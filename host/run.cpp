@@ -151,7 +151,8 @@ void Run::setUp() {
 
 /// Starts the diagnostic and lets it run to its end. Returns why it cannot come to one.
 std::optional<std::string> Run::drive() {
-    std::unique_ptr<ui::FrontEnd> frontEnd = makeFrontEnd(prepared_.screen, screen_, mainQueue_, localization_);
+    std::unique_ptr<ui::FrontEnd> frontEnd =
+        makeFrontEnd(prepared_.screen, screen_, mainQueue_, localization_);
     if (prepared_.screen == ScreenChoice::terminal && isatty(STDERR_FILENO)) log_.hold();
     isUnderWay_ = true;
     if (!isBrokenOff()) controller_->start();
@@ -175,7 +176,8 @@ void Run::tearDown(bool hasObstacle) {
 
 int Run::report(const std::optional<std::string>& obstacle) {
     std::optional<int> interrupted = interruption_->exitStatus();
-    bool hasResult = !isBrokenOff() && !obstacle;
+    // Asked once: a run that is interrupted from here on has its result.
+    bool hasResult = !interrupted && !hasLeft_ && !obstacle;
     if (hasResult) writeResult();
     automation_.write();
     services_->writeRecording();
