@@ -4,6 +4,7 @@ LAB := verification/lab
 JOBS := $(shell nproc)
 FUZZ_SECONDS ?= 600
 MONKEY_EVENTS ?= 1000000
+MONKEY_SEED ?= 2
 
 PROGRAM := wifi-profile wifi-profile-service wifi-profile-extension
 
@@ -51,5 +52,7 @@ fuzz:
 
 monkey:
 	@verification/install_packages build test
-	@$(MAKE) -s build-all
-	@WP_MONKEY_EVENTS=$(MONKEY_EVENTS) ctest --test-dir build -R Monkey --output-on-failure --no-tests=error
+	@cmake --preset dev > /dev/null
+	@cmake --build build -j $(JOBS) --target monkey
+	@build/monkey --mode stepped --seed $(MONKEY_SEED) --events $(MONKEY_EVENTS)
+	@build/monkey --mode threaded --seed $(MONKEY_SEED) --events $(MONKEY_EVENTS)
