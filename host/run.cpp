@@ -3,6 +3,8 @@
 #include <unistd.h>
 
 #include <atomic>
+#include <exception>
+#include <functional>
 #include <memory>
 #include <optional>
 
@@ -96,6 +98,7 @@ class Run {
     bool isOver() const { return isBrokenOff() || isFinished_; }
     void tearDown(bool hasObstacle);
     int report(const std::optional<std::string>& obstacle);
+    void writeOutputs(bool hasResult);
     void writeResult();
 
     const RunOptions& options_;
@@ -178,13 +181,27 @@ int Run::report(const std::optional<std::string>& obstacle) {
     std::optional<int> interrupted = interruption_->exitStatus();
     // Asked once: a run that is interrupted from here on has its result.
     bool hasResult = !interrupted && !hasLeft_ && !obstacle;
-    if (hasResult) writeResult();
-    automation_.write();
-    services_->writeRecording();
+    writeOutputs(hasResult);
     if (interrupted) return *interrupted;
     if (hasLeft_) return exit_status::leftByUser;
     if (obstacle) fail(*obstacle);
     return exitStatusOf(controller_->result().statusCode().value_or(1));
+}
+
+/// Writes each of the three, whatever becomes of the others; the first that could not be written fails the run.
+void Run::writeOutputs(bool hasResult) {
+    std::exception_ptr failure;
+    auto attempt = [&failure](const std::function<void()>& write) {
+        try {
+            write();
+        } catch (const Exit&) {
+            if (!failure) failure = std::current_exception();
+        }
+    };
+    if (hasResult) attempt([this] { writeResult(); });
+    attempt([this] { automation_.write(); });
+    attempt([this] { services_->writeRecording(); });
+    if (failure) std::rethrow_exception(failure);
 }
 
 void Run::writeResult() {

@@ -90,12 +90,17 @@ std::optional<std::string> readStep(std::string_view token, Pictures pictures, S
     return "not one of " + std::string(kKnown);
 }
 
+/// More than any hand or bench writes; a device file that never ends is refused here.
+constexpr std::size_t kLongestFile = 1 << 20;
+
 std::optional<std::string> readFile(const std::string& file, std::string& content) {
     std::unique_ptr<std::FILE, int (*)(std::FILE*)> stream(std::fopen(file.c_str(), "rb"), std::fclose);
     if (!stream) return std::string(std::strerror(errno));
     std::array<char, 4096> buffer;
-    while (std::size_t count = std::fread(buffer.data(), 1, buffer.size(), stream.get()))
+    while (std::size_t count = std::fread(buffer.data(), 1, buffer.size(), stream.get())) {
         content.append(buffer.data(), count);
+        if (content.size() > kLongestFile) return "longer than " + std::to_string(kLongestFile) + " bytes";
+    }
     if (std::ferror(stream.get()) != 0) return std::string(std::strerror(errno));
     return std::nullopt;
 }
