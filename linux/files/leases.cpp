@@ -31,6 +31,10 @@ bool hasPassed(std::string_view expiry, std::int64_t now) {
         if (read.ec == std::errc()) ++count;
     }
     if (count < 6) return true;
+    // The leap second counts; a year has four digits.
+    constexpr int kHighest[6] = {9999, 12, 31, 23, 59, 60};
+    for (int i = 0; i < 6; ++i)
+        if (parts[i] < 0 || parts[i] > kHighest[i]) return true;
     using namespace std::chrono;
     const year_month_day day{year(parts[0]), month(static_cast<unsigned>(parts[1])),
                              std::chrono::day(static_cast<unsigned>(parts[2]))};

@@ -72,6 +72,8 @@ TEST(Leases, OneThatHasEndedIsNone) {
     EXPECT_FALSE(readDhclientLeases(kLeases, "wlan0", kSixThirtyPm + 3600));
     EXPECT_FALSE(readDhclientLeases("lease {\ninterface \"w\";\nexpire epoch 100; # old\n}\n", "w", 101));
     EXPECT_FALSE(readDhclientLeases("lease {\ninterface \"w\";\nexpire 5 2026/13/40 1:2:3;\n}\n", "w", 0));
+    EXPECT_FALSE(readDhclientLeases("lease {\ninterface \"w\";\nexpire 5 2026/11/20 999999998:0:0;\n}\n", "w", 0));
+    EXPECT_FALSE(readDhclientLeases("lease {\ninterface \"w\";\nexpire 5 2026/11/20 -1:0:0;\n}\n", "w", 0));
 }
 
 TEST(Leases, CutAndBrokenFilesAreReadAsFarAsTheyGo) {
