@@ -160,22 +160,22 @@ no_internet() { :; }
 internet() {
     local dev=$1 there=203.0.113.10 dir=/run/lab; shift
     mkdir -p $dir/$dev
-    [ -s $dir/ca.pem ] || openssl req -x509 -newkey ec -pkeyopt ec_paramgen_curve:P-256 -nodes -subj /CN=lab -days 3650 \
+    [ -s $dir/internet.pem ] || openssl req -x509 -newkey ec -pkeyopt ec_paramgen_curve:P-256 -nodes -subj /CN=lab -days 3650 \
         -addext 'subjectAltName=DNS:portal.example,DNS:vendor.example,DNS:api.example' \
-        -keyout $dir/key.pem -out $dir/ca.pem 2> /dev/null
+        -keyout $dir/internet-key.pem -out $dir/internet.pem 2> /dev/null
     in_ap "$dev" ip addr add $there/32 dev lo 2> /dev/null
     names_lead "$dev" $there
     # A home's one translation, unless the behaviours say something else.
     [ $# -gt 0 ] || set -- nat=203.0.113.77 mapped=203.0.113.77
     : > "$dir/$dev/internet.log"
-    in_ap "$dev" "$LAB_DIR/internet" $there $dir/ca.pem $dir/key.pem "$@" > "$dir/$dev/internet.log" 2>&1 &
+    in_ap "$dev" "$LAB_DIR/internet" $there $dir/internet.pem $dir/internet-key.pem "$@" > "$dir/$dev/internet.log" 2>&1 &
     wait_for 20 grep -q ready "$dir/$dev/internet.log" || { cat "$dir/$dev/internet.log"; return 1; }
     mkdir -p /etc/wifi-profile
     cat > /etc/wifi-profile/config.json <<C
 {"endpoints": {"pingIPv4": "$there", "pingIPv6": "2001:db8:1::1", "name": "host.example",
   "portalPlain": "http://portal.example/204", "portalSecure": "https://portal.example/204",
   "vendorHost": "vendor.example:443", "vendorUrl": "https://vendor.example/vendor", "stun": "$there:3478",
-  "certificateAuthorities": "$dir/ca.pem"}}
+  "certificateAuthorities": "$dir/internet.pem"}}
 C
 }
 
