@@ -1,11 +1,15 @@
 #!/usr/bin/env python3
 """Checks that docs/ names what the rows of the catalogue say: each test with its number, its name in the log and its
-verdict's key in catalogue.md, and each result key in result_document.md."""
+verdict's key in catalogue.md, and each result key in result_document.md; and that fleet.md counts as findings what the
+lab's scenarios do."""
 import pathlib
 import re
 import sys
 
 ROOT = pathlib.Path(__file__).resolve().parents[2]
+sys.path.append(str(ROOT / "verification/lab"))
+from scenario_runner import catalogue as lab_catalogue  # noqa: E402
+
 ROW = re.compile(r'\{\s*(\d+), "(\w+)",\s+(never|always|passed|notPassed),\s+(\S+),\s+(\S+),\s+(".*?"|none),\s+(".*?")\}')
 
 
@@ -17,10 +21,19 @@ def rows():
                 yield match.groups()
 
 
+def fleet_faults():
+    """The two lists of keys in the page's view of findings: those that are one when false, and those that never are."""
+    page = (ROOT / "docs/fleet.md").read_text(encoding="utf-8")
+    lists = [set(re.findall(r"'(\w+)'", listed)) for listed in re.findall(r"key NOT IN \(([^)]*)\)", page)]
+    tests = lab_catalogue.DEVICE + lab_catalogue.NETWORK
+    wanted = [{test.key for test in tests if test.finding is finding} for finding in (False, None)]
+    return [] if lists == wanted else [f"docs/fleet.md: the lists of keys are {lists}, not {wanted}"]
+
+
 def main():
     catalogue = (ROOT / "docs/catalogue.md").read_text(encoding="utf-8")
     document = (ROOT / "docs/result_document.md").read_text(encoding="utf-8")
-    faults, count = [], 0
+    faults, count = fleet_faults(), 0
     for number, key, gate, info_key, info_result_key, _, name in rows():
         count += 1
         read = {"never": "", "notPassed": "not passed"}.get(gate, gate)

@@ -1,6 +1,6 @@
 #!/usr/bin/python3
 """Holds docs/result.schema.json against the page that explains the result, and results against the schema: those that
-the whole-program cases expect, those of the demo recordings, and changed ones that it must refuse.
+the whole-program cases expect, those of the sample fleet and the demo recordings, and changed ones that it must refuse.
 
 usage: result_schema.py PROGRAM
 """
@@ -17,6 +17,7 @@ ROOT = pathlib.Path(__file__).resolve().parents[2]
 SCHEMA = ROOT / "docs/result.schema.json"
 PAGE = ROOT / "docs/result_document.md"
 CASES = ROOT / "verification/cases"
+FLEET = ROOT / "verification/fleet/results"
 REFUSED = ROOT / "verification/data/results/refused.json"
 FULLEST = CASES / "joined_and_selected/expected/result.json"
 DEMOS = ("home", "troubled", "selected")
@@ -56,8 +57,8 @@ def places(result):
 
 
 def expected_results():
-    """Name of the case and result, for every result among the files that the cases expect."""
-    for file in sorted(CASES.glob("*/expected/*")):
+    """Name of the case, file and result, for every result among the files that the cases expect and in the fleet."""
+    for file in sorted([*CASES.glob("*/expected/*"), *FLEET.glob("*/*")]):
         text = file.read_text(encoding="utf-8", errors="replace")
         if text.startswith("{") and '"statusCode"' in text:
             yield file.parent.parent.name, file, json.loads(text)
