@@ -176,8 +176,10 @@ Known<Echo> EchoSocket::ask(const Gateway& target, const std::string& interfaceN
     const std::lock_guard lock(asking_);
     const End& end = this->end(target.family);
     if (!end.descriptor) {
-        const bool denied = end.error == EPERM || end.error == EACCES;
-        return failure(denied ? Reason::notPermitted : Reason::unavailable,
+        if (end.error == EPERM || end.error == EACCES)
+            return failure(Reason::notPermitted,
+                           "no permission to ping (net.ipv4.ping_group_range or CAP_NET_RAW)");
+        return failure(Reason::unavailable,
                        std::string("no echo requests (ping): ") + std::strerror(end.error));
     }
     if (!leaveBy(end.descriptor.number(), target.family, interfaceIndex)) {

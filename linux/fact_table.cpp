@@ -11,11 +11,27 @@ namespace {
 
 using namespace std::chrono_literals;
 
+/// A reason that names what is missing on this machine also names what that costs; a missing permission, which a
+/// person can mend, is worth a note too.
+Error withLoss(const Gathering& g, Error error) {
+    const bool denied = error.code == static_cast<int>(Reason::notPermitted);
+    if (!denied && error.code != static_cast<int>(Reason::unavailable)) return error;
+    error.message += std::string("; without it nobody can tell ") + g.loss;
+    if (denied) g.sources.notes.once(error.message);
+    return error;
+}
+
+template <class T>
+Store stored(const Gathering& g, Known<T> Facts::*place, Known<T> found) {
+    if (!found) found = withLoss(g, found.error());
+    return [place, found = std::move(found)](Facts& into) { into.*place = found; };
+}
+
 /// A store of what the function makes of the link, or of the reason why there is no link.
 template <class T, class Gather>
 Store fromLink(const Gathering& g, Known<T> Facts::*place, Gather gather) {
-    Known<T> found = g.facts.link ? gather(*g.facts.link) : Known<T>(g.facts.link.error());
-    return [place, found = std::move(found)](Facts& into) { into.*place = found; };
+    if (g.facts.link) return stored(g, place, Known<T>(gather(*g.facts.link)));
+    return [place, why = g.facts.link.error()](Facts& into) { into.*place = why; };
 }
 
 Known<Link> linkOf(const Gathering& g) {
@@ -35,10 +51,12 @@ std::int64_t freshEnough(const Gathering& g) {
 /// The list wants all that answer, and every time anew; the tests also want to know who hides, and in one go.
 ScanWish wishOf(const Gathering& g, const Link& link) {
     if (g.topic.subject != Subject::scan) {
-        return {link.interfaceIndex, link.radio, freshEnough(g), ScanWish::Manner::listening, g.topic.named};
+        return {link.interfaceName, link.interfaceIndex,         link.radio,
+                freshEnough(g),     ScanWish::Manner::listening, g.topic.named};
     }
     constexpr std::int64_t kNever = std::numeric_limits<std::int64_t>::max();
-    return {link.interfaceIndex, link.radio, kNever, ScanWish::Manner::calling, std::nullopt};
+    return {link.interfaceName,        link.interfaceIndex, link.radio, kNever,
+            ScanWish::Manner::calling, std::nullopt};
 }
 
 Error isDown(const Link& link) {
@@ -46,7 +64,7 @@ Error isDown(const Link& link) {
 }
 
 Store link(const Gathering& g) {
-    return [found = linkOf(g)](Facts& into) { into.link = found; };
+    return stored(g, &Facts::link, linkOf(g));
 }
 
 Store nearby(const Gathering& g) {
@@ -95,7 +113,7 @@ Store saved(const Gathering& g) {
 }
 
 Store bluetooth(const Gathering& g) {
-    return [found = gatherBluetooth(g.until)](Facts& into) { into.bluetooth = found; };
+    return stored(g, &Facts::bluetooth, gatherBluetooth(g.until));
 }
 
 Store driverSharesAirtime(const Gathering& g) {
@@ -127,10 +145,9 @@ Store outsideEcho(const Gathering& g) {
 /// A store of what the function makes of the link and its set-up, or of the reason why one of them is missing.
 template <class T, class Gather>
 Store fromSetup(const Gathering& g, Known<T> Facts::*place, Gather gather) {
-    return fromLink(g, place, [&](const Link& found) -> Known<T> {
-        if (!g.facts.setup) return g.facts.setup.error();
-        return gather(found, *g.facts.setup);
-    });
+    if (g.facts.link && !g.facts.setup)
+        return [place, why = g.facts.setup.error()](Facts& into) { into.*place = why; };
+    return fromLink(g, place, [&](const Link& found) -> Known<T> { return gather(found, *g.facts.setup); });
 }
 
 Store nameAnswer(const Gathering& g) {
@@ -171,28 +188,29 @@ constexpr Fact kPingsAndScan[] = {Fact::gatewayEcho, Fact::outsideEcho, Fact::ne
 
 // clang-format off
 constexpr FactRow kRows[] = {
-    // fact              needs   after          most  gather
-    {Fact::link,         {},     {},            3s,   link},
-    {Fact::nearby,       kLink,  kPings,        30s,  nearby},   // a joined radio listens through two bands in 16 s
-    {Fact::listened,     kLink,  kPingsAndScan, 20s, listened},
-    {Fact::station,      kLink,  {},            3s,   station},
-    {Fact::survey,       kLink,  {},            3s,   survey},
-    {Fact::regulation,   kLink,  {},            3s,   regulation},
-    {Fact::addresses,    kLink,  {},            3s,   addresses},
-    {Fact::gatewayEcho,  kLink,  {},     4s,     gatewayEcho},
-    {Fact::setup,        kLink,  {},     4s,     setup},
-    {Fact::saved,        kLink,  {},     4s,     saved},
-    {Fact::bluetooth,    {},     {},     3s,     bluetooth},
-    {Fact::driverSharesAirtime, kLink, {}, 1s,   driverSharesAirtime},
-    {Fact::peerLinks,    kLink,  {},     3s,     peerLinks},
-    {Fact::airtime,      kLink,  {},     4s,     airtime},
-    {Fact::allowedChannels, kLink, {},   3s,     allowedChannels},
-    {Fact::outsideEcho,  kLink,  {},     4s,     outsideEcho},
-    {Fact::nameAnswer,   kSetup, {},     4s,     nameAnswer},
-    {Fact::portal,       kSetup, {},     5s,     portal},
-    {Fact::vendorService, kSetup, {},    5s,     vendorService},
-    {Fact::router,       kLink,  {},     4s,     router},
-    {Fact::translation,  kTranslation, {}, 3s,   translation},
+    // fact                     needs          after          most  gather               loss
+    {Fact::link,                {},            {},            3s,   link,                "anything about Wi-Fi"},
+    // A joined radio listens through two bands in 16 s.
+    {Fact::nearby,              kLink,         kPings,        30s,  nearby,              "which networks are near"},
+    {Fact::listened,            kLink,         kPingsAndScan, 20s,  listened,            "which networks hide"},
+    {Fact::station,             kLink,         {},            3s,   station,             "how strong the signal is"},
+    {Fact::survey,              kLink,         {},            3s,   survey,              "how loud the noise is"},
+    {Fact::regulation,          kLink,         {},            3s,   regulation,          "the radio's country"},
+    {Fact::addresses,           kLink,         {},            3s,   addresses,           "the addresses"},
+    {Fact::gatewayEcho,         kLink,         {},            4s,   gatewayEcho,         "whether the router and others answer"},
+    {Fact::setup,               kLink,         {},            4s,   setup,               "how the device is set up"},
+    {Fact::saved,               kLink,         {},            4s,   saved,               "the remembered networks"},
+    {Fact::bluetooth,           {},            {},            3s,   bluetooth,           "the Bluetooth devices"},
+    {Fact::driverSharesAirtime, kLink,         {},            1s,   driverSharesAirtime, "how Bluetooth shares airtime"},
+    {Fact::peerLinks,           kLink,         {},            3s,   peerLinks,           "the peer-to-peer links"},
+    {Fact::airtime,             kLink,         {},            4s,   airtime,             "how busy the channels are"},
+    {Fact::allowedChannels,     kLink,         {},            3s,   allowedChannels,     "the channels to choose from"},
+    {Fact::outsideEcho,         kLink,         {},            4s,   outsideEcho,         "whether the router and others answer"},
+    {Fact::nameAnswer,          kSetup,        {},            4s,   nameAnswer,          "whether names resolve"},
+    {Fact::portal,              kSetup,        {},            5s,   portal,              "whether there is a portal"},
+    {Fact::vendorService,       kSetup,        {},            5s,   vendorService,       "whether the vendor is reached"},
+    {Fact::router,              kLink,         {},            4s,   router,              "who made the router"},
+    {Fact::translation,         kTranslation,  {},            3s,   translation,         "how often addresses are translated"},
 };
 // clang-format on
 

@@ -17,6 +17,7 @@ struct Gathering {
     std::int64_t startOfPhase;  ///< ms on the clock that counts suspended time too
     Sources& sources;
     Until until;
+    const char* loss;  ///< of the row
 };
 
 /// How one fact is had.
@@ -26,6 +27,7 @@ struct FactRow {
     std::span<const Fact> after;  ///< facts that it must not disturb: it waits while they are being gathered
     std::chrono::milliseconds most;               ///< how long it may take
     Store (*gather)(const Gathering& gathering);  ///< on a worker's thread
+    const char* loss;                             ///< what nobody can tell without it
 };
 
 /// The row of a fact. *Any* thread.

@@ -106,15 +106,9 @@ int main(int count, char** arguments) {
     sources.interfaceName = options.interfaceName;
     sources.config = std::get<wp::Config>(config);
     wp::PowerSwitch power;
-    const wp::Privileges privileges = wp::dropPrivileges();
+    wp::dropPrivileges();
 
     wp::LineSocket wire{wp::Descriptor(wp::kWireDescriptor)};
-    wp::Session session(wire, sources, power);
-    if (!privileges.scan) {
-        session.note(
-            "no permission to scan (CAP_NET_ADMIN): what is not joined can be judged only by what the system "
-            "itself has scanned lately");
-    }
-    session.run();
+    wp::Session(wire, sources, power).run();
     return 0;
 }

@@ -92,7 +92,8 @@ void Phase::launch(Fact fact) {
     const FactRow& row = rowOf(fact);
     workers_.start([self = shared_from_this(), &row]() -> Workers::Publication {
         const Until until{self->stop_, Clock::now() + row.most};
-        Store store = row.gather({self->facts_, self->topic_, self->startedAt_, self->sources_, until});
+        Store store =
+            row.gather({self->facts_, self->topic_, self->startedAt_, self->sources_, until, row.loss});
         return [self, &row, store = std::move(store)] {
             store(self->facts_);
             self->state(row.fact) = State::done;

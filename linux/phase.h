@@ -6,6 +6,7 @@
 
 #include "linux/config.h"
 #include "linux/gather.h"
+#include "linux/notes.h"
 #include "linux/workers.h"
 #include "service/catalogue.h"
 
@@ -14,7 +15,8 @@ namespace wp {
 /// What the workers of all phases share: each is safe to use from several threads.
 struct Sources {
     std::optional<std::string> interfaceName;  ///< as the user named it
-    Scanner scanner;
+    Notes notes;
+    Scanner scanner{notes};
     EchoSocket gatewayEcho;
     EchoSocket outsideEcho;
     Config config = Config::defaults();

@@ -20,13 +20,9 @@ bool permits(const Capabilities& capabilities, cap_value_t capability) {
            value == CAP_SET;
 }
 
-bool keepOnly(const Capabilities& kept) {
-    return kept && cap_set_proc(kept.get()) == 0;
-}
-
 }  // namespace
 
-Privileges dropPrivileges() {
+void dropPrivileges() {
     const cap_value_t scan = CAP_NET_ADMIN;
     const bool mayScan = permits(Capabilities(cap_get_proc()), scan);
     // Bounding and ambient sets first: shrinking them is a privilege of its own.
@@ -37,9 +33,8 @@ Privileges dropPrivileges() {
         cap_set_flag(kept.get(), CAP_PERMITTED, 1, &scan, CAP_SET);
         cap_set_flag(kept.get(), CAP_EFFECTIVE, 1, &scan, CAP_SET);
     }
-    const bool dropped = keepOnly(kept);
+    if (kept) cap_set_proc(kept.get());
     prctl(PR_SET_NO_NEW_PRIVS, 1, 0, 0, 0);
-    return {mayScan && dropped};
 }
 
 }  // namespace wp

@@ -200,13 +200,21 @@ bool RadioSocket::listenForScans() {
     return group != family_.groups.end() && events_.join(group->second);
 }
 
+Known<ScanEvent> RadioSocket::nextScanStart(std::uint32_t interfaceIndex, const Until& until) {
+    return nextScanEvent(interfaceIndex, true, until);
+}
+
 Known<ScanEvent> RadioSocket::nextScanEnd(std::uint32_t interfaceIndex, const Until& until) {
+    return nextScanEvent(interfaceIndex, false, until);
+}
+
+Known<ScanEvent> RadioSocket::nextScanEvent(std::uint32_t interfaceIndex, bool start, const Until& until) {
     for (;;) {
         while (!arrived_.empty()) {
             const ScanEvent event = arrived_.front();
             arrived_.pop_front();
-            if (event.interfaceIndex == interfaceIndex && event.kind != ScanEvent::Kind::started)
-                return event;
+            const bool isStart = event.kind == ScanEvent::Kind::started;
+            if (event.interfaceIndex == interfaceIndex && isStart == start) return event;
         }
         const NetlinkAnswer answer = events_.receive(until);
         // Too many messages at once: some are lost, and the end of a scan may be among them.

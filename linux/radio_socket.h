@@ -39,6 +39,8 @@ class RadioSocket {
 
     /// Also receives what becomes of scans, from now on.
     bool listenForScans();
+    /// The start of a scan of this interface; what came before it is forgotten.
+    Known<ScanEvent> nextScanStart(std::uint32_t interfaceIndex, const Until& until);
     /// The end of a scan of this interface.
     Known<ScanEvent> nextScanEnd(std::uint32_t interfaceIndex, const Until& until);
 
@@ -47,6 +49,7 @@ class RadioSocket {
 
     NetlinkAnswer ask(std::uint8_t command, std::uint16_t flags, std::uint32_t interfaceIndex,
                       const Until& until);
+    Known<ScanEvent> nextScanEvent(std::uint32_t interfaceIndex, bool start, const Until& until);
     void receiveWaitingEvents();
     void forgetEventsBeforeTheLatestStart(std::uint32_t interfaceIndex);
     NetlinkAnswer askAboutRadio(std::uint8_t command, std::uint32_t radio, const Until& until);

@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <cerrno>
 
+#include "linux/manager_scan.h"
+
 namespace wp {
 namespace {
 
@@ -11,6 +13,8 @@ using std::chrono::milliseconds;
 // A network that hides its name is often missed by one visit of 30 ms on its channel.
 constexpr int kListenAttempts = 3;
 constexpr int kStartAttempts = 4;
+// NetworkManager puts a scan off when another one has just ended, by up to 8 s while it is connected.
+constexpr std::chrono::seconds kManagersDelay{10};
 
 /// One row of scans for one wish.
 class ScanRun {
@@ -36,6 +40,23 @@ class ScanRun {
         return complete(order);
     }
 
+    /// What a scan found that whatever manages the interface was asked for, and who that was.
+    Known<ScanReport> runByManager(bool listening, AskedManager& manager) {
+        Known<Bus> bus = Bus::system();
+        const auto asked = askManagerForScan(bus, {wish_.interfaceName, wish_.named, listening}, until_);
+        if (!asked) return asked.error();
+        manager = *asked;
+        // What ends before a scan has started is one of before.
+        const Known<ScanEvent> start =
+            radio_.nextScanStart(wish_.interfaceIndex, until_.within(kManagersDelay));
+        if (!start) return start.error();
+        const Known<ScanEvent> end = radio_.nextScanEnd(wish_.interfaceIndex, until_);
+        if (!end) return end.error();
+        if (end->kind == ScanEvent::Kind::aborted)
+            return failure(Reason::timeout, "a scan by " + manager.name + " was aborted");
+        return reportNow();
+    }
+
   private:
     ScanOrder fullOrder() const {
         ScanOrder order;
@@ -59,6 +80,10 @@ class ScanRun {
     /// What a scan of this order found, and when it was over.
     Known<ScanReport> complete(const ScanOrder& order) {
         if (const std::optional<Error> error = scan(order)) return *error;
+        return reportNow();
+    }
+
+    Known<ScanReport> reportNow() {
         const std::int64_t completedAt = bootMilliseconds();
         Known<std::vector<AccessPoint>> found = results();
         if (!found) return found.error();
@@ -131,18 +156,21 @@ bool sees(const std::vector<AccessPoint>& found, const std::optional<NetworkName
     });
 }
 
-/// Without permission to scan, what the system itself has heard lately may do, if it is young enough.
-Known<std::vector<AccessPoint>> withoutScan(RadioSocket& radio, const ScanWish& wish, const Error& denied,
-                                            const Until& until) {
+bool isNotPermitted(const Known<ScanReport>& report) {
+    return !report && report.error().code == static_cast<int>(Reason::notPermitted);
+}
+
+/// What the system itself has heard lately, where that is young enough and more than the joined access point.
+std::optional<ScanReport> heardLately(RadioSocket& radio, const ScanWish& wish, const Until& until) {
     Known<std::vector<AccessPoint>> known = radio.accessPoints(wish.interfaceIndex, until);
-    if (!known) return known;
+    if (!known) return std::nullopt;
     std::erase_if(*known, [&](const AccessPoint& each) {
         return !each.joined && (!each.lastSeen || *each.lastSeen < wish.freshSince);
     });
     const bool heardOthers =
         std::ranges::any_of(*known, [](const AccessPoint& each) { return !each.joined; });
-    if (!heardOthers) return denied;
-    return known;
+    if (!heardOthers) return std::nullopt;
+    return ScanReport{std::move(*known), 0};
 }
 
 /// A socket that is told when scans are over.
@@ -160,6 +188,32 @@ bool Scanner::Remembered::serves(const ScanWish& wish) const {
     return interfaceIndex == wish.interfaceIndex && report.completedAt >= wish.freshSince;
 }
 
+Known<ScanReport> Scanner::scanNow(RadioSocket& radio, const ScanWish& wish, const Until& until) {
+    Known<ScanReport> report = ScanRun(radio, wish, until).run();
+    if (isNotPermitted(report)) return scanWithoutPermission(radio, wish, until);
+    if (report && !wish.named && wish.manner == ScanWish::Manner::listening)
+        listened_ = Remembered{wish.interfaceIndex, *report};
+    return report;
+}
+
+/// By whatever manages the interface; else what the system itself has heard lately must do.
+Known<ScanReport> Scanner::scanWithoutPermission(RadioSocket& radio, const ScanWish& wish,
+                                                 const Until& until) {
+    AskedManager manager;
+    const bool listening = wish.manner == ScanWish::Manner::listening && !wish.named;
+    Known<ScanReport> report = ScanRun(radio, wish, until).runByManager(listening, manager);
+    if (report) {
+        if (manager.listens) listened_ = Remembered{wish.interfaceIndex, *report};
+        notes_.once("no permission to scan (CAP_NET_ADMIN): " + manager.name + " was asked to scan instead" +
+                    (manager.listens ? "" : ", which does not count networks that hide"));
+        return report;
+    }
+    const std::optional<ScanReport> lately = heardLately(radio, wish, until);
+    if (!lately) return report;
+    notes_.once(report.error().message + ": other networks are judged by what the system has heard lately");
+    return *lately;
+}
+
 Known<std::vector<AccessPoint>> Scanner::scan(const ScanWish& wish, const Until& until) {
     const std::lock_guard lock(scanning_);
     if (scanned_ && scanned_->serves(wish) && sees(scanned_->report.accessPoints, wish.named)) {
@@ -167,13 +221,9 @@ Known<std::vector<AccessPoint>> Scanner::scan(const ScanWish& wish, const Until&
     }
     Known<RadioSocket> radio = openRadio(until);
     if (!radio) return radio.error();
-    const Known<ScanReport> report = ScanRun(*radio, wish, until).run();
-    if (!report && report.error().code == static_cast<int>(Reason::notPermitted)) {
-        return withoutScan(*radio, wish, report.error(), until);
-    }
+    const Known<ScanReport> report = scanNow(*radio, wish, until);
     if (!report) return report.error();
     scanned_ = Remembered{wish.interfaceIndex, *report};
-    if (!wish.named && wish.manner == ScanWish::Manner::listening) listened_ = scanned_;
     return report->accessPoints;
 }
 
@@ -183,6 +233,9 @@ Known<std::vector<AccessPoint>> Scanner::listen(const ScanWish& wish, const Unti
     Known<RadioSocket> radio = openRadio(until);
     if (!radio) return radio.error();
     const Known<ScanReport> report = ScanRun(*radio, wish, until).listen();
+    if (isNotPermitted(report))
+        return failure(Reason::notPermitted,
+                       "no permission to listen (CAP_NET_ADMIN), and no connection manager that could");
     if (!report) return report.error();
     listened_ = Remembered{wish.interfaceIndex, *report};
     return report->accessPoints;

@@ -1,7 +1,9 @@
 #pragma once
 
 #include <mutex>
+#include <string>
 
+#include "linux/notes.h"
 #include "linux/radio_socket.h"
 
 namespace wp {
@@ -14,6 +16,7 @@ struct ScanReport {
 
 /// What is asked of the scanner.
 struct ScanWish {
+    std::string interfaceName;
     std::uint32_t interfaceIndex = 0;
     std::uint32_t radio = 0;
     /// A scan that was complete at this time or later will do, in ms on the clock that counts suspended time too.
@@ -26,9 +29,12 @@ struct ScanWish {
     std::optional<NetworkName> named;
 };
 
-/// Scans, and remembers the last scan longer than the kernel does. *Any* thread; one scan at a time.
+/// Scans, and remembers the last scan longer than the kernel does. Without the permission to scan it asks whatever
+/// manages the interface, and what that costs is told once. *Any* thread; one scan at a time.
 class Scanner {
   public:
+    explicit Scanner(Notes& notes) : notes_(notes) {}
+
     /// What the latest scan that is fresh enough found, or a new scan. A scan that somebody else has started is
     /// joined when it covers the radio's channels. An error says why there can be none.
     Known<std::vector<AccessPoint>> scan(const ScanWish& wish, const Until& until);
@@ -44,6 +50,10 @@ class Scanner {
         bool serves(const ScanWish& wish) const;
     };
 
+    Known<ScanReport> scanNow(RadioSocket& radio, const ScanWish& wish, const Until& until);
+    Known<ScanReport> scanWithoutPermission(RadioSocket& radio, const ScanWish& wish, const Until& until);
+
+    Notes& notes_;
     std::mutex scanning_;
     std::optional<Remembered> scanned_;
     std::optional<Remembered> listened_;

@@ -5,6 +5,7 @@
 #include <cmath>
 #include <filesystem>
 
+#include "linux/dbus/network_manager.h"
 #include "platform/records.h"
 
 namespace wp {
@@ -67,11 +68,9 @@ Known<PhaseTopic> topicOf(const NumberedTest& test, const DictionaryPointer& con
 }
 
 Session::Session(LineSocket& wire, Sources& sources, PowerSwitch& power)
-    : wire_(wire),
-      sources_(sources),
-      power_(power),
-      stop_(std::make_shared<StopSignal>()),
-      workers_(inbox_) {}
+    : wire_(wire), sources_(sources), power_(power), stop_(std::make_shared<StopSignal>()), workers_(inbox_) {
+    sources_.notes.setTeller([this](const std::string& text) { inbox_.post([this, text] { note(text); }); });
+}
 
 Session::~Session() {
     stop_->raise();
@@ -220,7 +219,22 @@ void Session::finishDescription(std::uint64_t id, const Known<std::vector<RadioI
 }
 
 void Session::handleSetPower(const WireRequest& request) {
-    wire_.send(setPowerAnswerLine(request.id, power_.set(request.power)));
+    const std::optional<Error> error = power_.set(request.power);
+    if (!error || error->code != static_cast<int>(Reason::notPermitted))
+        return answerSetPower(request.id, error);
+    // NetworkManager lets whoever sits at the device do it.
+    workers_.start([this, request, denied = *error, stop = stop_]() -> Workers::Publication {
+        Known<Bus> bus = Bus::system();
+        const Until until{stop, Clock::now() + kLookAround};
+        const Known<bool> done = bus ? setNetworkManagerPower(*bus, request.power, until) : bus.error();
+        return [this, id = request.id, error = done ? std::nullopt : std::optional(denied)] {
+            answerSetPower(id, error);
+        };
+    });
+}
+
+void Session::answerSetPower(std::uint64_t id, const std::optional<Error>& error) {
+    wire_.send(setPowerAnswerLine(id, error));
 }
 
 void Session::reportPower() {

@@ -43,11 +43,30 @@ Error errorOf(const std::string& service, sd_bus_message* reply) {
     return failure(reasonOf(name), service + " answered: " + text.substr(0, 200));
 }
 
+int appendByteTexts(sd_bus_message* message, const BusByteTexts& texts) {
+    int result = sd_bus_message_open_container(message, 'v', "aay");
+    if (result >= 0) result = sd_bus_message_open_container(message, 'a', "ay");
+    for (const auto& text : texts)
+        if (result >= 0) result = sd_bus_message_append_array(message, 'y', text.data(), text.size());
+    if (result >= 0) result = sd_bus_message_close_container(message);
+    return result < 0 ? result : sd_bus_message_close_container(message);
+}
+
+int appendOption(sd_bus_message* message, const std::string& key, const BusOption& value) {
+    int result = sd_bus_message_open_container(message, 'e', "sv");
+    if (result >= 0) result = sd_bus_message_append(message, "s", key.c_str());
+    if (result < 0) return result;
+    const auto* text = std::get_if<std::string>(&value);
+    result = text != nullptr ? sd_bus_message_append(message, "v", "s", text->c_str())
+                             : appendByteTexts(message, std::get<BusByteTexts>(value));
+    return result < 0 ? result : sd_bus_message_close_container(message);
+}
+
 int appendOptions(sd_bus_message* message, const BusOptions& options) {
     int result = sd_bus_message_open_container(message, 'a', "{sv}");
     for (const auto& [key, value] : options) {
         if (result < 0) return result;
-        result = sd_bus_message_append(message, "{sv}", key.c_str(), "s", value.c_str());
+        result = appendOption(message, key, value);
     }
     return result < 0 ? result : sd_bus_message_close_container(message);
 }

@@ -27,7 +27,10 @@ struct BusPath {
 struct BusFlagVariant {
     bool flag;
 };
-using BusOptions = std::vector<std::pair<std::string, std::string>>;
+/// Texts that need not be UTF-8, each a row of bytes.
+using BusByteTexts = std::vector<std::vector<std::uint8_t>>;
+using BusOption = std::variant<std::string, BusByteTexts>;
+using BusOptions = std::vector<std::pair<std::string, BusOption>>;
 using BusArgument = std::variant<std::string, std::int32_t, BusPath, BusFlagVariant, BusOptions>;
 
 /// A connection to the system's message bus. Each call waits for its reply, at most two seconds, and ends at

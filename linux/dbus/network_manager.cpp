@@ -21,6 +21,14 @@ BusObject objectAt(const BusValue& path) {
     return {kService, path.text()};
 }
 
+Known<BusValue> managedProperties(Bus& bus, const BusObject& device, const std::string& interfaceName,
+                                  const Until& until) {
+    auto properties = bus.properties(device, kService + ".Device", until);
+    if (properties && !(*properties)["Managed"].flag())
+        return failure(Reason::notFound, "NetworkManager does not manage " + interfaceName);
+    return properties;
+}
+
 Known<BusObject> deviceOf(Bus& bus, const std::string& interfaceName, const Until& until) {
     const auto path = bus.call(kManager, kService, "GetDeviceByIpIface", {interfaceName}, until);
     if (!path) return path.error();
@@ -102,14 +110,19 @@ SavedSecurity securityIn(const BusValue& settings) {
 
 }  // namespace
 
+Known<BusObject> networkManagerDevice(Bus& bus, const std::string& interfaceName, const Until& until) {
+    auto device = deviceOf(bus, interfaceName, until);
+    if (!device) return device;
+    const auto properties = managedProperties(bus, *device, interfaceName, until);
+    return properties ? device : properties.error();
+}
+
 Known<NetworkManagerLink> readNetworkManagerLink(Bus& bus, const std::string& interfaceName,
                                                  const Until& until) {
     const auto device = deviceOf(bus, interfaceName, until);
     if (!device) return device.error();
-    const auto properties = bus.properties(*device, kService + ".Device", until);
+    const auto properties = managedProperties(bus, *device, interfaceName, until);
     if (!properties) return properties.error();
-    if (!(*properties)["Managed"].flag())
-        return failure(Reason::notFound, "NetworkManager does not manage " + interfaceName);
     NetworkManagerLink link;
     link.device = *device;
     link.settings = activeSettings(bus, (*properties)["ActiveConnection"].text(), until);
@@ -208,8 +221,10 @@ Known<bool> setNetworkManagerPower(Bus& bus, bool on, const Until& until) {
     return on;
 }
 
-Known<bool> requestNetworkManagerScan(Bus& bus, const BusObject& device, const Until& until) {
-    const auto reply = bus.call(device, kService + ".Device.Wireless", "RequestScan", {BusOptions()}, until);
+Known<bool> requestNetworkManagerScan(Bus& bus, const BusObject& device,
+                                      const std::optional<NetworkName>& named, const Until& until) {
+    const BusOptions options = named ? BusOptions{{"ssids", namesCalled(*named)}} : BusOptions();
+    const auto reply = bus.call(device, kService + ".Device.Wireless", "RequestScan", {options}, until);
     if (!reply) return reply.error();
     return true;
 }

@@ -19,6 +19,9 @@ struct NetworkManagerLink {
     std::vector<IPAddress> servers;  ///< name servers in effect, of both families
 };
 
+/// NetworkManager's object for the interface. Fails as `notFound` where it does not manage the interface.
+Known<BusObject> networkManagerDevice(Bus& bus, const std::string& interfaceName, const Until& until);
+
 /// Reads all of it. Fails as `notFound` where NetworkManager does not manage the interface. *Any* thread.
 Known<NetworkManagerLink> readNetworkManagerLink(Bus& bus, const std::string& interfaceName,
                                                  const Until& until);
@@ -47,7 +50,8 @@ struct WirelessPower {
 Known<WirelessPower> networkManagerPower(Bus& bus, const Until& until);
 /// Switches Wi-Fi on or off.
 Known<bool> setNetworkManagerPower(Bus& bus, bool on, const Until& until);
-/// Asks for a scan of the device; it answers at once, the scan comes later.
-Known<bool> requestNetworkManagerScan(Bus& bus, const BusObject& device, const Until& until);
+/// Asks for a scan of the device that also calls for the named network; it answers at once, the scan comes later.
+Known<bool> requestNetworkManagerScan(Bus& bus, const BusObject& device,
+                                      const std::optional<NetworkName>& named, const Until& until);
 
 }  // namespace wp

@@ -108,6 +108,11 @@ std::optional<Date> dateFromText(std::string_view text) {
     return dateFromUnix(midnight + part(11, 2) * 3600 + part(14, 2) * 60 + part(17, 2));
 }
 
+BusByteTexts namesCalled(const NetworkName& named) {
+    const Bytes bytes = named.bytes();
+    return {{bytes.begin(), bytes.end()}, {}};
+}
+
 std::optional<NetworkName> nameFromSupplicant(std::string_view text) {
     const bool quoted = text.size() >= 2 && text.back() == '"';
     if (quoted && text.front() == '"') {

@@ -4,6 +4,7 @@
 #include <optional>
 #include <string_view>
 
+#include "linux/dbus/bus.h"
 #include "platform/value.h"
 #include "service/saved_networks.h"
 
@@ -13,6 +14,9 @@ namespace wp {
 Date dateFromUnix(std::int64_t seconds);
 /// "2026-11-20T18:30:00Z"; nothing for any other form.
 std::optional<Date> dateFromText(std::string_view text);
+
+/// The names that a scan calls when it looks for one network and all others: an empty name calls for everybody.
+BusByteTexts namesCalled(const NetworkName& named);
 
 /// A name in the supplicant's form: in double quotes as it stands, `P"…"` with escapes, or in hexadecimal.
 std::optional<NetworkName> nameFromSupplicant(std::string_view text);

@@ -47,9 +47,12 @@ Known<SavedNetworks> supplicantNetworks(Bus& bus, const BusObject& interface, co
     return saved;
 }
 
-Known<bool> requestSupplicantScan(Bus& bus, const BusObject& interface, const Until& until) {
-    const auto reply =
-        bus.call(interface, kService + ".Interface", "Scan", {BusOptions{{"Type", "active"}}}, until);
+Known<bool> requestSupplicantScan(Bus& bus, const BusObject& interface, SupplicantScan manner,
+                                  const std::optional<NetworkName>& named, const Until& until) {
+    const bool active = manner == SupplicantScan::active;
+    BusOptions options{{"Type", active ? "active" : "passive"}};
+    if (active && named) options.push_back({"SSIDs", namesCalled(*named)});
+    const auto reply = bus.call(interface, kService + ".Interface", "Scan", {options}, until);
     if (!reply) return reply.error();
     return true;
 }

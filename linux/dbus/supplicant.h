@@ -16,7 +16,11 @@ std::optional<SavedNetwork> savedFromSupplicant(const BusValue& properties, bool
 /// The networks that the supplicant holds for the interface.
 Known<SavedNetworks> supplicantNetworks(Bus& bus, const BusObject& interface, const Until& until);
 
-/// Asks for an active scan on all channels; it answers at once, the scan comes later.
-Known<bool> requestSupplicantScan(Bus& bus, const BusObject& interface, const Until& until);
+enum class SupplicantScan { active, passive };
+
+/// Asks for a scan on all channels, an active one also for the named network; it answers at once, the scan comes
+/// later.
+Known<bool> requestSupplicantScan(Bus& bus, const BusObject& interface, SupplicantScan manner,
+                                  const std::optional<NetworkName>& named, const Until& until);
 
 }  // namespace wp

@@ -11,6 +11,7 @@
 #include "linux/dbus/network_records.h"
 #include "linux/dbus/resolved.h"
 #include "linux/dbus/supplicant.h"
+#include "linux/manager_scan.h"
 #include "verification/unit/linux/fakes/child_process.h"
 #include "verification/unit/linux/stop.h"
 
@@ -145,7 +146,6 @@ TEST_F(MessageBus, NetworkManagerTellsOfTheLinkThatItManages) {
     EXPECT_EQ(textsOf(link->servers), "192.168.1.1 2001:db8::53 ");
     EXPECT_EQ(textsOf(manualServers(link->settings)), "9.9.9.9 2620:fe::9 ");
     EXPECT_EQ(proxyOf(link->settings), "NetworkManager profile: pac-url");
-    EXPECT_TRUE(requestNetworkManagerScan(bus, link->device, patience()));
 }
 
 TEST_F(MessageBus, AnInterfaceThatNetworkManagerLeavesAloneIsNotItsOwn) {
@@ -181,7 +181,6 @@ TEST_F(MessageBus, TheSupplicantTellsItsNetworks) {
     const auto saved = supplicantNetworks(bus, *interface, patience());
     ASSERT_TRUE(saved) << saved.error().text();
     EXPECT_EQ(linesOf(*saved), std::string("wpa_supplicant\nHome 4 enabled\n\xC3\xBF\0 2 hidden\n", 43));
-    EXPECT_TRUE(requestSupplicantScan(bus, *interface, patience()));
     const auto other = supplicantInterface(bus, "wlan7", patience());
     ASSERT_FALSE(other);
     EXPECT_EQ(other.error().code, codeOf(Reason::notFound));
@@ -194,7 +193,50 @@ TEST_F(MessageBus, IwdTellsItsNetworks) {
     EXPECT_EQ(iwdDevice(*objects, "wlan0"), "/net/connman/iwd/0/3");
     EXPECT_EQ(iwdDevice(*objects, "wlan1"), "");
     EXPECT_EQ(linesOf(iwdNetworks(*objects)), "iwd\nHome 4 enabled 721692800\nCafe 0 hidden\n");
-    EXPECT_TRUE(requestIwdScan(bus, "/net/connman/iwd/0/3", patience()));
+}
+
+TEST_F(MessageBus, AScanIsAskedOfWhateverManagesTheInterface) {
+    Known<Bus> bus = this->bus();
+    const auto asked = [&](const char* interface) {
+        const auto manager = askManagerForScan(bus, {interface, std::nullopt, true}, patience());
+        if (!manager) return manager.error().text();
+        return manager->name + (manager->listens ? " listens" : "");
+    };
+    EXPECT_EQ(asked("wlan0"), "NetworkManager");
+    EXPECT_EQ(asked("wlan2"), "iwd");
+    EXPECT_EQ(asked("wlan3"), "wpa_supplicant listens");
+    EXPECT_EQ(asked("wlan4"),
+              "no permission to scan (CAP_NET_ADMIN), and NetworkManager would not either: "
+              "org.freedesktop.NetworkManager answered: Not authorized (code 6)");
+    EXPECT_EQ(asked("wlan9"),
+              "no permission to scan (CAP_NET_ADMIN), and no connection manager to ask for a scan (code 6)");
+    bus = failure(Reason::unavailable, "there is no message bus");
+    EXPECT_EQ(asked("wlan0"),
+              "no permission to scan (CAP_NET_ADMIN), and no connection manager to ask for a scan (code 6)");
+}
+
+/// The options of the latest call of a stand-in's method.
+BusValue latestOptions(Bus& bus, const BusObject& object, const std::string& method) {
+    const auto calls = bus.call(object, "org.freedesktop.DBus.Mock", "GetMethodCalls", {method}, patience());
+    if (!calls || calls->list().empty()) return {};
+    return calls->list().back().list().at(1).list().at(0);  // (time, [arguments])
+}
+
+TEST_F(MessageBus, ManagersCallTheNetworkThatIsLookedForAndAllOthers) {
+    Known<Bus> bus = this->bus();
+    const auto name = nameFromText("Cellar\\xFF");
+    ASSERT_TRUE(askManagerForScan(bus, {"wlan0", name, false}, patience()));
+    ASSERT_TRUE(askManagerForScan(bus, {"wlan3", name, false}, patience()));
+    const BusValue ofManager = latestOptions(
+        *bus, {"org.freedesktop.NetworkManager", "/org/freedesktop/NetworkManager/Devices/1"}, "RequestScan");
+    const BusValue ofSupplicant =
+        latestOptions(*bus, {"fi.w1.wpa_supplicant1", "/fi/w1/wpa_supplicant1/Interfaces/0"}, "Scan");
+    for (const BusValue* names : {&ofManager["ssids"], &ofSupplicant["SSIDs"]}) {
+        ASSERT_EQ(names->list().size(), 2U);
+        EXPECT_EQ(NetworkName(names->list()[0].bytes()), *name);
+        EXPECT_TRUE(names->list()[1].bytes().empty());
+    }
+    EXPECT_EQ(ofSupplicant["Type"].text(), "active");
 }
 
 TEST_F(MessageBus, BluetoothDevicesAreCounted) {

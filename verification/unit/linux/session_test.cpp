@@ -1,7 +1,11 @@
 #include "linux/session.h"
 
 #include <gtest/gtest.h>
+#include <poll.h>
+#include <stdlib.h>
 #include <sys/socket.h>
+#include <sys/un.h>
+#include <unistd.h>
 
 #include <thread>
 
@@ -173,6 +177,60 @@ TEST(Session, ServesRequestsAfterItWasCancelled) {
     EXPECT_NE(kCancelledCode, testAnswer(conversation.answer(1)).error->code);
 }
 
+/// A message bus that takes every connection and never says a word, in place of the system's.
+class SilentBus {
+  public:
+    SilentBus() : listening_(::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0)) {
+        sockaddr_un place{};
+        place.sun_family = AF_UNIX;
+        const std::string path = ::testing::TempDir() + "/wp-silent-" + std::to_string(getpid());
+        path.copy(place.sun_path, sizeof place.sun_path - 1);
+        ::unlink(path.c_str());
+        EXPECT_EQ(0, ::bind(listening_.number(), reinterpret_cast<sockaddr*>(&place), sizeof place));
+        EXPECT_EQ(0, ::listen(listening_.number(), 16));
+        setenv("DBUS_SYSTEM_BUS_ADDRESS", ("unix:path=" + path).c_str(), 1);
+        path_ = path;
+    }
+    ~SilentBus() {
+        unsetenv("DBUS_SYSTEM_BUS_ADDRESS");
+        ::unlink(path_.c_str());
+    }
+
+    /// Until somebody asks.
+    void waitForACaller() const {
+        pollfd entry{listening_.number(), POLLIN, 0};
+        ::poll(&entry, 1, -1);
+    }
+
+  private:
+    Descriptor listening_;
+    std::string path_;
+};
+
+TEST(Session, AnswersWhatWaitsForSomebodySilentAtOnceWhenItIsCancelled) {
+    const SilentBus bus;
+    Conversation conversation;
+
+    conversation.say(
+        "{\"id\":1,\"request\":\"test\",\"test\":18}\n{\"id\":2,\"request\":\"test\",\"test\":19}\n");
+    bus.waitForACaller();
+    conversation.say("{\"request\":\"cancel\"}\n");
+
+    // Unless it is cancelled each of them ends otherwise, once the silence has lasted its 2 s.
+    EXPECT_EQ(kCancelledCode, testAnswer(conversation.answer(1)).error.value_or(Error()).code);
+    EXPECT_EQ(kCancelledCode, testAnswer(conversation.answer(2)).error.value_or(Error()).code);
+}
+
+TEST(Session, GivesSomebodySilentUpByItself) {
+    const SilentBus bus;
+    Conversation conversation;
+
+    conversation.say("{\"id\":1,\"request\":\"test\",\"test\":19}\n");
+
+    const DiagnosticsTestResponse response = testAnswer(conversation.answer(1));
+    EXPECT_TRUE(response.error || response.results);
+}
+
 TEST(Session, EndsInTheMiddleOfItsWorkWhenTheWireIsClosed) {
     Conversation conversation;
 
@@ -193,6 +251,16 @@ TEST(LineSocket, PutsLinesTogetherFromPieces) {
     EXPECT_TRUE(reader.receive());
 
     EXPECT_EQ("two", reader.nextLine());
+}
+
+TEST(Notes, TellEachThingOnce) {
+    Notes notes;
+    std::vector<std::string> told;
+    notes.setTeller([&](const std::string& text) { told.push_back(text); });
+
+    for (const char* text : {"no permission", "another", "no permission"}) notes.once(text);
+
+    EXPECT_EQ((std::vector<std::string>{"no permission", "another"}), told);
 }
 
 TEST(StopSignal, EndsAWaitAndStaysRaised) {

@@ -31,7 +31,7 @@ def network_manager():
     nm, base = "org.freedesktop.NetworkManager", "/org/freedesktop/NetworkManager"
     main = service(nm, base, nm, {"WirelessEnabled": True, "WirelessHardwareEnabled": True})
     main.AddMethod(nm, "GetDeviceByIpIface", "s", "o",
-                   "ret = dbus.ObjectPath('%s/Devices/' + {'wlan0': '1', 'wlan1': '2'}[args[0]])" % base)
+                   "ret = dbus.ObjectPath('%s/Devices/' + {'wlan0': '1', 'wlan1': '2', 'wlan4': '4'}[args[0]])" % base)
     device = nm + ".Device"
     main.AddObject(base + "/Devices/1", device, {
         "Managed": True, "ActiveConnection": dbus.ObjectPath(base + "/ActiveConnection/1"),
@@ -41,6 +41,10 @@ def network_manager():
     dbusmock.get_object(base + "/Devices/1").AddMethod(
         device + ".Wireless", "RequestScan", "a{sv}", "", "")
     main.AddObject(base + "/Devices/2", device, {"Managed": False}, [])
+    main.AddObject(base + "/Devices/4", device, {"Managed": True}, [])
+    dbusmock.get_object(base + "/Devices/4").AddMethod(
+        device + ".Wireless", "RequestScan", "a{sv}", "", "raise dbus.exceptions.DBusException("
+        "'Not authorized', name='org.freedesktop.NetworkManager.Device.PermissionDenied')")
     main.AddObject(base + "/ActiveConnection/1", nm + ".Connection.Active",
                    {"Connection": dbus.ObjectPath(base + "/Settings/1")}, [])
     main.AddObject(base + "/DHCP4Config/1", nm + ".DHCP4Config", {"Options": dbus.Dictionary({
@@ -87,13 +91,13 @@ def supplicant():
     name, base = "fi.w1.wpa_supplicant1", "/fi/w1/wpa_supplicant1"
     main = service(name, base, name)
     main.AddMethod(name, "GetInterface", "s", "o",
-                   "if args[0] != 'wlan0': raise dbus.exceptions.DBusException('no', "
+                   "if args[0] not in ('wlan0', 'wlan3'): raise dbus.exceptions.DBusException('no', "
                    "name='fi.w1.wpa_supplicant1.InterfaceUnknown')\n"
                    "ret = dbus.ObjectPath('%s/Interfaces/0')" % base)
     networks = [base + "/Interfaces/0/Networks/%d" % i for i in range(2)]
     main.AddObject(base + "/Interfaces/0", name + ".Interface", {"Networks": dbus.Array(
         [dbus.ObjectPath(each) for each in networks], signature="o")},
-        [("Scan", "a{sv}", "", "assert args[0]['Type'] == 'active'")])
+        [("Scan", "a{sv}", "", "")])
     for path, enabled, properties in (
             (networks[0], True, {"ssid": '"Home"', "key_mgmt": "WPA-PSK SAE", "proto": "WPA RSN"}),
             (networks[1], False, {"ssid": "c3bf00", "key_mgmt": "NONE", "scan_ssid": "1", "wep_key0": "*"})):
@@ -105,7 +109,9 @@ def iwd():
     name = "net.connman.iwd"
     main = service(name, "/", name + ".Test", manager=True)
     main.AddObject("/net/connman/iwd/0/3", name + ".Device", {"Name": "wlan0"}, [])
-    dbusmock.get_object("/net/connman/iwd/0/3").AddMethod(name + ".Station", "Scan", "", "", "")
+    main.AddObject("/net/connman/iwd/0/5", name + ".Device", {"Name": "wlan2"}, [])
+    for device in ("3", "5"):
+        dbusmock.get_object("/net/connman/iwd/0/" + device).AddMethod(name + ".Station", "Scan", "", "", "")
     main.AddObject("/net/connman/iwd/a_psk", name + ".KnownNetwork", {
         "Name": "Home", "Type": "psk", "Hidden": False, "AutoConnect": True,
         "LastConnectedTime": "2023-11-14T22:13:20Z"}, [])
