@@ -9,6 +9,7 @@
 
 #include "linux/config.h"
 #include "linux/privileges.h"
+#include "linux/sandbox.h"
 #include "linux/session.h"
 
 namespace {
@@ -107,8 +108,12 @@ int main(int count, char** arguments) {
     sources.config = std::get<wp::Config>(config);
     wp::PowerSwitch power;
     wp::dropPrivileges();
+    const wp::Sandbox sandbox = wp::enterSandbox();
 
     wp::LineSocket wire{wp::Descriptor(wp::kWireDescriptor)};
-    wp::Session(wire, sources, power).run();
+    wp::Session session(wire, sources, power);
+    if (sandbox == wp::Sandbox::notInThisKernel)
+        session.note("this kernel filters no system calls (seccomp): the service runs without its sandbox");
+    session.run();
     return 0;
 }
