@@ -28,8 +28,12 @@ bool looksAfter(const std::vector<std::string>& words, const std::string& interf
         return word == interfaceName || word == "-i" + interfaceName;
     };
     if (std::ranges::any_of(words, names)) return true;
-    const std::string program = words.empty() ? "" : std::filesystem::path(words[0]).filename().string();
-    return (program == "dhcpcd" && words.size() <= 2) || program == "connmand";
+    const std::string program = std::filesystem::path(words[0]).filename().string();
+    const auto isOption = [](const std::string& word) {
+        return word.empty() || word.starts_with("-") || word.find('/') != word.npos;
+    };
+    return (program == "dhcpcd" && std::all_of(words.begin() + 1, words.end(), isOption)) ||
+           program == "connmand";
 }
 
 }  // namespace

@@ -4,7 +4,9 @@
 #include <netdb.h>
 #include <sys/random.h>
 
+#include <algorithm>
 #include <array>
+#include <iterator>
 #include <memory>
 
 #include "linux/probe/udp_socket.h"
@@ -19,6 +21,7 @@ constexpr int kTryMilliseconds = 2000, kTries = 2;
 /// How long the other family may take once one has answered (RFC 8305 waits 50 ms for the same).
 constexpr auto kOtherFamily = 50ms;
 constexpr int kMostAddresses = 32;
+constexpr std::size_t kLongestAnswer = 65'535;
 
 struct LibraryUser {
     LibraryUser() { ares_library_init(ARES_LIB_INIT_ALL); }
@@ -70,33 +73,13 @@ Known<Channel> openChannel(const NameServerSet& whom) {
     return channel;
 }
 
-void addFrom(Lookup& lookup, int type, const unsigned char* answer, int size) {
-    int count = kMostAddresses;
-    if (type == 1) {
-        std::array<ares_addrttl, kMostAddresses> found;
-        if (ares_parse_a_reply(answer, size, nullptr, found.data(), &count) != ARES_SUCCESS) return;
-        for (int i = 0; i < count; ++i) {
-            const auto* bytes =
-                reinterpret_cast<const std::uint8_t*>(&found[static_cast<std::size_t>(i)].ipaddr);
-            lookup.addresses.push_back(*IPAddress::fromBytes({bytes, 4}));
-        }
-        return;
-    }
-    std::array<ares_addr6ttl, kMostAddresses> found;
-    if (ares_parse_aaaa_reply(answer, size, nullptr, found.data(), &count) != ARES_SUCCESS) return;
-    for (int i = 0; i < count; ++i) {
-        const auto* bytes =
-            reinterpret_cast<const std::uint8_t*>(&found[static_cast<std::size_t>(i)].ip6addr);
-        lookup.addresses.push_back(*IPAddress::fromBytes({bytes, 16}));
-    }
-}
-
-template <int kType>
+template <RecordType kType>
 void keepAnswer(void* place, int status, int, unsigned char* answer, int size) {
     auto& lookup = *static_cast<Lookup*>(place);
     --lookup.running;
     if (status == ARES_SUCCESS)
-        addFrom(lookup, kType, answer, size);
+        std::ranges::copy(addressesFromAnswer(kType, {answer, static_cast<std::size_t>(size)}),
+                          std::back_inserter(lookup.addresses));
     else if (status != ARES_ENODATA || lookup.why.empty())
         lookup.why = ares_strerror(status);
 }
@@ -124,7 +107,29 @@ Wait turn(ares_channel channel, const Until& until) {
     return Clock::now() >= until.deadline ? Wait::timeout : Wait::ready;
 }
 
+/// The addresses in what the library's reader of one record type finds.
+template <class Record, class Read>
+std::vector<IPAddress> addressesBy(Read read, std::size_t addressSize, Bytes answer) {
+    std::array<Record, kMostAddresses> found;
+    int count = kMostAddresses;
+    std::vector<IPAddress> addresses;
+    if (answer.size() > kLongestAnswer ||
+        read(answer.data(), static_cast<int>(answer.size()), nullptr, found.data(), &count) != ARES_SUCCESS)
+        return addresses;
+    for (int i = 0; i < count; ++i) {
+        // The address stands first in the record.
+        const auto* bytes = reinterpret_cast<const std::uint8_t*>(&found[static_cast<std::size_t>(i)]);
+        addresses.push_back(*IPAddress::fromBytes({bytes, addressSize}));
+    }
+    return addresses;
+}
+
 }  // namespace
+
+std::vector<IPAddress> addressesFromAnswer(RecordType type, Bytes answer) {
+    return type == RecordType::a ? addressesBy<ares_addrttl>(ares_parse_a_reply, 4, answer)
+                                 : addressesBy<ares_addr6ttl>(ares_parse_aaaa_reply, 16, answer);
+}
 
 Known<NameAnswer> lookUpName(const std::string& name, const NameServerSet& whom, const Until& until) {
     const auto start = Clock::now();
@@ -137,8 +142,10 @@ Known<NameAnswer> lookUpName(const std::string& name, const NameServerSet& whom,
     const auto channel = openChannel(whom);
     if (!channel) return channel.error();
     lookup.running = 2;
-    ares_query(channel->get(), name.c_str(), 1, 1, keepAnswer<1>, &lookup);
-    ares_query(channel->get(), name.c_str(), 1, 28, keepAnswer<28>, &lookup);
+    constexpr int kInternet = 1, kIPv4 = static_cast<int>(RecordType::a),
+                  kIPv6 = static_cast<int>(RecordType::aaaa);
+    ares_query(channel->get(), name.c_str(), kInternet, kIPv4, keepAnswer<RecordType::a>, &lookup);
+    ares_query(channel->get(), name.c_str(), kInternet, kIPv6, keepAnswer<RecordType::aaaa>, &lookup);
     Until patience = until;
     while (lookup.running > 0) {
         if (!lookup.addresses.empty() && lookup.running == 1) patience = patience.within(kOtherFamily);

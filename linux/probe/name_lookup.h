@@ -21,6 +21,12 @@ struct NameServerSet {
 /// is none to be asked too. An error is only that the lookup was stopped, or could not begin. *Any* thread.
 Known<NameAnswer> lookUpName(const std::string& name, const NameServerSet& whom, const Until& until);
 
+enum class RecordType : int { a = 1, aaaa = 28 };
+
+/// The addresses of this type, at most 32, in a name server's whole answer; none where it is broken or says no.
+/// *Any* thread.
+std::vector<IPAddress> addressesFromAnswer(RecordType type, Bytes answer);
+
 /// A name that no cache holds: eight random letters before the suffix, for a zone that answers to every name.
 std::string freshName(const std::string& wildcardSuffix);
 

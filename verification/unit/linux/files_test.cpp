@@ -4,6 +4,7 @@
 #include <filesystem>
 #include <fstream>
 
+#include "linux/files/dhcp_clients.h"
 #include "linux/files/leases.h"
 #include "linux/files/networkd.h"
 #include "linux/files/proxy_settings.h"
@@ -72,7 +73,8 @@ TEST(Leases, OneThatHasEndedIsNone) {
     EXPECT_FALSE(readDhclientLeases(kLeases, "wlan0", kSixThirtyPm + 3600));
     EXPECT_FALSE(readDhclientLeases("lease {\ninterface \"w\";\nexpire epoch 100; # old\n}\n", "w", 101));
     EXPECT_FALSE(readDhclientLeases("lease {\ninterface \"w\";\nexpire 5 2026/13/40 1:2:3;\n}\n", "w", 0));
-    EXPECT_FALSE(readDhclientLeases("lease {\ninterface \"w\";\nexpire 5 2026/11/20 999999998:0:0;\n}\n", "w", 0));
+    EXPECT_FALSE(
+        readDhclientLeases("lease {\ninterface \"w\";\nexpire 5 2026/11/20 999999998:0:0;\n}\n", "w", 0));
     EXPECT_FALSE(readDhclientLeases("lease {\ninterface \"w\";\nexpire 5 2026/11/20 -1:0:0;\n}\n", "w", 0));
 }
 
@@ -140,6 +142,37 @@ TEST_F(Root, KeepsALeaseWhereItsClientPutsIt) {
     write("/var/lib/dhcp/dhclient.wlan0.leases", kLeases);
     EXPECT_TRUE(findLease("wlan0", kSixThirtyPm, root_));
     EXPECT_FALSE(findLease("wlan0", kSixThirtyPm + 3600, root_));
+}
+
+/// A process of a program with arguments, as /proc shows it.
+std::string commandOf(const std::vector<std::string>& words) {
+    std::string command;
+    for (const std::string& word : words) command += word + '\0';
+    return command;
+}
+
+TEST_F(Root, HasADhcpClientForTheInterfaceThatItNames) {
+    EXPECT_FALSE(dhcpClientRuns("wlan0", root_));
+    write("/proc/1/cmdline", commandOf({"/sbin/init"}));
+    write("/proc/12/cmdline", commandOf({"/bin/busybox", "udhcpc", "-i", "wlan0", "-n"}));
+    write("/proc/13/cmdline", commandOf({"/sbin/dhclient", "-iwlan2"}));
+    write("/proc/14/cmdline", "");
+    write("/proc/self/cmdline", commandOf({"dhclient", "eth0"}));
+    EXPECT_TRUE(dhcpClientRuns("wlan0", root_));
+    EXPECT_TRUE(dhcpClientRuns("wlan2", root_));
+    EXPECT_FALSE(dhcpClientRuns("wlan", root_));
+    EXPECT_FALSE(dhcpClientRuns("eth0", root_));
+}
+
+TEST_F(Root, HasADhcpClientForAllInterfacesWhereItNamesNone) {
+    write("/proc/12/cmdline", commandOf({"dhcpcd", "eth0", "-q"}));
+    EXPECT_FALSE(dhcpClientRuns("wlan0", root_));
+    write("/proc/13/cmdline", commandOf({"/usr/sbin/dhcpcd", "-q", "-f", "/etc/dhcpcd.conf"}));
+    EXPECT_TRUE(dhcpClientRuns("wlan0", root_));
+    write("/proc/13/cmdline", commandOf({"/usr/sbin/connmand", "-n", "-r"}));
+    EXPECT_TRUE(dhcpClientRuns("wlan0", root_));
+    write("/proc/13/cmdline", commandOf({"grep", "connmand.conf"}));
+    EXPECT_FALSE(dhcpClientRuns("wlan0", root_));
 }
 
 TEST_F(Root, FilesThatAreTooLongOrNoFilesAreNotRead) {

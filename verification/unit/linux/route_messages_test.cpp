@@ -1,9 +1,14 @@
 #include "linux/route_messages.h"
 
 #include <gtest/gtest.h>
+#include <linux/if_addr.h>
+#include <linux/rtnetlink.h>
+#include <sys/socket.h>
 
 #include <algorithm>
 
+#include "linux/address_details.h"
+#include "linux/netlink_socket.h"
 #include "linux/radio_messages.h"
 #include "verification/unit/linux/captured.h"
 
@@ -61,6 +66,53 @@ TEST(RouteMessages, TellAnIPv6GatewayWhereThereIsNoOther) {
 TEST(RouteMessages, TellNoGatewayWithoutARoute) {
     EXPECT_TRUE(readGateways(captured("not-joined-route"), interfaceIn("not-joined")).empty());
     EXPECT_TRUE(readGateways(captured("good-home-route"), 4711).empty());
+}
+
+/// Address, length of its network, and what is special: it lasts forever, the kernel made it
+/// of a router's advertisement.
+std::string linesOf(const std::vector<AddressDetails>& details) {
+    std::string lines;
+    for (const AddressDetails& each : details) {
+        if (each.assigned.address.linkLocal()) continue;  // made of the radio's address
+        lines += each.assigned.address.text() + "/" + std::to_string(each.prefixLength);
+        lines += std::string(each.assigned.permanent ? " forever" : "") +
+                 (each.assigned.byAdvertisement ? " advertised" : "") + "\n";
+    }
+    return lines;
+}
+
+TEST(AddressDetails, TellAddressAndNetwork) {
+    const auto details = readAddressDetails(captured("ipv6-only-addr"), interfaceIn("ipv6-only"));
+    EXPECT_EQ(linesOf(details), "2001:db8:1::7/64 forever\n");
+    EXPECT_TRUE(readAddressDetails(captured("ipv6-only-addr"), 9999).empty());
+}
+
+/// The kernel's message on 2001:db8::5/64 of interface 3. \param origin who made it, \param life in seconds
+std::vector<std::uint8_t> addressMessage(std::uint8_t origin, std::uint32_t life) {
+    const std::uint8_t address[] = {0x20, 1, 0xD, 0xB8, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 5};
+    const ifa_cacheinfo times{life, life, 0, 0};
+    NetlinkRequest message(RTM_NEWADDR, 0);
+    message.header<ifaddrmsg>() = {AF_INET6, 64, 0, 0, 3};
+    message.put(IFA_ADDRESS, address);
+    message.put(IFA_FLAGS, life == 0xFFFF'FFFF ? std::uint32_t{IFA_F_PERMANENT} : 0U);
+    message.put(11, Bytes(&origin, 1));
+    message.put(IFA_CACHEINFO, Bytes(reinterpret_cast<const std::uint8_t*>(&times), sizeof times));
+    const auto* bytes = reinterpret_cast<const std::uint8_t*>(&message.message());
+    return {bytes, bytes + message.message().nlmsg_len};
+}
+
+TEST(AddressDetails, TellLifetimeAndOrigin) {
+    EXPECT_EQ(linesOf(readAddressDetails(addressMessage(0, 0xFFFF'FFFF), 3)), "2001:db8::5/64 forever\n");
+    EXPECT_EQ(linesOf(readAddressDetails(addressMessage(2, 3600), 3)), "2001:db8::5/64 advertised\n");
+    EXPECT_EQ(linesOf(readAddressDetails(addressMessage(0, 3600), 3)), "2001:db8::5/64\n");
+}
+
+TEST(AddressDetails, SurviveAnyCutOfADump) {
+    const auto whole = captured("good-home-addr");
+    const std::uint32_t interface = interfaceIn("good-home");
+    const std::size_t all = readAddressDetails(whole, interface).size();
+    for (std::size_t size = 0; size < whole.size(); ++size)
+        EXPECT_LE(readAddressDetails(Bytes(whole).first(size), interface).size(), all);
 }
 
 TEST(RouteMessages, SurviveAnyCutOfADump) {

@@ -3,10 +3,7 @@
 #include <gtest/gtest.h>
 #include <stdlib.h>
 
-#include <filesystem>
-#include <sstream>
-
-#include "verification/unit/linux/fakes/child_process.h"
+#include "verification/unit/linux/fakes/web_server.h"
 #include "verification/unit/linux/stop.h"
 
 namespace wp {
@@ -15,39 +12,23 @@ namespace {
 using namespace std::chrono_literals;
 using End = WebAnswer::End;
 
-/// A server on loopback for all tests of this kind, with a certificate for "host.example" of its own.
+/// A server on loopback for all tests of this kind.
 class WebClient : public ::testing::Test {
   protected:
-    static void SetUpTestSuite() {
-        std::string pattern = ::testing::TempDir() + "/wpXXXXXX";
-        folder_ = mkdtemp(pattern.data());
-        const std::string make =
-            "openssl req -x509 -newkey rsa:2048 -nodes -days 2 -subj /CN=host.example -addext "
-            "subjectAltName=DNS:host.example -keyout " +
-            folder_ + "/key.pem -out " + certificate() + " 2>/dev/null";
-        ASSERT_EQ(std::system(make.c_str()), 0);
-        server_ = new ChildProcess({"python3", WP_SOURCE_DIR "/verification/unit/linux/fakes/web_server.py",
-                                    certificate(), folder_ + "/key.pem"});
-        std::istringstream(server_->firstLine()) >> plain_ >> secure_;
-    }
-    static void TearDownTestSuite() {
-        delete server_;
-        std::filesystem::remove_all(folder_);
-    }
-
-    static std::string certificate() { return folder_ + "/certificate.pem"; }
+    static void SetUpTestSuite() { server_ = new WebServer; }
+    static void TearDownTestSuite() { delete server_; }
 
     static WebRequest plain(const std::string& path) {
         WebRequest request;
-        request.url = "http://127.0.0.1:" + plain_ + path;
+        request.url = server_->plain(path);
         request.interfaceName = "lo";
         return request;
     }
     static WebRequest secure(const std::string& path, const std::string& host = "host.example") {
         WebRequest request;
-        request.url = "https://" + host + ":" + secure_ + path;
+        request.url = server_->secure(path, host);
         request.addresses = {*IPAddress::fromText("127.0.0.1")};
-        request.authorities = certificate();
+        request.authorities = server_->certificate();
         return request;
     }
     static WebAnswer ask(const WebRequest& request) {
@@ -56,8 +37,7 @@ class WebClient : public ::testing::Test {
         return answers ? answers->front() : WebAnswer();
     }
 
-    inline static std::string folder_, plain_, secure_;
-    inline static ChildProcess* server_ = nullptr;
+    inline static WebServer* server_ = nullptr;
 };
 
 TEST_F(WebClient, TellsStatusBodyAndWhoAnswered) {
@@ -71,7 +51,7 @@ TEST_F(WebClient, TellsStatusBodyAndWhoAnswered) {
 
 TEST_F(WebClient, FollowsNoRedirectAndTellsWhereItWouldLead) {
     EXPECT_EQ(ask(plain("/redirect")).status, 302);
-    EXPECT_EQ(ask(plain("/redirect")).location, "http://127.0.0.1:" + plain_ + "/login");
+    EXPECT_EQ(ask(plain("/redirect")).location, server_->plain("/login"));
     EXPECT_EQ(ask(plain("/nowhere")).status, 302);
     EXPECT_EQ(ask(plain("/nowhere")).location, "");
 }
@@ -87,10 +67,10 @@ TEST_F(WebClient, ABodyIsCutAtItsBound) {
 
 TEST_F(WebClient, SendsHeadersAndTheNameOfItsHost) {
     WebRequest request = plain("/echo");
-    request.url = "http://host.example:" + plain_ + "/echo";
+    request.url = server_->plain("/echo", "host.example");
     request.addresses = {*IPAddress::fromText("127.0.0.1")};
     request.headers = {"Accept: application/captive+json"};
-    EXPECT_EQ(ask(request).body, "application/captive+json|host.example:" + plain_);
+    EXPECT_EQ(ask(request).body, "application/captive+json|host.example:" + server_->plainPort());
 }
 
 TEST_F(WebClient, GoesThroughNoProxy) {
@@ -131,7 +111,7 @@ TEST_F(WebClient, ConnectingAloneAsksForNothing) {
 
 TEST_F(WebClient, NeverLooksANameUpItself) {
     WebRequest request = plain("/204");
-    request.url = "http://localhost:" + plain_ + "/204";
+    request.url = server_->plain("/204", "localhost");
     EXPECT_EQ(ask(request).why, "the name of its host has no address");
 }
 

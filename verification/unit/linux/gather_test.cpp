@@ -1,0 +1,307 @@
+#include "linux/gather.h"
+
+#include <gtest/gtest.h>
+#include <net/if.h>
+#include <stdlib.h>
+#include <sys/socket.h>
+
+#include <algorithm>
+#include <filesystem>
+#include <fstream>
+
+#include "linux/fact_table.h"
+#include "linux/gather_reach.h"
+#include "linux/gather_setup.h"
+#include "verification/unit/linux/fakes/udp_server.h"
+#include "verification/unit/linux/fakes/web_server.h"
+#include "verification/unit/linux/stop.h"
+
+namespace wp {
+namespace {
+
+/// A link over the loopback interface that has joined a network.
+Link loopback() {
+    AccessPoint joined;
+    joined.joined = true;
+    return {"lo", if_nametoindex("lo"), 0, true, joined};
+}
+
+Link notJoined() {
+    Link link = loopback();
+    link.joined.reset();
+    return link;
+}
+
+template <class T>
+std::string textOf(const Known<T>& known) {
+    return known ? "known" : known.error().text();
+}
+
+/// A listening socket whose peer never answers; it raises the signal once somebody has connected, so that no time
+/// decides when.
+class SilentPlace {
+  public:
+    SilentPlace() : listening_(::socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0)) {
+        sockaddr_in place{};
+        place.sin_family = AF_INET;
+        place.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
+        socklen_t size = sizeof place;
+        ::bind(listening_.number(), reinterpret_cast<sockaddr*>(&place), size);
+        ::listen(listening_.number(), 8);
+        ::getsockname(listening_.number(), reinterpret_cast<sockaddr*>(&place), &size);
+        port_ = ntohs(place.sin_port);
+        thread_ = std::thread([this] {
+            pollfd entries[] = {{listening_.number(), POLLIN, 0}, {over_.descriptor(), POLLIN, 0}};
+            ::poll(entries, 2, -1);
+            stop->raise();
+        });
+    }
+    ~SilentPlace() {
+        over_.raise();
+        thread_.join();
+    }
+    std::string hostAndPort() const { return "127.0.0.1:" + std::to_string(port_); }
+
+    const std::shared_ptr<StopSignal> stop = std::make_shared<StopSignal>();
+
+  private:
+    Descriptor listening_;
+    StopSignal over_;
+    std::uint16_t port_ = 0;
+    std::thread thread_;
+};
+
+TEST(GatherRadio, WithoutTheInterfaceSaysWhatIsMissing) {
+    const auto link = gatherLink("no-such-wifi", patience());
+    ASSERT_FALSE(link);
+    const bool namesIt = link.error().message == "the kernel knows no Wi-Fi (nl80211)" ||
+                         link.error().message == "no Wi-Fi interface named no-such-wifi";
+    EXPECT_TRUE(namesIt) << link.error().text();
+}
+
+TEST(GatherRadio, OfALinkThatHasJoinedNothingNothingIsAsked) {
+    EchoSocket socket;
+    EXPECT_EQ(textOf(gatherStation(notJoined(), patience())), "lo is not joined to a network (code 2)");
+    EXPECT_EQ(textOf(gatherGatewayEcho(notJoined(), socket, patience())),
+              "lo is not joined to a network (code 2)");
+    Link down = notJoined();
+    down.up = false;
+    EXPECT_EQ(textOf(gatherStation(down, patience())), "lo is down (code 1)");
+}
+
+TEST(GatherRadio, BeingStoppedCountsBeforeEverythingElse) {
+    const auto stop = std::make_shared<StopSignal>();
+    stop->raise();
+    const Until over = patience(std::chrono::seconds(20), stop);
+    for (const std::string& text :
+         {textOf(gatherLink(std::nullopt, over)), textOf(gatherStationInterfaces(over)),
+          textOf(gatherAirtime(loopback(), over)), textOf(gatherSurvey(loopback(), over)),
+          textOf(gatherRegulation(loopback(), over)), textOf(gatherAllowedChannels(loopback(), over)),
+          textOf(gatherAddresses(loopback(), over)), textOf(gatherPeerLinks(loopback(), "", over))})
+        EXPECT_EQ(text, "cancelled (code 8)");
+}
+
+TEST(GatherAddresses, OfLoopbackReachNobody) {
+    const auto addresses = gatherAddresses(loopback(), patience());
+    ASSERT_TRUE(addresses) << addresses.error().text();
+    ASSERT_FALSE(addresses->empty());
+    EXPECT_TRUE(std::ranges::none_of(*addresses, &Address::global));
+}
+
+TEST(GatherEcho, NeedsARouter) {
+    EchoSocket socket;
+    EXPECT_EQ(textOf(gatherGatewayEcho(loopback(), socket, patience())), "lo has no default route (code 2)");
+    EXPECT_EQ(textOf(gatherOutsideEcho(loopback(), {}, socket, patience())),
+              "lo has no default route (code 2)");
+    EXPECT_EQ(textOf(gatherOutsideEcho(notJoined(), {}, socket, patience())),
+              "lo is not joined to a network (code 2)");
+}
+
+TEST(GatherReach, WithoutARouterNothingIsSearched) {
+    EXPECT_EQ(textOf(gatherRouter(loopback(), patience())), "lo has no default route for IPv4 (code 2)");
+    EXPECT_EQ(textOf(gatherTranslation(loopback(), {}, std::nullopt, {}, patience())),
+              "there is no default route for IPv4 (code 2)");
+}
+
+TEST(GatherReach, EndpointsThatAreEmptyCannotBeTold) {
+    Endpoints none;
+    none.name = none.portalPlain = none.portalSecure = none.vendorHost = none.vendorUrl = "";
+    EXPECT_EQ(textOf(gatherNameAnswer(loopback(), {}, none, patience())),
+              "no endpoint is configured for names (code 9)");
+    EXPECT_EQ(textOf(gatherPortal(loopback(), {}, none, patience())),
+              "no endpoint is configured for the captive portal's probe (code 9)");
+    const auto contacts = gatherVendorService(loopback(), {}, none, patience());
+    ASSERT_TRUE(contacts);
+    EXPECT_EQ(textOf(contacts->reach), "no endpoint is configured for the vendor's service (code 9)");
+    EXPECT_EQ(textOf(contacts->retrieve), "no endpoint is configured for the vendor's service (code 9)");
+}
+
+TEST(GatherReach, ALinkWithoutNameServersHasNoAnswer) {
+    const auto answer = gatherNameAnswer(loopback(), {}, {}, patience());
+    ASSERT_TRUE(answer);
+    EXPECT_EQ(answer->why, "there is no name server");
+}
+
+class GatherWeb : public ::testing::Test {
+  protected:
+    static void SetUpTestSuite() { server_ = new WebServer; }
+    static void TearDownTestSuite() { delete server_; }
+
+    static Endpoints endpoints() {
+        Endpoints endpoints;
+        endpoints.portalPlain = server_->plain("/204");
+        endpoints.portalSecure = server_->secure("/204");
+        endpoints.vendorHost = server_->secure("").substr(std::string("https://").size());
+        endpoints.vendorUrl = server_->secure("/page");
+        endpoints.certificateAuthorities = server_->certificate();
+        return endpoints;
+    }
+    static PortalEvidence portal(const Endpoints& endpoints, const LinkSetup& setup = {}) {
+        const auto evidence = gatherPortal(loopback(), setup, endpoints, patience());
+        EXPECT_TRUE(evidence) << textOf(evidence);
+        return evidence ? *evidence : PortalEvidence();
+    }
+
+    inline static WebServer* server_ = nullptr;
+};
+
+TEST_F(GatherWeb, ThePortalsProbesBringStatusAndWhoAnswered) {
+    const PortalEvidence open = portal(endpoints());
+    EXPECT_EQ(open.plain.status, 204);
+    EXPECT_EQ(open.plain.server, IPAddress::fromText("127.0.0.1"));
+    EXPECT_EQ(open.declared.captive, std::nullopt);
+    Endpoints led = endpoints();
+    led.portalPlain = server_->plain("/redirect");
+    EXPECT_EQ(portal(led).plain.location, server_->plain("/login"));
+}
+
+TEST_F(GatherWeb, AnEmptyPageWaitsForTheSecureAnswer) {
+    Endpoints empty = endpoints();
+    empty.portalPlain = server_->plain("/empty");
+    const PortalEvidence evidence = portal(empty);
+    EXPECT_EQ(evidence.plain.status, 200);
+    EXPECT_EQ(evidence.plain.bodySize, 0U);
+    EXPECT_EQ(evidence.secure.status, 204);
+}
+
+TEST_F(GatherWeb, TheNetworksOwnWordIsAskedForOverASecureConnectionAlone) {
+    LinkSetup setup;
+    setup.portalApi = server_->secure("/api");
+    EXPECT_EQ(portal(endpoints(), setup).declared.captive, true);
+    setup.portalApi = server_->plain("/api");
+    EXPECT_EQ(portal(endpoints(), setup).declared.captive, std::nullopt);
+    setup.portalApi = "urn:ietf:params:capport:unrestricted";
+    EXPECT_TRUE(portal(endpoints(), setup).declared.unrestricted);
+}
+
+TEST_F(GatherWeb, TheVendorsServiceIsReachedAndItsContentRead) {
+    const auto contacts = gatherVendorService(loopback(), {}, endpoints(), patience());
+    ASSERT_TRUE(contacts && contacts->reach && contacts->retrieve);
+    EXPECT_EQ(contacts->reach->end, ServiceContact::End::reached);
+    EXPECT_EQ(contacts->retrieve->status, 200);
+    EXPECT_EQ(contacts->retrieve->body, "<html>please log in</html>");
+    EXPECT_FALSE(contacts->clock.beforeBuild);
+}
+
+TEST_F(GatherWeb, ACertificateThatNobodyKnowsIsTold) {
+    Endpoints stranger = endpoints();
+    stranger.certificateAuthorities.clear();
+    const auto contacts = gatherVendorService(loopback(), {}, stranger, patience());
+    ASSERT_TRUE(contacts && contacts->reach && contacts->retrieve);
+    EXPECT_EQ(contacts->reach->end, ServiceContact::End::badCertificate);
+    EXPECT_EQ(contacts->retrieve->end, ServiceContact::End::badCertificate);
+}
+
+TEST(GatherReach, WhoeverWaitsForASilentServerReturnsAtOnceWhenStopped) {
+    const SilentPlace portal, vendor;
+    Endpoints endpoints;
+    endpoints.portalPlain = "http://" + portal.hostAndPort() + "/";
+    endpoints.portalSecure = "https://" + portal.hostAndPort() + "/";
+    endpoints.vendorHost = vendor.hostAndPort();
+    endpoints.vendorUrl = "https://" + vendor.hostAndPort() + "/";
+    EXPECT_EQ(textOf(gatherPortal(loopback(), {}, endpoints, patience(std::chrono::minutes(5), portal.stop))),
+              "cancelled (code 8)");
+    const auto contacts =
+        gatherVendorService(loopback(), {}, endpoints, patience(std::chrono::minutes(5), vendor.stop));
+    ASSERT_TRUE(contacts);
+    EXPECT_EQ(textOf(contacts->reach), "cancelled (code 8)");
+    EXPECT_EQ(textOf(contacts->retrieve), "cancelled (code 8)");
+}
+
+TEST(FactRows, AReasonNamesWhatIsMissingAndWhatItCosts) {
+    setenv("DBUS_SYSTEM_BUS_ADDRESS", "unix:path=/no/such/bus", 1);
+    Sources sources;
+    Facts facts;
+    facts.link = loopback();
+    const FactRow& row = rowOf(Fact::saved);
+    row.gather({facts, {}, 0, sources, patience(), row.loss})(facts);
+    unsetenv("DBUS_SYSTEM_BUS_ADDRESS");
+
+    EXPECT_EQ(textOf(facts.saved),
+              "there is no message bus; without it nobody can tell the remembered networks (code 4)");
+}
+
+TEST(FactRows, WithoutALinkTheReasonIsTheLinks) {
+    Sources sources;
+    Facts facts;
+    facts.link = failure(Reason::noInterface, "no Wi-Fi interface");
+    for (const Fact fact : {Fact::nearby, Fact::saved, Fact::setup, Fact::gatewayEcho, Fact::survey}) {
+        const FactRow& row = rowOf(fact);
+        row.gather({facts, {}, 0, sources, patience(), row.loss})(facts);
+    }
+    EXPECT_EQ(textOf(facts.nearby), "no Wi-Fi interface (code 1)");
+    EXPECT_EQ(textOf(facts.saved), "no Wi-Fi interface (code 1)");
+    EXPECT_EQ(textOf(facts.survey), "no Wi-Fi interface (code 1)");
+    EXPECT_EQ(textOf(facts.gatewayEcho), "no Wi-Fi interface (code 1)");
+}
+
+/// A folder that stands for the root of a system with one driver of a Wi-Fi interface.
+class Driver : public ::testing::Test {
+  protected:
+    Driver() {
+        std::string pattern = ::testing::TempDir() + "/wpXXXXXX";
+        root_ = mkdtemp(pattern.data());
+    }
+    ~Driver() override { std::filesystem::remove_all(root_); }
+
+    void use(const std::string& driver) const {
+        const std::filesystem::path device = root_ + "/sys/class/net/lo/device";
+        std::filesystem::create_directories(device);
+        std::filesystem::remove(device / "driver");
+        std::filesystem::create_symlink("../../../bus/pci/drivers/" + driver, device / "driver");
+    }
+    void setParameter(const std::string& path, const std::string& content) const {
+        const std::filesystem::path file = root_ + "/sys/module/" + path;
+        std::filesystem::create_directories(file.parent_path());
+        std::ofstream(file) << content;
+    }
+    Known<bool> sharing() const { return gatherAirtimeSharing(loopback(), root_); }
+
+    std::string root_;
+};
+
+TEST_F(Driver, TellsWhetherItSharesAirtimeByItsSwitch) {
+    use("iwlwifi");
+    setParameter("iwlwifi/parameters/bt_coex_active", "Y\n");
+    EXPECT_EQ(*sharing(), true);
+    setParameter("iwlwifi/parameters/bt_coex_active", "N\n");
+    EXPECT_EQ(*sharing(), false);
+    use("ath9k");
+    setParameter("ath9k/parameters/btcoex_enable", "1\n");
+    EXPECT_EQ(*sharing(), true);
+}
+
+TEST_F(Driver, WithoutASwitchIsNoGuess) {
+    EXPECT_EQ(textOf(sharing()),
+              "the driver (unknown) does not tell whether it shares airtime with Bluetooth (code 5)");
+    use("iwlwifi");
+    EXPECT_EQ(textOf(sharing()),
+              "the driver iwlwifi does not tell whether it shares airtime with Bluetooth (code 5)");
+    use("mt7921e");
+    setParameter("iwlwifi/parameters/bt_coex_active", "Y\n");
+    EXPECT_EQ(textOf(sharing()),
+              "the driver mt7921e does not tell whether it shares airtime with Bluetooth (code 5)");
+}
+
+}  // namespace
+}  // namespace wp
