@@ -221,16 +221,6 @@ TEST(Session, AnswersWhatWaitsForSomebodySilentAtOnceWhenItIsCancelled) {
     EXPECT_EQ(kCancelledCode, testAnswer(conversation.answer(2)).error.value_or(Error()).code);
 }
 
-TEST(Session, GivesSomebodySilentUpByItself) {
-    const SilentBus bus;
-    Conversation conversation;
-
-    conversation.say("{\"id\":1,\"request\":\"test\",\"test\":19}\n");
-
-    const DiagnosticsTestResponse response = testAnswer(conversation.answer(1));
-    EXPECT_TRUE(response.error || response.results);
-}
-
 TEST(Session, EndsInTheMiddleOfItsWorkWhenTheWireIsClosed) {
     Conversation conversation;
 
