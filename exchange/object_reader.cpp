@@ -42,6 +42,15 @@ ArrayPointer readArray(const Value& json, const Place& place) {
     place.refuse("must be an array");
 }
 
+Flags readFlags(const Value& json, const Place& place) {
+    const auto* object = json.as<DictionaryPointer>();
+    if (!object) place.refuse("must be an object");
+    Flags flags;
+    for (const auto& [name, value] : (*object)->entries())
+        flags.emplace(name, readFlag(value, Place(place, name)));
+    return flags;
+}
+
 ObjectReader::ObjectReader(const Value& json, const Place& place) : place_(place) {
     const auto* object = json.as<DictionaryPointer>();
     if (!object) place.refuse("must be an object");

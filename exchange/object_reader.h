@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <map>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -17,6 +18,9 @@ std::int64_t readInteger(const Value& json, const Place& place, std::int64_t lea
 double readNumber(const Value& json, const Place& place);
 std::string readText(const Value& json, const Place& place);
 ArrayPointer readArray(const Value& json, const Place& place);
+/// An object of flags by name, such as a device's capabilities.
+using Flags = std::map<std::string, bool, std::less<>>;
+Flags readFlags(const Value& json, const Place& place);
 
 /// Reads one JSON object field by field; what no field asked for is refused in the end. Every function throws
 /// `Refused`.

@@ -63,15 +63,6 @@ RecordedPowerEvent readEvent(const Value& json, const Place& place) {
     return event;
 }
 
-std::map<std::string, bool, std::less<>> readCapabilities(const Value& json, const Place& place) {
-    const auto* object = json.as<DictionaryPointer>();
-    if (!object) place.refuse("must be an object");
-    std::map<std::string, bool, std::less<>> capabilities;
-    for (const auto& [name, answer] : (*object)->entries())
-        capabilities.emplace(name, readFlag(answer, Place(place, name)));
-    return capabilities;
-}
-
 /// Before anything else is looked at, so that a file of another kind or age is called that.
 void checkFormat(ObjectReader& reader) {
     Place formatPlace(reader.place(), "format");
@@ -90,7 +81,7 @@ Recording decodeRecording(const Value& json) {
     if (const Value* text = reader.find("description"))
         recording.description = readText(*text, Place(top, "description"));
     if (const Value* capabilities = reader.find("capabilities"))
-        recording.capabilities = readCapabilities(*capabilities, Place(top, "capabilities"));
+        recording.capabilities = readFlags(*capabilities, Place(top, "capabilities"));
     if (const Value* automation = reader.find("automation"))
         recording.automation = readFlag(*automation, Place(top, "automation"));
     if (const Value* wifi = reader.find("wifi")) recording.wifi = decodeWiFi(*wifi, Place(top, "wifi"));

@@ -1,7 +1,6 @@
 #pragma once
 
 #include <chrono>
-#include <map>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -10,6 +9,7 @@
 
 #include "exchange/codec.h"
 #include "exchange/json_reader.h"
+#include "exchange/object_reader.h"
 
 namespace wp {
 
@@ -32,7 +32,7 @@ struct RecordedPowerEvent {
 /// device that is switched on, not connected, no capability, no automation, no answers, no events.
 struct Recording {
     std::string description;
-    std::map<std::string, bool, std::less<>> capabilities;
+    Flags capabilities;
     bool automation = false;
     WiFiDescription wifi;
     std::vector<DiagnosticsStatusResponse> status;  ///< one a query; the last serves all later ones

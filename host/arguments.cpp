@@ -113,10 +113,18 @@ class RunOptionsReader {
             if (words_[next_] == "--help" || words_[next_] == "-h") return true;
             readOne(options);
         }
+        if (options.showEndpoints) refuseWithoutRun();
         return false;
     }
 
   private:
+    void refuseWithoutRun() const {
+        for (const std::string& name : seen_) {
+            if (name == "--show-endpoints" || name == "--config" || name == "--interface") continue;
+            refuse(name + ": not together with --show-endpoints, which ends without a run");
+        }
+    }
+
     void readOne(RunOptions& options) {
         std::string word = words_[next_++];
         if (word.rfind("--", 0) != 0)
@@ -166,6 +174,9 @@ void refuseConflicts(const RunOptions& options) {
     }
     if (options.replayFile && options.demo)
         refuse("--demo: not together with --replay; a run replays one recording");
+    if (options.interfaceName && (options.replayFile || options.demo))
+        refuse("--interface: not together with " + std::string(options.demo ? "--demo" : "--replay") +
+               "; a recording states its devices itself");
     if (options.recordFile == "-") refuse("--record: \"-\" is no file; standard output carries the result");
     if (options.automationFile == "-")
         refuse("--automation: \"-\" is no file; standard output carries the result");
@@ -228,7 +239,7 @@ std::string helpText() {
            "  wifi-profile --help, --version\n"
            "\n"
            "exit status: 0 the run is complete; 2 unusable arguments or files; 12 to 17 the run ended\n"
-           "with status code -2 to -7; 3 the user left; 130 or 143 interrupted; 1 anything else\n";
+           "with status code -2 to -7; 3 the user left; 129, 130 or 143 interrupted; 1 anything else\n";
 }
 
 std::string runHelpText() {

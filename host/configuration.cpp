@@ -1,48 +1,57 @@
 #include "host/configuration.h"
 
+#include <filesystem>
+#include <variant>
+
 #include "exchange/object_reader.h"
 #include "host/exit.h"
-#include "host/files.h"
+#include "host/service_program.h"
 
 namespace wp::host {
 namespace {
 
-std::map<std::string, bool, std::less<>> readCapabilities(const Value& json, const Place& place) {
-    const DictionaryPointer* flags = json.as<DictionaryPointer>();
-    if (!flags) place.refuse("must be an object of flags by name");
-    std::map<std::string, bool, std::less<>> capabilities;
-    for (const auto& [name, value] : (*flags)->entries())
-        capabilities.emplace(name, readFlag(value, Place(place, name)));
-    return capabilities;
+/// The service's first line on standard error, without its own name.
+std::string firstLine(const std::string& text) {
+    const std::string name = kServiceFileName + std::string(": ");
+    std::string line = text.substr(0, text.find('\n'));
+    return line.starts_with(name) ? line.substr(name.size()) : line;
 }
 
-Configuration readObject(const Value& json) {
-    Place top;
-    ObjectReader reader(json, top);
-    Configuration configuration;
-    if (const Value* capabilities = reader.find("capabilities"))
-        configuration.capabilities = readCapabilities(*capabilities, Place(top, "capabilities"));
-    for (const char* section : {"endpoints", "vendors", "thresholds"}) {
-        const Value* value = reader.find(section);
-        if (!value) continue;
-        if (!value->as<DictionaryPointer>()) Place(top, section).refuse("must be an object");
-        configuration.concernsService = true;
-    }
-    reader.finish();
-    return configuration;
+/// What the service prints of its configuration when it is called with the option.
+std::string shown(const std::string& option, const std::optional<std::string>& named) {
+    const std::string service = serviceProgram();
+    if (!std::filesystem::exists(service)) fail(service + ": not found; it reads the configuration");
+    std::vector<std::string> arguments = {option};
+    if (named) arguments.insert(arguments.end(), {"--config", *named});
+    const ProgramOutput printed = runProgram(service, arguments);
+    if (printed.status == exit_status::ok) return printed.standardOutput;
+    const std::string line = firstLine(printed.standardError);
+    const bool isNamed = named && line.starts_with(*named + ": ");
+    if (printed.status == exit_status::unusable) refuse((isNamed ? "--config: " : "configuration: ") + line);
+    fail(service + ": cannot read the configuration: " +
+         (line.empty() ? "it ended with status " + std::to_string(printed.status) : line));
 }
 
 }  // namespace
 
-Configuration readConfiguration(const std::string& file) {
-    std::string place = "--config: " + file + ": ";
-    std::variant<Value, Refusal> json = readJSON(readFile("--config", file));
-    if (const Refusal* refusal = std::get_if<Refusal>(&json)) refuse(place + refusal->text());
+Configuration readConfiguration(const std::optional<std::string>& named) {
+    const auto json = readJSON(shown("--show-host-part", named));
+    Configuration configuration;
     try {
-        return readObject(std::get<Value>(json));
+        if (const Refusal* refusal = std::get_if<Refusal>(&json)) throw Refused(*refusal);
+        const Place top;
+        ObjectReader object(std::get<Value>(json), top);
+        configuration.capabilities = readFlags(object.need("capabilities"), Place(top, "capabilities"));
+        if (const auto* thresholds = object.need("thresholds").as<DictionaryPointer>())
+            configuration.thresholds = *thresholds;
     } catch (const Refused& refused) {
-        refuse(place + refused.what());
+        fail(serviceProgram() + ": tells the configuration in a form of its own: " + refused.what());
     }
+    return configuration;
+}
+
+std::string contactedEndpoints(const std::optional<std::string>& named) {
+    return shown("--show-endpoints", named);
 }
 
 bool StatedCapabilities::booleanAnswer(std::string_view capability) const {

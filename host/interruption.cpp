@@ -23,6 +23,9 @@ sigset_t watchedSignals() {
     sigemptyset(&signals);
     sigaddset(&signals, SIGINT);
     sigaddset(&signals, SIGTERM);
+    // A program that was started to outlive its terminal (nohup) has it ignored, and a watched signal is not.
+    struct sigaction hangUp {};
+    if (sigaction(SIGHUP, nullptr, &hangUp) == 0 && hangUp.sa_handler != SIG_IGN) sigaddset(&signals, SIGHUP);
     return signals;
 }
 

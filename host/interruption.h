@@ -8,9 +8,10 @@
 
 namespace wp::host {
 
-/// Watches for what breaks a run off: SIGINT, SIGTERM and the end of the time that it was given. The two
-/// signals are blocked in the thread that makes the watcher and in all threads made later, and taken by a
-/// thread of the watcher's own, so that they work while any other thread hangs.
+/// Watches for what breaks a run off: SIGINT, SIGTERM, SIGHUP (unless it was ignored from the start) and the
+/// end of the time that it was given. The signals are blocked in the thread that makes the watcher and in all
+/// threads made later, and taken by a thread of the watcher's own, so that they work while any other thread
+/// hangs.
 class Interruption {
   public:
     struct Actions {

@@ -94,8 +94,10 @@ Preparation prepare(const RunOptions& options) {
     Preparation prepared;
     prepared.locale = localeOf(options);
     prepared.parameters = requestParameters(options);
-    if (options.configFile) prepared.configuration = readConfiguration(*options.configFile);
     prepared.recording = recordingOf(options);
+    // A replay has its capabilities from the recording; a file that was named is read all the same.
+    if (!prepared.recording || options.configFile)
+        prepared.configuration = readConfiguration(options.configFile);
     prepared.screen = chooseScreen(
         options.screen, {hasTerminal(), asksForList(*prepared.parameters), options.remote.has_value()});
     prepared.script = scriptOf(options);

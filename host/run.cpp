@@ -9,6 +9,7 @@
 #include <optional>
 
 #include "host/automation_file.h"
+#include "host/configuration.h"
 #include "host/diagnostics_log.h"
 #include "host/exit.h"
 #include "host/extension_module.h"
@@ -19,7 +20,6 @@
 #include "host/preparation.h"
 #include "host/progress_client.h"
 #include "host/result_document.h"
-#include "host/service_program.h"
 #include "host/services.h"
 #include "host/transcript.h"
 #include "platform/activity.h"
@@ -212,8 +212,7 @@ void Run::writeResult() {
 }
 
 int showEndpoints(const RunOptions& options) {
-    if (options.configFile) readConfiguration(*options.configFile);
-    std::string endpoints = contactedEndpoints(options.configFile.value_or(""));
+    std::string endpoints = contactedEndpoints(options.configFile);
     if (std::optional<std::string> error = writeAll(STDOUT_FILENO, endpoints))
         fail("standard output: cannot be written: " + *error);
     return exit_status::ok;

@@ -7,7 +7,6 @@
 #include <unistd.h>
 
 #include <cerrno>
-#include <filesystem>
 
 #include "host/exit.h"
 #include "host/extension_module.h"
@@ -17,7 +16,6 @@ extern char** environ;
 namespace wp::host {
 namespace {
 
-constexpr const char* kServiceFileName = "wifi-profile-service";
 constexpr int kCannotStart = 127;
 
 /// A place in memory for what a program prints.
@@ -47,10 +45,6 @@ int exitStatus(pid_t process) {
     return WIFEXITED(status) ? WEXITSTATUS(status) : exit_status::signalBase + WTERMSIG(status);
 }
 
-std::string firstLine(const std::string& text) {
-    return text.substr(0, text.find('\n'));
-}
-
 }  // namespace
 
 std::string serviceProgram() {
@@ -78,20 +72,6 @@ ProgramOutput runProgram(const std::string& path, const std::vector<std::string>
     result.standardOutput = output.text();
     result.standardError = error.text();
     return result;
-}
-
-std::string contactedEndpoints(const std::string& configurationFile) {
-    if (!std::filesystem::exists(serviceProgram()))
-        fail(serviceProgram() + ": not found; it knows what a live run contacts");
-    std::vector<std::string> arguments = {"--show-endpoints"};
-    if (!configurationFile.empty()) arguments.insert(arguments.end(), {"--config", configurationFile});
-    ProgramOutput printed = runProgram(serviceProgram(), arguments);
-    if (printed.status == exit_status::ok) return printed.standardOutput;
-    if (printed.status == exit_status::unusable)
-        refuse("--show-endpoints: " + firstLine(printed.standardError));
-    fail(serviceProgram() + ": cannot tell the endpoints: " +
-         (printed.standardError.empty() ? "it ended with status " + std::to_string(printed.status)
-                                        : firstLine(printed.standardError)));
 }
 
 }  // namespace wp::host

@@ -34,12 +34,11 @@ class ReplayServices final : public Services {
     bool isAutomated_;
 };
 
-LiveServiceOptions liveOptions(const RunOptions& options, const Preparation& prepared, DiagnosticsLog& log) {
+LiveServiceOptions liveOptions(const RunOptions& options, DiagnosticsLog& log) {
     LiveServiceOptions live;
     live.program = serviceProgram();
     if (options.interfaceName) live.arguments = {"--interface", *options.interfaceName};
-    if (prepared.configuration.concernsService)
-        live.arguments.insert(live.arguments.end(), {"--config", *options.configFile});
+    if (options.configFile) live.arguments.insert(live.arguments.end(), {"--config", *options.configFile});
     live.note = [&log](std::string_view text) { log.note(text); };
     return live;
 }
@@ -47,7 +46,8 @@ LiveServiceOptions liveOptions(const RunOptions& options, const Preparation& pre
 class LiveServices final : public Services {
   public:
     LiveServices(const RunOptions& options, const Preparation& prepared, DiagnosticsLog& log)
-        : service_(liveOptions(options, prepared, log)), capabilities_(prepared.configuration.capabilities) {}
+        : service_(liveOptions(options, log)),
+          capabilities_(prepared.configuration.capabilities) {}
 
     DiagnosticsClient& diagnosticsClient() override { return service_.diagnostics(); }
     WiFiManagerService& wifiManager() override { return service_.wifi(); }

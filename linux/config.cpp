@@ -188,7 +188,9 @@ void readTop(const Value& json, Config& config) {
     if (const Value* value = reader.find("thresholds"))
         readThresholds(*value, Place(top, "thresholds"), config.thresholds);
     if (const Value* value = reader.find("vendors")) readVendors(*value, Place(top, "vendors"), config);
-    reader.find("capabilities");
+    if (const Value* value = reader.find("capabilities"))
+        for (const auto& [name, isThere] : readFlags(*value, Place(top, "capabilities")))
+            config.capabilities[name] = isThere;
     reader.finish();
 }
 
@@ -243,6 +245,20 @@ std::string endpointsAsJson(const Config& config) {
     const DictionaryPointer endpoints = Dictionary::make();
     for (const EndpointKey& each : kEndpointKeys) endpoints->setValue(each.key, config.endpoints.*each.place);
     return jsonText(Dictionary::make({{"endpoints", endpoints}}), JSONStyle::indented);
+}
+
+std::string hostPartAsJson(const Config& config) {
+    const DictionaryPointer capabilities =
+        Dictionary::make({config.capabilities.begin(), config.capabilities.end()});
+    const auto& [bluetooth, saved, congestion] = config.thresholds;
+    const DictionaryPointer thresholds = Dictionary::make({{"connectedBluetooth", bluetooth.connected},
+                                                           {"pairedBluetooth", bluetooth.paired},
+                                                           {"savedNetworks", saved.count},
+                                                           {"advertisedLoad", congestion.advertisedLoad},
+                                                           {"channelLoad", congestion.load},
+                                                           {"overlap", congestion.overlap}});
+    return jsonText(Dictionary::make({{"capabilities", capabilities}, {"thresholds", thresholds}}),
+                    JSONStyle::indented);
 }
 
 std::optional<HostAndPort> hostAndPort(std::string_view text) {

@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "exchange/json_reader.h"
+#include "exchange/object_reader.h"
 #include "service/settings.h"
 
 namespace wp {
@@ -31,6 +32,7 @@ struct Config {
     Endpoints endpoints;
     Thresholds thresholds;
     Vendors vendors;
+    Flags capabilities;             ///< the device's, by name; the host asks for them
     std::string peerLinkIndicator;  ///< a file that holds 1 while the maker's peer link is in real-time mode
 
     /// What the verdicts go by.
@@ -41,8 +43,8 @@ struct Config {
 };
 
 /// Takes over what the JSON text sets: an object with the objects "endpoints", "vendors", "thresholds" and
-/// "capabilities" (the last is the host's), each of which may be left out, as may each key in them. Refused,
-/// with the place: unknown keys, values of another kind or beyond their bounds. *Any* thread.
+/// "capabilities", each of which may be left out, as may each key in them. Refused, with the place: unknown
+/// keys, values of another kind or beyond their bounds. *Any* thread.
 std::optional<Refusal> applyConfig(std::string_view json, Config& config);
 
 /// Where configurations lie: the makers' data, the system's and the user's. \param home the user's folder of
@@ -55,6 +57,8 @@ std::variant<Config, std::string> loadConfig(const std::vector<std::string>& fil
 
 /// The endpoints as JSON, in the form in which a configuration sets them.
 std::string endpointsAsJson(const Config& config);
+/// What the host asks for, capabilities and all thresholds, in the same form.
+std::string hostPartAsJson(const Config& config);
 
 /// "HOST:PORT" in its parts; a host that is an IPv6 address stands in brackets. Nothing for any other form.
 struct HostAndPort {

@@ -15,24 +15,27 @@
 namespace {
 
 constexpr const char* kUsage =
-    "usage: wifi-profile-service [--interface NAME] [--config FILE] [--show-endpoints]\n"
+    "usage: wifi-profile-service [--interface NAME] [--config FILE] [--show-endpoints] [--show-host-part]"
+    "\n"
     "\n"
     "Answers the questions of wifi-profile about the Wi-Fi of this machine. It is started by wifi-profile, "
     "with a\n"
     "connected socket as descriptor 3.\n"
     "\n"
-    "  --interface NAME  the Wi-Fi interface to look at\n"
-    "  --config FILE     endpoints, vendors and thresholds, over those of the system and the user\n"
-    "  --show-endpoints  prints whom the tests contact, and ends\n"
-    "  --help            this text\n"
-    "  --version         the version\n";
+    "  --interface NAME     the Wi-Fi interface to look at\n"
+    "  --config FILE        a configuration, over those of the system and the user\n"
+    "  --show-endpoints     prints whom the tests contact, and ends\n"
+    "  --show-host-part     prints the device's capabilities and the thresholds, and ends\n"
+    "  --help               this text\n"
+    "  --version            the version\n";
 
 constexpr int kUnusable = 2;
 
 struct Options {
     std::optional<std::string> interfaceName;
     std::string config;
-    bool showEndpoints = false;
+    /// What is printed in place of answering questions.
+    std::string (*shown)(const wp::Config&) = nullptr;
 };
 
 /// The configuration, or the line that says what is wrong with it.
@@ -63,7 +66,9 @@ std::variant<Options, int> readOptions(int count, char** arguments) {
         } else if (argument == "--config" && i + 1 < count) {
             options.config = arguments[++i];
         } else if (argument == "--show-endpoints") {
-            options.showEndpoints = true;
+            options.shown = wp::endpointsAsJson;
+        } else if (argument == "--show-host-part") {
+            options.shown = wp::hostPartAsJson;
         } else {
             const char* const what = argument == "--interface" ? "needs a name"
                                      : argument == "--config"  ? "needs a file"
@@ -92,8 +97,8 @@ int main(int count, char** arguments) {
         std::fprintf(stderr, "wifi-profile-service: %s\n", fault->c_str());
         return kUnusable;
     }
-    if (options.showEndpoints) {
-        std::puts(wp::endpointsAsJson(std::get<wp::Config>(config)).c_str());
+    if (options.shown != nullptr) {
+        std::puts(options.shown(std::get<wp::Config>(config)).c_str());
         return 0;
     }
     if (!isSocket(wp::kWireDescriptor)) {

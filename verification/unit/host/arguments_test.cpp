@@ -19,52 +19,32 @@ std::string refusalOf(const std::vector<std::string>& words) {
 }
 
 TEST(Arguments, EveryOptionOfRunIsTakenOver) {
-    Arguments arguments = parseArguments({"run",
-                                          "--max-scan-cache-age",
-                                          "1.5",
-                                          "--list",
-                                          "--network",
-                                          "Office",
-                                          "--replay",
-                                          "a.json",
-                                          "--record",
-                                          "b.json",
-                                          "--anonymise",
-                                          "--interface",
-                                          "wlan1",
-                                          "--timeout",
-                                          "2.5",
-                                          "--config",
-                                          "c.json",
-                                          "--show-endpoints",
-                                          "--screen",
-                                          "headless",
-                                          "--remote",
-                                          "down select",
-                                          "--transcript",
-                                          "t",
-                                          "--automation",
-                                          "p.json",
-                                          "--locale",
-                                          "de",
-                                          "--output=o.json",
-                                          "--format",
-                                          "text",
-                                          "--extension",
-                                          "x.so"});
+    Arguments arguments = parseArguments({"run",         "--max-scan-cache-age",
+                                          "1.5",         "--list",
+                                          "--network",   "Office",
+                                          "--record",    "b.json",
+                                          "--anonymise", "--interface",
+                                          "wlan1",       "--timeout",
+                                          "2.5",         "--config",
+                                          "c.json",      "--screen",
+                                          "headless",    "--remote",
+                                          "down select", "--transcript",
+                                          "t",           "--automation",
+                                          "p.json",      "--locale",
+                                          "de",          "--output=o.json",
+                                          "--format",    "text",
+                                          "--extension", "x.so"});
 
     const RunOptions& run = arguments.run;
     EXPECT_EQ(arguments.command, Command::run);
     EXPECT_EQ(run.maxScanCacheAge, "1.5");
     EXPECT_TRUE(run.list);
     EXPECT_EQ(run.network, "Office");
-    EXPECT_EQ(run.replayFile, "a.json");
     EXPECT_EQ(run.recordFile, "b.json");
     EXPECT_TRUE(run.anonymise);
     EXPECT_EQ(run.interfaceName, "wlan1");
     EXPECT_EQ(run.timeout, std::chrono::milliseconds(2500));
     EXPECT_EQ(run.configFile, "c.json");
-    EXPECT_TRUE(run.showEndpoints);
     EXPECT_EQ(run.screen, ScreenChoice::headless);
     EXPECT_EQ(run.remote, "down select");
     EXPECT_EQ(run.transcriptFile, "t");
@@ -73,6 +53,11 @@ TEST(Arguments, EveryOptionOfRunIsTakenOver) {
     EXPECT_EQ(run.outputFile, "o.json");
     EXPECT_EQ(run.format, OutputFormat::text);
     EXPECT_EQ(run.extension, "x.so");
+}
+
+TEST(Arguments, ARecordingAndTheEndpointsAreAskedForAlone) {
+    EXPECT_EQ(parseArguments({"run", "--replay", "a.json"}).run.replayFile, "a.json");
+    EXPECT_TRUE(parseArguments({"run", "--config", "c.json", "--show-endpoints"}).run.showEndpoints);
 }
 
 TEST(Arguments, ARunWithoutOptionsIsLiveWithoutAListAndWritesJSON) {
@@ -137,6 +122,14 @@ TEST(Arguments, ARequestExcludesEachOfItsShorthands) {
 TEST(Arguments, OptionsThatNeedOneAnotherAreRefusedAlone) {
     EXPECT_EQ(refusalOf({"run", "--replay", "a", "--demo"}),
               "--demo: not together with --replay; a run replays one recording");
+    EXPECT_EQ(refusalOf({"run", "--replay", "a", "--interface", "wlan1"}),
+              "--interface: not together with --replay; a recording states its devices itself");
+    EXPECT_EQ(refusalOf({"run", "--interface", "wlan1", "--demo"}),
+              "--interface: not together with --demo; a recording states its devices itself");
+    EXPECT_EQ(refusalOf({"run", "--show-endpoints", "--replay", "a"}),
+              "--replay: not together with --show-endpoints, which ends without a run");
+    EXPECT_EQ(refusalOf({"run", "--output=o", "--show-endpoints"}),
+              "--output: not together with --show-endpoints, which ends without a run");
     EXPECT_EQ(refusalOf({"run", "--anonymise"}),
               "--anonymise: needs --record FILE; it changes what is recorded");
     EXPECT_EQ(refusalOf({"run", "--record", "-"}),

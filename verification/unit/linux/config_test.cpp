@@ -78,6 +78,26 @@ TEST(Config, TheEndpointsThatAreShownAreAConfigurationThemselves) {
     EXPECT_EQ(read.endpoints.vendorUrl, Endpoints().vendorUrl);
 }
 
+TEST(Config, TheHostsPartIsTakenOverOneByOneAndShown) {
+    Config config = Config::defaults();
+    EXPECT_FALSE(applyConfig(R"({"capabilities": {"wapi": false, "other": true}})", config));
+    EXPECT_FALSE(
+        applyConfig(R"({"capabilities": {"wapi": true}, "thresholds": {"channelLoad": 0.25}})", config));
+    EXPECT_EQ(config.capabilities, (Flags{{"other", true}, {"wapi", true}}));
+    Config read = Config::defaults();
+    EXPECT_FALSE(applyConfig(hostPartAsJson(config), read));
+    EXPECT_EQ(read.capabilities, config.capabilities);
+    EXPECT_EQ(read.thresholds.congestion.load, 0.25);
+    EXPECT_EQ(hostPartAsJson(read), hostPartAsJson(config));
+    EXPECT_EQ(refusalOf(R"({"capabilities": {"wapi": 1}})"), "capabilities.wapi: must be true or false");
+}
+
+TEST(Config, WhereTheyLieIsTheSystemsFirstAndTheUsersLast) {
+    EXPECT_EQ(configFiles("/home/a/.config"),
+              (std::vector<std::string>{"/etc/wifi-profile/vendors.json", "/etc/wifi-profile/config.json",
+                                        "/home/a/.config/wifi-profile/config.json"}));
+}
+
 TEST(Config, TheDataFileForMakersThatShipsIsAcceptable) {
     Config config = Config::defaults();
     std::ifstream file(WP_SOURCE_DIR "/resources/vendors.json");

@@ -1,0 +1,73 @@
+#include "host/configuration.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+
+#include "host/exit.h"
+
+namespace wp::host {
+namespace {
+
+/// A user's folder of configurations, in place of the one of whoever runs the tests.
+class UsersConfiguration : public testing::Test {
+  protected:
+    void SetUp() override {
+        std::string pattern = testing::TempDir() + "/wpXXXXXX";
+        folder_ = mkdtemp(pattern.data());
+        std::filesystem::create_directory(folder_ + "/wifi-profile");
+        setenv("XDG_CONFIG_HOME", folder_.c_str(), 1);
+    }
+    void TearDown() override {
+        unsetenv("XDG_CONFIG_HOME");
+        std::filesystem::remove_all(folder_);
+    }
+
+    std::string write(const std::string& name, const std::string& json) const {
+        std::ofstream(folder_ + "/" + name) << json;
+        return folder_ + "/" + name;
+    }
+    static std::string refusalOf(const std::optional<std::string>& named) {
+        try {
+            readConfiguration(named);
+        } catch (const Exit& exit) {
+            EXPECT_EQ(exit.status(), exit_status::unusable);
+            return exit.what();
+        }
+        return "";
+    }
+
+    std::string folder_;
+};
+
+TEST_F(UsersConfiguration, CountsWithoutAnOptionAndTheNamedFileWins) {
+    write("wifi-profile/config.json", R"({"capabilities": {"wapi": true, "other": true}})");
+    const std::string named = write("named.json", R"({"capabilities": {"other": false, "third": true},
+                                                 "thresholds": {"savedNetworks": 7}})");
+
+    EXPECT_EQ(readConfiguration(std::nullopt).capabilities, (Flags{{"other", true}, {"wapi", true}}));
+    EXPECT_EQ(readConfiguration(named).capabilities,
+              (Flags{{"other", false}, {"third", true}, {"wapi", true}}));
+    EXPECT_EQ(readConfiguration(named).thresholds->value("savedNetworks"), Value(7));
+    EXPECT_EQ(readConfiguration(named).thresholds->size(), 6u);
+}
+
+TEST_F(UsersConfiguration, IsRefusedWithFilePlaceAndReasonWhicheverPartIsWrong) {
+    const std::string named = write("named.json", R"({"endpoints": {"pingIPv4": "here"}})");
+    EXPECT_EQ(refusalOf(named), "--config: " + named + ": endpoints.pingIPv4: must be an IPv4 address");
+
+    const std::string users = write("wifi-profile/config.json", R"({"thresholds": {"pairedBluetooth": -1}})");
+    EXPECT_EQ(
+        refusalOf(std::nullopt),
+        "configuration: " + users + ": thresholds.pairedBluetooth: must be an integer from 0 to 100000");
+    EXPECT_EQ(refusalOf(folder_ + "/none"), refusalOf(std::nullopt));
+}
+
+TEST_F(UsersConfiguration, ThatIsNamedMustBeThere) {
+    EXPECT_EQ(refusalOf(folder_ + "/none"), "--config: " + folder_ + "/none: cannot be read");
+}
+
+}  // namespace
+}  // namespace wp::host
