@@ -69,6 +69,10 @@ class LiveDiagnosticsClient final : public DiagnosticsClient {
 class LiveRadio final : public WiFiRadio {
   public:
     using SendPower = std::function<void(bool)>;
+    using Expectation = std::shared_ptr<void>;
+
+    explicit LiveRadio(std::function<Expectation()> expectPowerChange)
+        : expectPowerChange_(std::move(expectPowerChange)) {}
 
     std::vector<std::string> devices() override { return description().devices; }
     bool power() override { return description().power; }
@@ -82,7 +86,15 @@ class LiveRadio final : public WiFiRadio {
             std::lock_guard lock(mutex_);
             sendPower = sendPower_;
         }
-        if (sendPower) sendPower(power);
+        if (!sendPower) return;
+        // Before the wish is sent: the change may come at once.
+        if (power != this->power() && expectPowerChange_) expect(expectPowerChange_());
+        sendPower(power);
+    }
+    /// Lets go of what was expected: what that wakes must not find the lock taken.
+    void expect(Expectation expectation) {
+        std::lock_guard lock(mutex_);
+        expected_.swap(expectation);
     }
 
     WiFiDescription description() const {
@@ -103,12 +115,15 @@ class LiveRadio final : public WiFiRadio {
             description_.power = power;
         }
         if (Queue* runLoop = runLoop_) runLoop->async([callbacks = callbacks_] { callbacks->call(); });
+        expect(nullptr);
     }
 
   private:
     mutable std::mutex mutex_;
     WiFiDescription description_{false, false, {}, false, {}};
     SendPower sendPower_;
+    const std::function<Expectation()> expectPowerChange_;
+    Expectation expected_;
     std::atomic<Queue*> runLoop_ = nullptr;
     std::shared_ptr<PowerCallbacks> callbacks_ = std::make_shared<PowerCallbacks>();
 };
@@ -154,13 +169,14 @@ class LiveWiFiManagerService final : public WiFiManagerService {
 
 /// Sends a wish for power; what keeps it from being fulfilled becomes a note.
 LiveRadio::SendPower powerSender(const std::shared_ptr<ServiceConnection>& connection,
+                                 const std::shared_ptr<LiveRadio>& radio,
                                  const std::function<void(std::string_view)>& note) {
-    return [weak = std::weak_ptr(connection), note](bool power) {
+    return [weak = std::weak_ptr(connection), weakRadio = std::weak_ptr(radio), note](bool power) {
         auto alive = weak.lock();
         if (!alive) return;
         WireRequest request = requestOf(Kind::setPower);
         request.power = power;
-        alive->tell(std::move(request), [note](const WireAnswer& answer) {
+        alive->tell(std::move(request), [weakRadio, note](const WireAnswer& answer) {
             std::optional<Error> error;
             try {
                 error = setPowerAnswer(answer);
@@ -168,6 +184,7 @@ LiveRadio::SendPower powerSender(const std::shared_ptr<ServiceConnection>& conne
                 error = notUnderstood(refused);
             }
             if (error && note) note("Wi-Fi could not be switched: " + error->text());
+            if (const auto live = error ? weakRadio.lock() : nullptr) live->expect(nullptr);
         });
     };
 }
@@ -178,20 +195,24 @@ class LiveService::Parts {
   public:
     explicit Parts(LiveServiceOptions given)
         : options(std::move(given)),
+          radio(std::make_shared<LiveRadio>(options.expectPowerChange)),
           connection(std::make_shared<ServiceConnection>(
               options.program, options.arguments,
               ServiceConnection::Handlers{[live = radio](bool power) { live->powerChanged(power); },
                                           options.note})),
           diagnostics(*connection, options),
           wifi(connection, radio, options) {
-        radio->setSender(powerSender(connection, options.note));
+        radio->setSender(powerSender(connection, radio, options.note));
     }
-    ~Parts() { radio->setSender(nullptr); }
+    ~Parts() {
+        radio->setSender(nullptr);
+        radio->expect(nullptr);
+    }
     Parts(const Parts&) = delete;
     Parts& operator=(const Parts&) = delete;
 
     const LiveServiceOptions options;
-    const std::shared_ptr<LiveRadio> radio = std::make_shared<LiveRadio>();
+    const std::shared_ptr<LiveRadio> radio;
     const std::shared_ptr<ServiceConnection> connection;
     LiveDiagnosticsClient diagnostics;
     LiveWiFiManagerService wifi;

@@ -21,6 +21,9 @@ struct LiveServiceOptions {
     std::chrono::milliseconds testDeadline{60'000};
     /// The same for everything that the service answers from what it knows.
     std::chrono::milliseconds queryDeadline{10'000};
+    /// Called when a change of power is asked for; what it returns is kept until the change came or could not be
+    /// made. May be empty. On the thread that asks.
+    std::function<std::shared_ptr<void>()> expectPowerChange;
     /// Called with each note of the service and with the reason when it is given up; on any thread.
     std::function<void(std::string_view)> note;
 };

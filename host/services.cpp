@@ -1,5 +1,6 @@
 #include "host/services.h"
 
+#include <chrono>
 #include <filesystem>
 #include <mutex>
 #include <optional>
@@ -34,19 +35,24 @@ class ReplayServices final : public Services {
     bool isAutomated_;
 };
 
-LiveServiceOptions liveOptions(const RunOptions& options, DiagnosticsLog& log) {
+/// A radio is up within a second of the switch; one that does not obey must not keep a script waiting for good.
+constexpr std::chrono::seconds kLongestPowerChange{10};
+
+LiveServiceOptions liveOptions(const RunOptions& options, MainQueue& mainQueue, DiagnosticsLog& log) {
     LiveServiceOptions live;
     live.program = serviceProgram();
     if (options.interfaceName) live.arguments = {"--interface", *options.interfaceName};
     if (options.configFile) live.arguments.insert(live.arguments.end(), {"--config", *options.configFile});
+    live.expectPowerChange = [&mainQueue] { return mainQueue.expectEvent(kLongestPowerChange); };
     live.note = [&log](std::string_view text) { log.note(text); };
     return live;
 }
 
 class LiveServices final : public Services {
   public:
-    LiveServices(const RunOptions& options, const Preparation& prepared, DiagnosticsLog& log)
-        : service_(liveOptions(options, log)),
+    LiveServices(const RunOptions& options, const Preparation& prepared, MainQueue& mainQueue,
+                 DiagnosticsLog& log)
+        : service_(liveOptions(options, mainQueue, log)),
           capabilities_(prepared.configuration.capabilities) {}
 
     DiagnosticsClient& diagnosticsClient() override { return service_.diagnostics(); }
@@ -101,7 +107,7 @@ std::unique_ptr<Services> answeringServices(const RunOptions& options, const Pre
     std::string service = serviceProgram();
     if (!std::filesystem::exists(service))
         fail(service + ": not found; a live run needs it beside the program (--replay and --demo do not)");
-    return std::make_unique<LiveServices>(options, prepared, log);
+    return std::make_unique<LiveServices>(options, prepared, mainQueue, log);
 }
 
 }  // namespace

@@ -14,15 +14,21 @@ MainQueue::~MainQueue() {
 }
 
 void MainQueue::async(Block block) {
-    add(std::chrono::milliseconds(0), {std::move(block), true});
+    add(std::chrono::milliseconds(0), {std::move(block), true, {}});
 }
 
 void MainQueue::after(std::chrono::milliseconds delay, Block block) {
-    add(delay, {std::move(block), true});
+    add(delay, {std::move(block), true, {}});
 }
 
 void MainQueue::scheduleEvent(std::chrono::milliseconds delay, Block block) {
-    add(delay, {std::move(block), false});
+    add(delay, {std::move(block), false, {}});
+}
+
+std::shared_ptr<void> MainQueue::expectEvent(std::chrono::milliseconds longest) {
+    std::shared_ptr<void> token(this, [](MainQueue* queue) { queue->wake(); });
+    add(longest, {[] {}, false, token});
+    return token;
 }
 
 void MainQueue::add(std::chrono::milliseconds delay, Entry entry) {
@@ -81,10 +87,9 @@ void MainQueue::runPending() {
 
 bool MainQueue::hasEventsToCome() const {
     std::lock_guard lock(mutex_);
-    auto isEvent = [](const Entry& entry) { return !entry.isWork; };
-    return std::any_of(ready_.begin(), ready_.end(), isEvent) ||
+    return std::any_of(ready_.begin(), ready_.end(), [](const Entry& entry) { return entry.isToCome(); }) ||
            std::any_of(delayed_.begin(), delayed_.end(),
-                       [&](const auto& item) { return isEvent(item.second); });
+                       [](const auto& item) { return item.second.isToCome(); });
 }
 
 std::optional<MainQueue::Clock::time_point> MainQueue::nextDeadline() const {

@@ -4,6 +4,7 @@
 #include <cstdint>
 #include <deque>
 #include <map>
+#include <memory>
 #include <mutex>
 #include <optional>
 
@@ -29,6 +30,10 @@ class MainQueue final : public Queue {
     /// Like `after` for something that comes from outside (a power switch, a timeout): not work that is
     /// waited for.
     void scheduleEvent(std::chrono::milliseconds delay, Block block);
+
+    /// An event from outside that nobody can date: it counts as still to come until the last copy of the token
+    /// goes, on any thread but before the queue does, or until the time is over. *Any* thread.
+    std::shared_ptr<void> expectEvent(std::chrono::milliseconds longest);
 
     /// Whether an event from outside is still to come.
     bool hasEventsToCome() const;
@@ -58,6 +63,10 @@ class MainQueue final : public Queue {
     struct Entry {
         Block block;
         bool isWork = true;
+        /// Of an expected event: gone when it came.
+        std::optional<std::weak_ptr<void>> token;
+
+        bool isToCome() const { return !isWork && !(token && token->expired()); }
     };
 
     void add(std::chrono::milliseconds delay, Entry entry);

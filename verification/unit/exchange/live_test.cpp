@@ -57,6 +57,7 @@ class Live : public testing::Test {
             notes_.emplace_back(text);
             noted_.notify_all();
         };
+        options.expectPowerChange = expectPowerChange_;
         service_ = std::make_unique<LiveService>(std::move(options));
     }
 
@@ -77,6 +78,7 @@ class Live : public testing::Test {
         return noted_.wait_for(lock, kLong, [&] { return notes_.size() >= count; });
     }
 
+    std::function<std::shared_ptr<void>()> expectPowerChange_;
     std::size_t descriptors_ = 0;
     std::mutex mutex_;
     std::condition_variable noted_;
@@ -266,6 +268,9 @@ TEST_F(Live, GivesTheServiceItsArgumentsAndTheWireAlone) {
 /// The Wi-Fi manager of a live service, on a main queue.
 class LiveWiFi : public Live {
   protected:
+    LiveWiFi() {
+        expectPowerChange_ = [this] { return mainQueue_.expectEvent(kLong); };
+    }
     bool connect() {
         client_ = service_->wifi().createClient(0);
         if (!client_) return false;
@@ -324,6 +329,30 @@ TEST_F(LiveWiFi, NotesWhyPowerCouldNotBeSet) {
     service_->diagnostics().queryStatus();
     EXPECT_EQ(notes(), std::vector<std::string>{"Wi-Fi could not be switched: blocked by hardware (code 6)"});
     EXPECT_EQ(client_->power(), 0);
+}
+
+TEST_F(LiveWiFi, ExpectsTheChangeOfPowerThatWasAskedForUntilItComes) {
+    start({"wifi", R"(answer:{"wifi":{"power":false}})", "setPower", "answer:{}", "status",
+           "answer:{\"status\":{}}\n{\"event\":{\"power\":true}}"});
+    ASSERT_TRUE(connect());
+    client_->setPower(1);
+    EXPECT_TRUE(mainQueue_.hasEventsToCome());
+    service_->diagnostics().queryStatus();
+    ASSERT_TRUE(runUntilCalls(1));
+    EXPECT_TRUE(mainQueue_.runUntil([&] { return !mainQueue_.hasEventsToCome(); }, Clock::now() + kLong));
+    EXPECT_TRUE(notes().empty());
+}
+
+TEST_F(LiveWiFi, ExpectsNoChangeWhereThereIsNoneOrNoneCanBe) {
+    start({"wifi", R"(answer:{"wifi":{"power":false}})", "setPower",
+           R"(answer:{"error":{"code":6,"message":"blocked by hardware"}})", "status",
+           R"(answer:{"status":{}})"});
+    ASSERT_TRUE(connect());
+    client_->setPower(0);
+    EXPECT_FALSE(mainQueue_.hasEventsToCome());
+    client_->setPower(1);
+    service_->diagnostics().queryStatus();
+    EXPECT_FALSE(mainQueue_.hasEventsToCome());
 }
 
 TEST_F(LiveWiFi, NeverCoversNewerNewsWithOlder) {

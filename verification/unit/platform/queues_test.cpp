@@ -62,6 +62,21 @@ TEST(MainQueue, DoesNotCountEventsFromOutsideAsWork) {
     EXPECT_FALSE(queue.hasEventsToCome());
 }
 
+TEST(MainQueue, AnExpectedEventIsToComeUntilItsTokenGoesOrItsTimeIsOver) {
+    Activity activity;
+    MainQueue queue(activity);
+
+    std::shared_ptr<void> came = queue.expectEvent(60'000ms);
+    EXPECT_TRUE(activity.idle());
+    EXPECT_TRUE(queue.hasEventsToCome());
+    std::thread elsewhere([&] { came.reset(); });
+    EXPECT_TRUE(queue.runUntil([&] { return !queue.hasEventsToCome(); }));
+    elsewhere.join();
+
+    std::shared_ptr<void> neverComes = queue.expectEvent(1ms);
+    EXPECT_TRUE(queue.runUntil([&] { return !queue.hasEventsToCome(); }));
+}
+
 TEST(MainQueue, DropsEverythingOnceItIsClosed) {
     Activity activity;
     MainQueue queue(activity);
