@@ -61,7 +61,7 @@ std::string readFile(const std::string& option, const std::string& path) {
 
 std::optional<std::filesystem::path> resourceFile(const std::filesystem::path& name) {
     std::filesystem::path program = programFolder();
-    for (const char* folder : {"resources", "../resources", "../share/wifi-profile"}) {
+    for (const char* folder : {"resources", "../resources", "../../share/wifi-profile"}) {
         std::filesystem::path candidate = (program / folder / name).lexically_normal();
         std::error_code error;
         if (std::filesystem::is_regular_file(candidate, error)) return candidate;
