@@ -15,11 +15,18 @@ constexpr std::array<std::string_view, 6> kKeptKeys{"AdoptedCountryCode", "IPv4C
                                                     "IPv6ConfigMethod",   "MarlixModelName",
                                                     "Security",           "SupportedPHYModes"};
 /// Info keys whose texts are network names, also of networks that nothing else mentions.
-constexpr std::array<std::string_view, 3> kNameKeys{"NetworkName", "SSID", "networkName"};
+constexpr std::array<std::string_view, 4> kNameKeys{"NetworkName", "SSID", "networkName", "ssid"};
+constexpr std::string_view kDetails = "Details", kDetailName = "ssid", kDetailPage = "url";
 
 template <std::size_t count>
 bool contains(const std::array<std::string_view, count>& keys, std::string_view key) {
     return std::find(keys.begin(), keys.end(), key) != keys.end();
+}
+
+/// A portal's page tells whose network it is and, behind its host, which device asks: the scheme alone stays.
+std::string hiddenPage(const std::string& url) {
+    const std::size_t end = url.find("://");
+    return (end == std::string::npos ? "" : url.substr(0, end + 3)) + "portal.example/";
 }
 
 /// Calls `visit(key, value)` for every entry of the value's dictionaries, at any depth.
@@ -100,8 +107,13 @@ class Anonymiser {
     void replaceIn(DiagnosticsTestResultPointer& result) {
         if (!result || !result->info) return;
         Dictionary::Entries entries = result->info->entries();
-        for (auto& [key, value] : entries)
-            if (!contains(kKeptKeys, key)) value = replaced(value);
+        for (auto& [key, value] : entries) {
+            if (key == kDetails) {
+                value = replacedInDetails(key, value);
+            } else if (!contains(kKeptKeys, key)) {
+                value = replaced(value);
+            }
+        }
         result = std::make_shared<const DiagnosticsTestResult>(
             DiagnosticsTestResult{result->result, result->didPass, Dictionary::make(std::move(entries))});
     }
@@ -123,6 +135,26 @@ class Anonymiser {
             return Dictionary::make(std::move(entries));
         }
         return replacedRecord(value);
+    }
+
+    /// Details hold names under one key alone; any other text may equal a name by chance and is a word of its own.
+    Value replacedInDetails(std::string_view key, const Value& value) {
+        if (const auto* text = value.as<std::string>()) {
+            if (key == kDetailName) return names_.replaced(*text);
+            return key == kDetailPage ? hiddenPage(*text) : addresses_.replacedWithin(*text);
+        }
+        if (const auto* array = value.as<ArrayPointer>(); array && *array) {
+            Array elements;
+            for (const Value& element : **array) elements.push_back(replacedInDetails(key, element));
+            return elements;
+        }
+        if (const auto* dictionary = value.as<DictionaryPointer>(); dictionary && *dictionary) {
+            Dictionary::Entries entries;
+            for (const auto& [inner, entry] : (*dictionary)->entries())
+                entries.emplace(inner, replacedInDetails(inner, entry));
+            return Dictionary::make(std::move(entries));
+        }
+        return value;
     }
 
     Value replacedRecord(const Value& value) {

@@ -73,6 +73,7 @@ PortalAnswer portalAnswer(const WebAnswer& answer, const WebRequest& request) {
     portal.server = answer.server;
     if (!portal.server && !request.addresses.empty()) portal.server = request.addresses.front();
     portal.why = answer.why;
+    portal.clockOffset = answer.clockOffset;
     return portal;
 }
 
@@ -90,7 +91,10 @@ Known<PortalDeclaration> askPortalApi(const Link& link, const LinkSetup& setup, 
     if (!answers) return answers.error();
     const WebAnswer& answer = answers->front();
     if (answer.end == WebAnswer::End::answered && answer.status == 200)
-        declaration.captive = captiveFromApi(answer.body);
+        if (const auto told = portalFromApi(answer.body)) {
+            declaration.captive = told->captive;
+            declaration.page = told->page;
+        }
     return declaration;
 }
 
@@ -106,6 +110,10 @@ ServiceContact contactOf(const WebAnswer& answer) {
     contact.why = answer.why;
     contact.status = answer.status;
     contact.body = answer.body;
+    contact.steps = answer.steps;
+    contact.fault = answer.fault;
+    contact.server = answer.server;
+    contact.clockOffset = answer.clockOffset;
     switch (answer.end) {
         case WebAnswer::End::answered:
             contact.end = ServiceContact::End::reached;
@@ -185,7 +193,12 @@ Known<NameAnswer> gatherNameAnswer(const Link& link, const LinkSetup& setup, con
     if (endpoints.nameWildcard.empty() && endpoints.name.empty()) return notConfigured("names");
     const std::string name =
         endpoints.nameWildcard.empty() ? endpoints.name : freshName(endpoints.nameWildcard);
-    return lookUpName(name, serversOf(link, setup), until.within(kNameTime));
+    const NameServerSet servers = serversOf(link, setup);
+    auto each = beside([&] { return askEachServer(name, servers, until.within(kNameTime)); });
+    Known<NameAnswer> answer = lookUpName(name, servers, until.within(kNameTime));
+    const auto answers = each.get();
+    if (answer && answers) answer->servers = *answers;
+    return answer;
 }
 
 Known<PortalEvidence> gatherPortal(const Link& link, const LinkSetup& setup, const Endpoints& endpoints,

@@ -115,11 +115,11 @@ void Session::handle(const std::string& line) {
 void Session::handleTest(const WireRequest& request) {
     const NumberedTest* const test = findTest(request.test);
     if (test == nullptr) {
-        return answerTest(request.id,
-                          failure(Reason::badConfiguration, "no test " + std::to_string(request.test)));
+        return answerTest(request.id, answerOf(failure(Reason::badConfiguration,
+                                                       "no test " + std::to_string(request.test))));
     }
     const Known<PhaseTopic> topic = topicOf(*test, request.configuration);
-    if (!topic) return answerTest(request.id, topic.error());
+    if (!topic) return answerTest(request.id, answerOf(topic.error()));
     std::shared_ptr<Phase> phase = phaseFor(*topic);
     waiting_[request.id] = WaitingTest{test, phase};
     phase->prepare(*test);
@@ -142,19 +142,12 @@ void Session::answerReadyTests() {
             ++each;
             continue;
         }
-        answerTest(each->first, judge(*waiting->test, waiting->phase->facts()));
+        answerTest(each->first, answerOf(*waiting->test, waiting->phase->facts()));
         each = waiting_.erase(each);
     }
 }
 
-void Session::answerTest(std::uint64_t id, const Outcome& outcome) {
-    DiagnosticsTestResponse response;
-    if (outcome) {
-        response.results.emplace().push_back(std::make_shared<DiagnosticsTestResult>(
-            DiagnosticsTestResult{outcome->result, outcome->didPass, outcome->info}));
-    } else {
-        response.error = outcome.error();
-    }
+void Session::answerTest(std::uint64_t id, const DiagnosticsTestResponse& response) {
     wire_.send(testAnswerLine(id, response));
 }
 
@@ -253,7 +246,7 @@ void Session::cancel() {
 }
 
 void Session::answerCancelled(std::uint64_t id, const Waiting& waiting) {
-    if (std::holds_alternative<WaitingTest>(waiting)) return answerTest(id, cancelledError());
+    if (std::holds_alternative<WaitingTest>(waiting)) return answerTest(id, answerOf(cancelledError()));
     if (std::holds_alternative<WaitingStatus>(waiting)) {
         wire_.send(statusAnswerLine(id, DiagnosticsStatusResponse{nullptr, cancelledError()}));
     } else {

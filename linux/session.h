@@ -11,6 +11,7 @@
 #include "linux/line_socket.h"
 #include "linux/phase.h"
 #include "linux/power_switch.h"
+#include "service/answer.h"
 
 namespace wp {
 
@@ -46,7 +47,7 @@ class Session {
 
     std::shared_ptr<Phase> phaseFor(const PhaseTopic& topic);
     void answerReadyTests();
-    void answerTest(std::uint64_t id, const Outcome& outcome);
+    void answerTest(std::uint64_t id, const DiagnosticsTestResponse& response);
     void answerCancelled(std::uint64_t id, const Waiting& waiting);
     void answerSetPower(std::uint64_t id, const std::optional<Error>& error);
     void finishStatus(std::uint64_t id, const Known<Link>& link);

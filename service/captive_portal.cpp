@@ -5,8 +5,12 @@ namespace {
 
 using End = PortalAnswer::End;
 
-PortalVerdict verdict(bool captive, std::string why) {
-    return {captive, std::move(why)};
+PortalVerdict open(std::string why) {
+    return {false, PortalKind::none, std::move(why)};
+}
+
+PortalVerdict portal(PortalKind kind, std::string why) {
+    return {true, kind, std::move(why)};
 }
 
 bool isRedirect(int status) {
@@ -19,18 +23,20 @@ bool opens(const PortalAnswer& secure) {
 
 Known<PortalVerdict> judgePlain(const PortalAnswer& plain, const PortalAnswer& secure) {
     const std::string status = std::to_string(plain.status);
-    if (plain.status == 204) return verdict(false, "open: status 204");
-    if (plain.status == 511) return verdict(true, "status 511");
+    if (plain.status == 204) return open("open: status 204");
+    if (plain.status == 511) return portal(PortalKind::status511, "status 511");
     if (isRedirect(plain.status))
-        return verdict(true, plain.location.empty() ? "suspected: status " + status + " to nowhere"
-                                                    : "redirected with status " + status);
+        return portal(PortalKind::redirect, plain.location.empty()
+                                                ? "suspected: status " + status + " to nowhere"
+                                                : "redirected with status " + status);
     // One byte is what some proxies add to an empty page.
     if (plain.status == 200 && plain.bodySize <= 1) {
-        if (opens(secure)) return verdict(false, "open: an empty page, and the secure probe got through");
+        if (opens(secure)) return open("open: an empty page, and the secure probe got through");
         return failure(Reason::timeout, "an empty page over HTTP and no answer over HTTPS");
     }
-    if (plain.status >= 200 && plain.status <= 399) return verdict(true, "suspected: status " + status);
-    if (opens(secure)) return verdict(false, "partial: status " + status + " over HTTP, HTTPS got through");
+    if (plain.status >= 200 && plain.status <= 399)
+        return portal(PortalKind::alteredPage, "suspected: status " + status);
+    if (opens(secure)) return open("partial: status " + status + " over HTTP, HTTPS got through");
     return failure(Reason::timeout, "status " + status + " over HTTP and no answer over HTTPS");
 }
 
@@ -46,15 +52,29 @@ Dictionary::Entries information(const SavedNetwork* network, bool seenSeveralAPs
 }  // namespace
 
 Known<PortalVerdict> judgePortal(const PortalEvidence& evidence) {
-    if (evidence.declared.unrestricted) return verdict(false, "the network says that it has no portal");
-    if (evidence.declared.captive)
-        return verdict(*evidence.declared.captive, "the network's own API says so");
+    if (evidence.declared.unrestricted) return open("the network says that it has no portal");
+    if (evidence.declared.captive) {
+        const std::string why = "the network's own API says so";
+        return *evidence.declared.captive ? portal(PortalKind::declared, why) : open(why);
+    }
     if (evidence.plain.end == End::answered) return judgePlain(evidence.plain, evidence.secure);
-    if (opens(evidence.secure)) return verdict(false, "partial: HTTPS got through, HTTP did not");
+    if (opens(evidence.secure)) return open("partial: HTTPS got through, HTTP did not");
     if (evidence.plain.server && evidence.plain.server->privateUse())
-        return verdict(false, "no Internet: the probe's name has the private address " +
-                                  evidence.plain.server->text() + ", and nothing answers there");
+        return open("no Internet: the probe's name has the private address " + evidence.plain.server->text() +
+                    ", and nothing answers there");
     return failure(Reason::timeout, "no probe was answered: " + evidence.plain.why);
+}
+
+std::optional<Connectivity> connectivityOf(const PortalEvidence& evidence) {
+    const auto judged = judgePortal(evidence);
+    if (judged && judged->captive) return Connectivity::portal;
+    const PortalAnswer& plain = evidence.plain;
+    const bool secure = opens(evidence.secure);
+    if (plain.end != End::answered) return secure ? Connectivity::partial : Connectivity::none;
+    if (plain.status == 204) return Connectivity::full;
+    const bool empty = plain.status == 200 && plain.bodySize <= 1;
+    if (secure) return empty ? Connectivity::full : Connectivity::partial;
+    return empty ? std::optional(Connectivity::partial) : std::nullopt;
 }
 
 Outcome isCaptive(const Known<PortalEvidence>& evidence, const Known<SavedNetworks>& saved,

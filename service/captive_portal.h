@@ -14,16 +14,18 @@ struct PortalAnswer {
     enum class End { answered, noAnswer };
     End end = End::noAnswer;
     int status = 0;
-    std::size_t bodySize = 0;         ///< as far as it was read
-    std::string location;             ///< of a redirect
-    std::optional<IPAddress> server;  ///< who answered
-    std::string why;                  ///< of no answer
+    std::size_t bodySize = 0;                   ///< as far as it was read
+    std::string location;                       ///< of a redirect
+    std::optional<IPAddress> server;            ///< who answered
+    std::string why;                            ///< of no answer
+    std::optional<std::int64_t> clockOffset{};  ///< s by which this device is ahead of the answer's date
 };
 
 /// What the network says of itself at the address that it names by DHCP or in its advertisements (RFC 8910).
 struct PortalDeclaration {
     bool unrestricted = false;    ///< named the address that means "no portal here"
     std::optional<bool> captive;  ///< what its API answered (RFC 8908); absent: no usable answer
+    std::string page{};           ///< where its API sends the user
 };
 
 /// What is known about a portal in front of the joined network.
@@ -33,11 +35,19 @@ struct PortalEvidence {
     PortalAnswer secure;  ///< over HTTPS
 };
 
-/// The verdict with its reason, for the log.
+/// By what a portal gave itself away; `none` without one.
+enum class PortalKind { none, declared, redirect, status511, alteredPage };
+
+/// The verdict with its reason.
 struct PortalVerdict {
     bool captive = false;
+    PortalKind kind = PortalKind::none;
     std::string why;
 };
+
+/// How far the joined network reaches, by the portal's probes: `partial` where only one of HTTP and HTTPS gets
+/// through, `none` where nothing answers.
+enum class Connectivity { full, partial, portal, none };
 
 /// The network's own word comes first. Then the plain answer: 204 is open; a redirect or 511 is a portal; any
 /// other page in place of the expected emptiness is one too. An empty page with status 200 is open where the
@@ -46,6 +56,9 @@ struct PortalVerdict {
 /// portal". A probe host that suddenly has a private address and does not answer is no portal but no
 /// Internet. (The union of what two television and desktop systems and a connection manager do.)
 Known<PortalVerdict> judgePortal(const PortalEvidence& evidence);
+
+/// What the probes say about the reach; nothing where a page that is neither empty nor a portal's tells nothing.
+std::optional<Connectivity> connectivityOf(const PortalEvidence& evidence);
 
 /// Test 46 for the joined network. Information: "PreferredNetwork", the remembered network.
 Outcome isCaptive(const Known<PortalEvidence>& evidence, const Known<SavedNetworks>& saved,

@@ -3,6 +3,7 @@
 #include <algorithm>
 
 #include "service/connectivity_tests.h"
+#include "service/details.h"
 #include "service/device_tests.h"
 #include "service/network_tests.h"
 #include "service/radio_tests.h"
@@ -30,7 +31,7 @@ constexpr Fact kPeers[] = {Fact::peerLinks};
 constexpr Fact kOutside[] = {Fact::outsideEcho};
 constexpr Fact kNames[] = {Fact::nameAnswer};
 constexpr Fact kTranslation[] = {Fact::translation};
-constexpr Fact kVendor[] = {Fact::vendorService};
+constexpr Fact kVendor[] = {Fact::vendorService, Fact::portal};  // whose answer tells the time
 constexpr Fact kChannel[] = {Fact::judged, Fact::link, Fact::nearby, Fact::airtime, Fact::allowedChannels};
 constexpr Fact kMaker[] = {Fact::judged, Fact::router};
 constexpr Fact kHotspot[] = {Fact::judged, Fact::setup};
@@ -38,47 +39,47 @@ constexpr Fact kPortal[] = {Fact::link, Fact::nearby, Fact::saved, Fact::portal}
 
 // clang-format off
 constexpr NumberedTest kTests[] = {
-    { 3, Subject::joined,  kGateway,     gatewayAnswers},
-    { 6, Subject::joined,  kOutside,     outsideAnswers},
-    { 7, Subject::joined,  kNames,       namesResolve},
-    { 8, Subject::joined,  kTranslation, isTranslatedTwice},
-    { 9, Subject::joined,  kVendor,      vendorIsReached},
-    {11, Subject::joined,  kVendor,      vendorContentArrives},
-    {12, Subject::joined,  kAddresses,   hasIPv4Address},
-    {13, Subject::joined,  kAddresses,   hasIPv6Address},
-    {14, Subject::device,  kSetup,       ipv4IsCustom},
-    {15, Subject::device,  kSetup,       ipv6IsCustom},
-    {16, Subject::device,  kSetup,       nameServersAreCustom},
-    {17, Subject::device,  kSetup,       webProxyIsCustom},
-    {18, Subject::device,  kBluetooth,   manyBluetoothPaired},
-    {19, Subject::device,  kBluetooth,   manyBluetoothConnected},
-    {20, Subject::device,  kSharing,     bluetoothSharesAirtime},
-    {22, Subject::device,  kPeers,       peerLinkTakesTurns},
-    {24, Subject::network, kChannel,     channelIsFull},
-    {25, Subject::joined,  kChannel,     band2IsFull},
-    {26, Subject::joined,  kChannel,     band5IsFull},
-    {27, Subject::joined,  kJudged,      usesFortyMegahertzIn2GHz},
-    {28, Subject::network, kCountry,     countryCodesConflict},
-    {29, Subject::device,  kSaved,       savedSecurityConflicts},
-    {30, Subject::joined,  kListened,    foundHiddenNetworks},
-    {31, Subject::scan,    kNearby,      foundNoNetworks},
-    {32, Subject::network, kSignal,      signalIsPoor},
-    {33, Subject::network, kMaker,       isVendorsBaseStation},
-    {34, Subject::network, kJudged,      beaconIntervalIsLong},
-    {35, Subject::joined,  kStation,     dtimIntervalIsLong},
-    {36, Subject::network, kNetwork,     modesConflict11AC},
-    {37, Subject::network, kNetwork,     modesConflict11N},
-    {38, Subject::network, kJudged,      securityIsOpen},
-    {39, Subject::network, kJudged,      securityIsWep},
-    {40, Subject::network, kJudged,      securityIsWpa},
-    {41, Subject::network, kJudged,      ratesAreLegacy},
-    {42, Subject::network, kNetwork,     nameIsAmbiguous},
-    {43, Subject::network, kJudged,      nameIsHidden},
-    {44, Subject::network, kHotspot,     isVendorsHotspot},
-    {45, Subject::network, kJudged,      isPasspoint},
-    {46, Subject::network, kPortal,      hasPortal},
-    {47, Subject::device,  kSaved,       manyNetworksSaved},
-    {48, Subject::device,  kSaved,       hiddenNetworksSaved},
+    { 3, Subject::joined,  kGateway,     gatewayAnswers,            gatewayDetails},
+    { 6, Subject::joined,  kOutside,     outsideAnswers,            outsideDetails},
+    { 7, Subject::joined,  kNames,       namesResolve,              nameDetails},
+    { 8, Subject::joined,  kTranslation, isTranslatedTwice,         translationDetails},
+    { 9, Subject::joined,  kVendor,      vendorIsReached,           vendorReachDetails},
+    {11, Subject::joined,  kVendor,      vendorContentArrives,      vendorContentDetails},
+    {12, Subject::joined,  kAddresses,   hasIPv4Address,            ipv4Details},
+    {13, Subject::joined,  kAddresses,   hasIPv6Address,            ipv6Details},
+    {14, Subject::device,  kSetup,       ipv4IsCustom,              nullptr},
+    {15, Subject::device,  kSetup,       ipv6IsCustom,              nullptr},
+    {16, Subject::device,  kSetup,       nameServersAreCustom,      nameServerDetails},
+    {17, Subject::device,  kSetup,       webProxyIsCustom,          webProxyDetails},
+    {18, Subject::device,  kBluetooth,   manyBluetoothPaired,       pairedDetails},
+    {19, Subject::device,  kBluetooth,   manyBluetoothConnected,    connectedDetails},
+    {20, Subject::device,  kSharing,     bluetoothSharesAirtime,    sharedAirtimeDetails},
+    {22, Subject::device,  kPeers,       peerLinkTakesTurns,        peerLinkDetails},
+    {24, Subject::network, kChannel,     channelIsFull,             channelDetails},
+    {25, Subject::joined,  kChannel,     band2IsFull,               band2Details},
+    {26, Subject::joined,  kChannel,     band5IsFull,               band5Details},
+    {27, Subject::joined,  kJudged,      usesFortyMegahertzIn2GHz,  widthDetails},
+    {28, Subject::network, kCountry,     countryCodesConflict,      countryDetails},
+    {29, Subject::device,  kSaved,       savedSecurityConflicts,    savedConflictDetails},
+    {30, Subject::joined,  kListened,    foundHiddenNetworks,       nullptr},
+    {31, Subject::scan,    kNearby,      foundNoNetworks,           nullptr},
+    {32, Subject::network, kSignal,      signalIsPoor,              signalDetails},
+    {33, Subject::network, kMaker,       isVendorsBaseStation,      baseStationDetails},
+    {34, Subject::network, kJudged,      beaconIntervalIsLong,      beaconDetails},
+    {35, Subject::joined,  kStation,     dtimIntervalIsLong,        dtimDetails},
+    {36, Subject::network, kNetwork,     modesConflict11AC,         modes11ACDetails},
+    {37, Subject::network, kNetwork,     modesConflict11N,          modes11NDetails},
+    {38, Subject::network, kJudged,      securityIsOpen,            securityDetails},
+    {39, Subject::network, kJudged,      securityIsWep,             securityDetails},
+    {40, Subject::network, kJudged,      securityIsWpa,             securityDetails},
+    {41, Subject::network, kJudged,      ratesAreLegacy,            rateDetails},
+    {42, Subject::network, kNetwork,     nameIsAmbiguous,           ambiguousNameDetails},
+    {43, Subject::network, kJudged,      nameIsHidden,              nullptr},
+    {44, Subject::network, kHotspot,     isVendorsHotspot,          nullptr},
+    {45, Subject::network, kJudged,      isPasspoint,               hotspotElementDetails},
+    {46, Subject::network, kPortal,      hasPortal,                 portalDetails},
+    {47, Subject::device,  kSaved,       manyNetworksSaved,         savedCountDetails},
+    {48, Subject::device,  kSaved,       hiddenNetworksSaved,       savedHiddenDetails},
 };
 // clang-format on
 

@@ -2,6 +2,7 @@
 
 #include <span>
 
+#include "service/details.h"
 #include "service/facts.h"
 #include "service/outcome.h"
 
@@ -21,6 +22,7 @@ struct NumberedTest {
     Subject subject;
     std::span<const Fact> needs;
     Outcome (*verdict)(const Facts& facts);  ///< null while the test is not measured yet
+    Details (*details)(const Facts& facts);  ///< what was measured beyond it; null where there is nothing
 };
 
 /// All tests, ordered by number. *Any* thread.

@@ -4,7 +4,7 @@
 #include <optional>
 #include <vector>
 
-#include "service/access_point.h"
+#include "service/channel_use.h"
 
 namespace wp {
 
@@ -36,20 +36,14 @@ Airtime airtimeBetween(const Airtime& before, const Airtime& after);
 /// it, or was there for less than 20 ms, which is no more than a few frames. *Any* thread.
 std::optional<double> foreignLoad(const ChannelTime& channel);
 
-/// The frequencies that an access point occupies, in MHz: its operating width counts, not only its primary
-/// channel. An 80+80 MHz network has two spans.
-struct Span {
-    std::uint32_t low = 0;
-    std::uint32_t high = 0;
-    friend bool operator==(const Span&, const Span&) = default;
-};
-std::vector<Span> occupiedBy(const AccessPoint& accessPoint);
-
 /// How much the access points weigh on the 20 MHz around the frequency: each one that overlaps counts 1 where
 /// its frames are decoded well (-67 dBm and more), one half down to -82 dBm, at which 20 MHz receivers stop
 /// deferring to it (802.11, 17.3.10.6), and nothing below. \param own is left out: the network does not
 /// compete with itself.
 double overlapWeight(std::uint32_t frequency, const std::vector<AccessPoint>& nearby, const MacAddress* own);
+/// How many of them are decoded well there.
+std::size_t strongOverlaps(std::uint32_t frequency, const std::vector<AccessPoint>& nearby,
+                           const MacAddress* own);
 
 /// The interference factor by which access points choose their channel: noise floor and foreign load in one
 /// number; smaller is better. Nothing where the survey lacks noise, time or busy time.

@@ -31,16 +31,17 @@ const MacAddress* addressOf(const AccessPoint* accessPoint) {
     return accessPoint != nullptr ? &accessPoint->address : nullptr;
 }
 
-/// The channels that come into question: the three of 2.4 GHz that do not overlap, and all of 5 GHz.
+bool isChoosable(Band band, std::uint32_t frequency) {
+    const int number = channelOf(frequency);
+    const bool apart = number == 1 || number == 6 || number == 11;
+    return bandOf(frequency) == band && (band != Band::ghz2 || apart);
+}
+
 Candidates candidatesOf(const AirFacts& air, Band band) {
     Candidates candidates;
     if (!air.allowed) return candidates;
-    for (const AllowedChannel& channel : *air.allowed) {
-        const int number = channelOf(channel.frequency);
-        const bool apart = number == 1 || number == 6 || number == 11;
-        if (bandOf(channel.frequency) == band && (band != Band::ghz2 || apart))
-            candidates.push_back({channel, 0});
-    }
+    for (const AllowedChannel& channel : *air.allowed)
+        if (isChoosable(band, channel.frequency)) candidates.push_back({channel, 0});
     std::sort(candidates.begin(), candidates.end(),
               [](const Candidate& a, const Candidate& b) { return a.number() < b.number(); });
     return candidates;
@@ -118,33 +119,25 @@ Dictionary::Entries information(const AirFacts& air, const AccessPoint* own) {
     return info;
 }
 
-Known<bool> overlapped(std::uint32_t frequency, const AirFacts& air, const MacAddress* own,
-                       const CongestionLimits& limits) {
-    if (!air.nearby) return air.nearby.error();
-    return overlapWeight(frequency, *air.nearby, own) >= limits.overlap;
-}
+using Basis = ChannelJudgement::Basis;
 
-Known<bool> congested(const AccessPoint& judged, const AirFacts& air, const CongestionLimits& limits) {
-    const auto load = measuredLoad(air, judged.frequency);
-    const auto advertised = judged.says.load;
-    if (load && (judged.joined || !advertised)) return *load >= limits.load;
-    if (advertised) return *advertised >= limits.advertisedLoad;
-    return overlapped(judged.frequency, air, &judged.address, limits);
+Known<ChannelJudgement> byOverlap(std::uint32_t frequency, const AirFacts& air, const MacAddress* own,
+                                  const CongestionLimits& limits) {
+    if (!air.nearby) return air.nearby.error();
+    const double weight = overlapWeight(frequency, *air.nearby, own);
+    return ChannelJudgement{Basis::overlap, weight, weight >= limits.overlap};
 }
 
 Outcome bandIsCongested(Band band, const AirFacts& air, const AccessPoint* own,
                         const CongestionLimits& limits) {
     if (!air.allowed) return air.allowed.error();
-    const Candidates candidates = candidatesOf(air, band);
-    if (candidates.empty()) return failure(Reason::unsupported, "the radio has no channel of this band");
+    const std::vector<std::uint32_t> frequencies = choosableIn(band, *air.allowed);
+    if (frequencies.empty()) return failure(Reason::unsupported, "the radio has no channel of this band");
     bool all = true;
-    for (const Candidate& candidate : candidates) {
-        const std::uint32_t frequency = candidate.channel.frequency;
-        const auto load = measuredLoad(air, frequency);
-        const Known<bool> full =
-            load ? Known<bool>(*load >= limits.load) : overlapped(frequency, air, addressOf(own), limits);
-        if (!full) return full.error();
-        all = all && *full;
+    for (const std::uint32_t frequency : frequencies) {
+        const auto judged = judgeChannelAt(frequency, air, addressOf(own), limits);
+        if (!judged) return judged.error();
+        all = all && judged->full;
     }
     return problem(all, information(air, own));
 }
@@ -156,13 +149,37 @@ Recommendation recommend(const AirFacts& air, const AccessPoint* own) {
     return {best(low, own), best(high, own), bestOfBestPair(high, own), best(withoutRadar(high), own)};
 }
 
+std::vector<std::uint32_t> choosableIn(Band band, const AllowedChannels& allowed) {
+    std::vector<std::uint32_t> frequencies;
+    for (const Candidate& each : candidatesOf({{}, {}, allowed}, band))
+        frequencies.push_back(each.channel.frequency);
+    return frequencies;
+}
+
+Known<ChannelJudgement> judgeChannelAt(std::uint32_t frequency, const AirFacts& air, const MacAddress* own,
+                                       const CongestionLimits& limits) {
+    const auto load = measuredLoad(air, frequency);
+    if (load) return ChannelJudgement{Basis::measuredLoad, *load, *load >= limits.load};
+    return byOverlap(frequency, air, own, limits);
+}
+
+Known<ChannelJudgement> judgeChannelOf(const AccessPoint& judged, const AirFacts& air,
+                                       const CongestionLimits& limits) {
+    const auto load = measuredLoad(air, judged.frequency);
+    const auto advertised = judged.says.load;
+    if (advertised && !(load && judged.joined))
+        return ChannelJudgement{Basis::advertisedLoad, *advertised / 255.0,
+                                *advertised >= limits.advertisedLoad};
+    return judgeChannelAt(judged.frequency, air, &judged.address, limits);
+}
+
 Outcome channelIsCongested(const AccessPoint& judged, const AirFacts& air, const AccessPoint* own,
                            const CongestionLimits& limits) {
-    const Known<bool> full = congested(judged, air, limits);
-    if (!full) return full.error();
+    const Known<ChannelJudgement> channel = judgeChannelOf(judged, air, limits);
+    if (!channel) return channel.error();
     Dictionary::Entries info = information(air, own);
     add(info, "CurrentChannel", channelOf(judged.frequency));
-    return problem(*full, std::move(info));
+    return problem(channel->full, std::move(info));
 }
 
 Outcome band2IsCongested(const AirFacts& air, const AccessPoint* own, const CongestionLimits& limits) {

@@ -40,6 +40,25 @@ struct Recommendation {
 /// wins. \param own the access point that is joined; null where none is
 Recommendation recommend(const AirFacts& air, const AccessPoint* own);
 
+/// Whether a channel is full, and by what: `value` is a share of airtime for the two loads, else the weight of
+/// what overlaps.
+struct ChannelJudgement {
+    enum class Basis { measuredLoad, advertisedLoad, overlap };
+    Basis basis = Basis::overlap;
+    double value = 0;
+    bool full = false;
+};
+
+/// The judged access point's channel. *Any* thread.
+Known<ChannelJudgement> judgeChannelOf(const AccessPoint& judged, const AirFacts& air,
+                                       const CongestionLimits& limits);
+/// Any channel, by what the radio measured there, else by what overlaps. \param own is left out. *Any* thread.
+Known<ChannelJudgement> judgeChannelAt(std::uint32_t frequency, const AirFacts& air, const MacAddress* own,
+                                       const CongestionLimits& limits);
+/// The frequencies that come into question in a band: the three of 2.4 GHz that do not overlap, and all of the
+/// others, the lowest first. *Any* thread.
+std::vector<std::uint32_t> choosableIn(Band band, const AllowedChannels& allowed);
+
 /// Test 24: whether the judged access point's channel is congested. For the joined network what the radio
 /// measured on its channel comes first, for another one what its access point advertises. Information:
 /// "CurrentChannel" and the four recommendations.

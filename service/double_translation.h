@@ -24,9 +24,20 @@ struct TranslationEvidence {
     std::vector<std::optional<IPAddress>> hops;
 };
 
-/// How sure the verdict is, and by what; for the log.
+/// What decided about the translation.
+enum class TranslationBasis {
+    noInnerAddress,
+    routerInside,
+    twoOuterAddresses,
+    routerOutside,
+    hops,
+    sharedHop
+};
+
+/// How sure the verdict is, and by what.
 struct TranslationVerdict {
     bool twice = false;
+    TranslationBasis basis = TranslationBasis::hops;
     std::string why;
 };
 

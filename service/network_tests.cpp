@@ -9,12 +9,6 @@
 namespace wp {
 namespace {
 
-// 100 units are every maker's default. The slack is for controllers that are set in milliseconds and round.
-constexpr int kLongestBeaconInterval = 110;
-
-// Makers of access points advise 1 or 2; many home routers ship 3.
-constexpr int kLongestDtimPeriod = 3;
-
 /// Names that access points carry out of the box, and words that say nothing: two unrelated networks with one
 /// of them are likely to be in reach of each other. Lower case.
 constexpr std::string_view kCommonNames[] = {
@@ -30,10 +24,6 @@ std::string lowerCase(Bytes name) {
         if (letter >= 'A' && letter <= 'Z') letter = static_cast<char>(letter + ('a' - 'A'));
     }
     return text;
-}
-
-bool isCommonName(const NetworkName& name) {
-    return std::ranges::find(kCommonNames, lowerCase(name.bytes())) != std::end(kCommonNames);
 }
 
 /// Networks that are secured in different ways are different networks, though they have one name.
@@ -55,6 +45,10 @@ bool usesWep(const SecuritySuites& suites) {
 }
 
 }  // namespace
+
+bool isCommonName(const NetworkName& name) {
+    return std::ranges::find(kCommonNames, lowerCase(name.bytes())) != std::end(kCommonNames);
+}
 
 Outcome beaconIntervalIsLong(const Facts& facts) {
     const Known<const AccessPoint*> judged = judgedAccessPoint(facts);

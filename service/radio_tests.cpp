@@ -16,52 +16,13 @@ constexpr int kFastest11bRate = 22;  // 11 Mb/s
 constexpr std::uint8_t kOlderStationsPresent = 1;
 constexpr std::uint8_t kProtectionInUse = 2;
 
-// Phones believe an access point's country from this strength on, and want it from two of them.
-constexpr int kWeakestCountrySignal = -85;  // dBm
-constexpr std::size_t kCountryWitnesses = 2;
-
-// Peers call a signal weak from -75 dBm (a strength of 30 in a hundred) or a signal-to-noise ratio of 18 dB
-// on.
-constexpr int kWeakestSignal = -75;  // dBm
-constexpr int kLeastSignalToNoise = 18;
 constexpr int kLowestSignal = -110;
 constexpr int kHighestSignal = -1;
-
-/// The joined link's signal swings: the middle of several samples counts.
-Known<int> signalOf(const Facts& facts, const AccessPoint& judged) {
-    if (facts.named || !facts.station || facts.station->signals.empty()) {
-        if (judged.signal) return *judged.signal;
-        return failure(Reason::unsupported, "the driver does not tell the signal strength in dBm");
-    }
-    std::vector<int> samples = facts.station->signals;
-    std::ranges::sort(samples);
-    return samples[samples.size() / 2];
-}
-
-std::optional<int> noiseOf(const Facts& facts, const AccessPoint& judged) {
-    if (!facts.survey) return std::nullopt;
-    for (const SurveyedChannel& channel : *facts.survey) {
-        if (channel.frequency == judged.frequency && channel.noise) return channel.noise;
-    }
-    return std::nullopt;
-}
 
 /// World-wide and combined regulatory domains name no country that others could contradict.
 bool isCountry(const std::string& code) {
     return code.size() == 2 && code != "XX" &&
            std::ranges::all_of(code, [](char letter) { return letter >= 'A' && letter <= 'Z'; });
-}
-
-/// Which access points, by address, say which country; the judged one whatever its strength.
-std::map<CountryCode, std::set<MacAddress>> countryWitnesses(const Facts& facts, const AccessPoint& judged) {
-    std::map<CountryCode, std::set<MacAddress>> witnesses;
-    if (judged.says.country) witnesses[*judged.says.country].insert(judged.address);
-    for (const AccessPoint& each : *facts.nearby) {
-        if (!each.says.country || each.address == judged.address) continue;
-        if (each.signal && *each.signal >= kWeakestCountrySignal)
-            witnesses[*each.says.country].insert(each.address);
-    }
-    return witnesses;
 }
 
 bool neighboursDisagree(const Facts& facts, const AccessPoint& judged) {
@@ -90,20 +51,48 @@ bool mixedIn(Band band, const std::vector<const AccessPoint*>& network, Offers o
     return with && without;
 }
 
-/// 802.11n must not be used with the ciphers of before: an access point that allows no other offers it in
-/// vain.
-bool forbidsHtByCipher(const AccessPoint& each) {
-    const SecuritySuites& suites = each.says.security;
-    if (securityOf(suites) == Security::wep) return true;
-    constexpr std::uint8_t kOld = SecuritySuites::kWep | SecuritySuites::kTkip;
-    return suites.pairwise != 0 && (suites.pairwise & ~kOld) == 0;
-}
-
 Outcome modeConflict(bool found, const AccessPoint& judged) {
     return problem(found, {{"SupportedPHYModes", phyModesOf(judged)}});
 }
 
 }  // namespace
+
+Known<int> signalOf(const Facts& facts, const AccessPoint& judged) {
+    if (facts.named || !facts.station || facts.station->signals.empty()) {
+        if (judged.signal) return *judged.signal;
+        return failure(Reason::unsupported, "the driver does not tell the signal strength in dBm");
+    }
+    std::vector<int> samples = facts.station->signals;
+    std::ranges::sort(samples);
+    return samples[samples.size() / 2];
+}
+
+std::optional<int> noiseOf(const Facts& facts, const AccessPoint& judged) {
+    if (!facts.survey) return std::nullopt;
+    for (const SurveyedChannel& channel : *facts.survey) {
+        if (channel.frequency == judged.frequency && channel.noise) return channel.noise;
+    }
+    return std::nullopt;
+}
+
+std::map<CountryCode, std::set<MacAddress>> countryWitnesses(const Facts& facts, const AccessPoint& judged) {
+    std::map<CountryCode, std::set<MacAddress>> witnesses;
+    if (judged.says.country) witnesses[*judged.says.country].insert(judged.address);
+    if (!facts.nearby) return witnesses;
+    for (const AccessPoint& each : *facts.nearby) {
+        if (!each.says.country || each.address == judged.address) continue;
+        if (each.signal && *each.signal >= kWeakestCountrySignal)
+            witnesses[*each.says.country].insert(each.address);
+    }
+    return witnesses;
+}
+
+bool forbidsHtByCipher(const AccessPoint& accessPoint) {
+    const SecuritySuites& suites = accessPoint.says.security;
+    if (securityOf(suites) == Security::wep) return true;
+    constexpr std::uint8_t kOld = SecuritySuites::kWep | SecuritySuites::kTkip;
+    return suites.pairwise != 0 && (suites.pairwise & ~kOld) == 0;
+}
 
 Outcome usesFortyMegahertzIn2GHz(const Facts& facts) {
     const Known<const AccessPoint*> judged = judgedAccessPoint(facts);

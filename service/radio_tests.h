@@ -1,11 +1,32 @@
 #pragma once
 
+#include <map>
+#include <set>
+
 #include "service/facts.h"
 #include "service/outcome.h"
 
 namespace wp {
 
 // The verdicts on modes, rates, channels and signal. All are pure functions; *any* thread.
+
+/// Phones believe an access point's country from this strength on, in dBm, and want it from two of them.
+inline constexpr int kWeakestCountrySignal = -85;
+inline constexpr std::size_t kCountryWitnesses = 2;
+
+/// Peers call a signal weak from -75 dBm (a strength of 30 in a hundred) or a signal-to-noise ratio of 18 dB on.
+inline constexpr int kWeakestSignal = -75;
+inline constexpr int kLeastSignalToNoise = 18;
+
+/// Which access points, by address, say which country; the judged one whatever its strength. None where nothing
+/// was heard.
+std::map<CountryCode, std::set<MacAddress>> countryWitnesses(const Facts& facts, const AccessPoint& judged);
+/// The signal in dBm. That of the joined link swings: the middle of several samples counts.
+Known<int> signalOf(const Facts& facts, const AccessPoint& judged);
+/// The noise in dBm on the judged access point's channel, where the radio measures it.
+std::optional<int> noiseOf(const Facts& facts, const AccessPoint& judged);
+/// 802.11n must not be used with the ciphers of before: an access point that allows no other offers it in vain.
+bool forbidsHtByCipher(const AccessPoint& accessPoint);
 
 /// 27.
 Outcome usesFortyMegahertzIn2GHz(const Facts& facts);

@@ -10,12 +10,23 @@
 
 namespace wp {
 
+/// One of the link's name servers, asked by itself.
+struct NameServerAnswer {
+    IPAddress server;
+    /// "NOERROR", "NODATA", "NXDOMAIN", "SERVFAIL", "REFUSED", "FORMERR", "NOTIMP"; or, without an answer, "timeout"
+    /// or "unreachable".
+    std::string code;
+    bool answered = false;
+    double took = 0;  ///< ms
+};
+
 /// What became of a name that the link's own name servers were asked for.
 struct NameAnswer {
     std::string name;
     std::vector<IPAddress> addresses;
     std::string why;  ///< where there is no address: what the servers said
     std::chrono::milliseconds took{0};
+    std::vector<NameServerAnswer> servers{};  ///< the same question to each server, for the details alone
 };
 
 /// An answer slower than the first is slow, slower than the second a problem; for the log only. (A desktop
@@ -25,6 +36,25 @@ inline constexpr std::chrono::milliseconds kSlowName{400}, kVerySlowName{500};
 /// Test 7: whether a name outside resolves. Only an address that can lead outside counts: gateways that show
 /// their own page answer with a private one.
 Outcome resolvesNames(const Known<NameAnswer>& answer);
+
+/// How long each step of a request took, in ms; absent where it was not reached, or there is none.
+struct ContactSteps {
+    std::optional<double> connect;    ///< to the server
+    std::optional<double> secure;     ///< TLS on it
+    std::optional<double> firstByte;  ///< of the answer, after the request
+};
+
+/// Why a certificate does not hold.
+enum class CertificateFault {
+    none,
+    notYetValid,
+    expired,
+    wrongHost,
+    selfSigned,
+    unknownIssuer,
+    revoked,
+    other
+};
 
 /// What became of a connection to the vendor's service.
 struct ServiceContact {
@@ -37,6 +67,10 @@ struct ServiceContact {
     std::string why;   ///< of a failure
     int status = 0;    ///< of HTTP
     std::string body;  ///< at most 64 KiB
+    ContactSteps steps{};
+    CertificateFault fault = CertificateFault::none;
+    std::optional<IPAddress> server{};
+    std::optional<std::int64_t> clockOffset{};  ///< s by which this device is ahead of the answer's date
 };
 
 /// What counts as the vendor's content: status 204, or 200 with a body that begins with the text.

@@ -1,7 +1,6 @@
 #include "service/saved_networks.h"
 
 #include <algorithm>
-#include <map>
 
 namespace wp {
 namespace {
@@ -26,16 +25,24 @@ Outcome remembersHiddenNetworks(const Known<SavedNetworks>& saved) {
                                [](const SavedNetwork& network) { return network.hidden; }));
 }
 
-Outcome remembersConflictingSecurity(const Known<SavedNetworks>& saved) {
-    if (!saved) return saved.error();
-    std::map<std::vector<std::uint8_t>, int> kinds;
-    for (const SavedNetwork& network : saved->networks) {
+std::map<std::vector<std::uint8_t>, std::set<SavedSecurity>> conflictingNames(const SavedNetworks& saved) {
+    std::map<std::vector<std::uint8_t>, std::set<SavedSecurity>> names;
+    for (const SavedNetwork& network : saved.networks) {
         if (!network.enabled || network.security == SavedSecurity::unknown) continue;
         const Bytes bytes = network.name.bytes();
-        const auto [known, added] = kinds.try_emplace({bytes.begin(), bytes.end()}, kindOf(network.security));
-        if (!added && known->second != kindOf(network.security)) return problem(true);
+        names[{bytes.begin(), bytes.end()}].insert(network.security);
     }
-    return problem(false);
+    std::erase_if(names, [](const auto& entry) {
+        std::set<int> kinds;
+        for (const SavedSecurity security : entry.second) kinds.insert(kindOf(security));
+        return kinds.size() < 2;
+    });
+    return names;
+}
+
+Outcome remembersConflictingSecurity(const Known<SavedNetworks>& saved) {
+    if (!saved) return saved.error();
+    return problem(!conflictingNames(*saved).empty());
 }
 
 const SavedNetwork* findSaved(const SavedNetworks& saved, const NetworkName& name) {

@@ -1,8 +1,10 @@
 #pragma once
 
 #include <cstdint>
+#include <map>
 #include <memory>
 #include <optional>
+#include <set>
 #include <string>
 #include <vector>
 
@@ -55,6 +57,9 @@ Outcome remembersHiddenNetworks(const Known<SavedNetworks>& saved);
 /// Test 29: whether two that are enabled have one name and different kinds of security. A password with and
 /// without SAE is one kind, since networks change over from one to the other.
 Outcome remembersConflictingSecurity(const Known<SavedNetworks>& saved);
+
+/// The names, as bytes, of enabled networks that have several kinds of security, with what they have. *Any* thread.
+std::map<std::vector<std::uint8_t>, std::set<SavedSecurity>> conflictingNames(const SavedNetworks& saved);
 
 /// The remembered network of this name, enabled ones first, then the one joined last; null where there is
 /// none.

@@ -8,6 +8,7 @@
 #include <array>
 #include <iterator>
 #include <memory>
+#include <span>
 
 #include "linux/probe/udp_socket.h"
 #include "linux/wait_any.h"
@@ -20,8 +21,10 @@ using namespace std::chrono_literals;
 constexpr int kTryMilliseconds = 2000, kTries = 2;
 /// How long the other family may take once one has answered (RFC 8305 waits 50 ms for the same).
 constexpr auto kOtherFamily = 50ms;
+constexpr int kInternet = 1;
 constexpr int kMostAddresses = 32;
 constexpr std::size_t kLongestAnswer = 65'535;
+constexpr std::size_t kMostServers = 6;
 
 struct LibraryUser {
     LibraryUser() { ares_library_init(ARES_LIB_INIT_ALL); }
@@ -53,13 +56,14 @@ std::string csvOf(const NameServerSet& whom) {
     return list;
 }
 
-Known<Channel> openChannel(const NameServerSet& whom) {
+/// \param moreFlags of the library, beyond that the name is taken as it is
+Known<Channel> openChannel(const NameServerSet& whom, int tries, int moreFlags = 0) {
     static const LibraryUser user;
     ares_options options{};
     char lookups[] = "b";
-    options.flags = ARES_FLAG_NOSEARCH | ARES_FLAG_NOALIASES;
+    options.flags = ARES_FLAG_NOSEARCH | ARES_FLAG_NOALIASES | moreFlags;
     options.timeout = kTryMilliseconds;
-    options.tries = kTries;
+    options.tries = tries;
     options.lookups = lookups;
     ares_channel raw = nullptr;
     const int mask = ARES_OPT_FLAGS | ARES_OPT_TIMEOUTMS | ARES_OPT_TRIES | ARES_OPT_LOOKUPS;
@@ -84,8 +88,8 @@ void keepAnswer(void* place, int status, int, unsigned char* answer, int size) {
         lookup.why = ares_strerror(status);
 }
 
-/// Waits for the channel's sockets, or for its own next timeout.
-Wait turn(ares_channel channel, const Until& until) {
+/// One channel's sockets as `poll` wants them.
+std::vector<pollfd> socketsOf(ares_channel channel) {
     std::array<ares_socket_t, ARES_GETSOCK_MAXNUM> sockets;
     const int bits = ares_getsock(channel, sockets.data(), ARES_GETSOCK_MAXNUM);
     std::vector<pollfd> descriptors;
@@ -95,15 +99,37 @@ Wait turn(ares_channel channel, const Until& until) {
         if (ARES_GETSOCK_WRITABLE(bits, i)) events |= POLLOUT;
         if (events != 0) descriptors.push_back({sockets[static_cast<std::size_t>(i)], events, 0});
     }
+    return descriptors;
+}
+
+std::chrono::microseconds patienceOf(ares_channel channel) {
     timeval most{1, 0};
     const timeval* patience = ares_timeout(channel, &most, &most);
-    const auto time = std::chrono::seconds(patience->tv_sec) + std::chrono::microseconds(patience->tv_usec);
-    const Wait wait = waitAny(descriptors, until.within(time));
-    if (wait == Wait::stopped) return wait;
-    for (const pollfd& each : descriptors)
+    return std::chrono::seconds(patience->tv_sec) + std::chrono::microseconds(patience->tv_usec);
+}
+
+void process(ares_channel channel, std::span<const pollfd> sockets) {
+    for (const pollfd& each : sockets)
         ares_process_fd(channel, (each.revents & ~POLLOUT) != 0 ? each.fd : ARES_SOCKET_BAD,
                         (each.revents & POLLOUT) != 0 ? each.fd : ARES_SOCKET_BAD);
     ares_process_fd(channel, ARES_SOCKET_BAD, ARES_SOCKET_BAD);
+}
+
+/// Waits for the channels' sockets, or for the first of their own timeouts.
+Wait turn(std::span<const ares_channel> channels, const Until& until) {
+    std::vector<pollfd> descriptors;
+    std::vector<std::size_t> ends;
+    std::chrono::microseconds patience = 1s;
+    for (const ares_channel each : channels) {
+        std::ranges::copy(socketsOf(each), std::back_inserter(descriptors));
+        ends.push_back(descriptors.size());
+        patience = std::min(patience, patienceOf(each));
+    }
+    const Wait wait = waitAny(descriptors, until.within(patience));
+    if (wait == Wait::stopped) return wait;
+    std::size_t begin = 0;
+    for (std::size_t i = 0; i < channels.size(); begin = ends[i++])
+        process(channels[i], std::span(descriptors).subspan(begin, ends[i] - begin));
     return Clock::now() >= until.deadline ? Wait::timeout : Wait::ready;
 }
 
@@ -124,6 +150,46 @@ std::vector<IPAddress> addressesBy(Read read, std::size_t addressSize, Bytes ans
     return addresses;
 }
 
+/// One server that is asked by itself.
+struct Asking {
+    NameServerAnswer answer;
+    Clock::time_point start = Clock::now();
+    bool running = true;
+    Channel channel;  // last: it answers to the others when it goes
+};
+
+/// What a status of the library says about the server.
+std::string codeOf(int status) {
+    switch (status) {
+        case ARES_SUCCESS:
+            return "NOERROR";
+        case ARES_ENODATA:
+            return "NODATA";
+        case ARES_ENOTFOUND:
+            return "NXDOMAIN";
+        case ARES_ESERVFAIL:
+            return "SERVFAIL";
+        case ARES_EREFUSED:
+            return "REFUSED";
+        case ARES_EFORMERR:
+            return "FORMERR";
+        case ARES_ENOTIMP:
+            return "NOTIMP";
+        case ARES_ECONNREFUSED:
+            return "unreachable";
+        default:
+            return "timeout";
+    }
+}
+
+void keepServerAnswer(void* place, int status, int, unsigned char*, int) {
+    auto& asking = *static_cast<Asking*>(place);
+    asking.running = false;
+    asking.answer.code = codeOf(status);
+    asking.answer.answered = asking.answer.code != "timeout" && asking.answer.code != "unreachable";
+    asking.answer.took = std::chrono::duration<double, std::milli>(Clock::now() - asking.start).count();
+}
+
 }  // namespace
 
 std::vector<IPAddress> addressesFromAnswer(RecordType type, Bytes answer) {
@@ -133,23 +199,23 @@ std::vector<IPAddress> addressesFromAnswer(RecordType type, Bytes answer) {
 
 Known<NameAnswer> lookUpName(const std::string& name, const NameServerSet& whom, const Until& until) {
     const auto start = Clock::now();
-    NameAnswer answer{name, {}, {}, {}};
+    NameAnswer answer;
+    answer.name = name;
     if (whom.servers.empty()) {
         answer.why = "there is no name server";
         return answer;
     }
     Lookup lookup;  // outlives the channel, which answers to it when it goes
-    const auto channel = openChannel(whom);
+    const auto channel = openChannel(whom, kTries);
     if (!channel) return channel.error();
     lookup.running = 2;
-    constexpr int kInternet = 1, kIPv4 = static_cast<int>(RecordType::a),
-                  kIPv6 = static_cast<int>(RecordType::aaaa);
+    constexpr int kIPv4 = static_cast<int>(RecordType::a), kIPv6 = static_cast<int>(RecordType::aaaa);
     ares_query(channel->get(), name.c_str(), kInternet, kIPv4, keepAnswer<RecordType::a>, &lookup);
     ares_query(channel->get(), name.c_str(), kInternet, kIPv6, keepAnswer<RecordType::aaaa>, &lookup);
     Until patience = until;
     while (lookup.running > 0) {
         if (!lookup.addresses.empty() && lookup.running == 1) patience = patience.within(kOtherFamily);
-        const Wait wait = turn(channel->get(), patience);
+        const Wait wait = turn(std::array{channel->get()}, patience);
         if (wait == Wait::stopped) return waitFailure(wait, "the name server");
         if (wait == Wait::timeout) break;
     }
@@ -158,6 +224,33 @@ Known<NameAnswer> lookUpName(const std::string& name, const NameServerSet& whom,
     if (lookup.addresses.empty())
         answer.why = lookup.why.empty() ? "no name server answered in time" : lookup.why;
     return answer;
+}
+
+Known<std::vector<NameServerAnswer>> askEachServer(const std::string& name, const NameServerSet& whom,
+                                                   const Until& until) {
+    std::vector<std::unique_ptr<Asking>> all;
+    for (const IPAddress& server : whom.servers) {
+        if (all.size() == kMostServers) break;
+        // Each answer is wanted as it is; the library would pass over a refusal.
+        auto channel = openChannel({{server}, whom.interfaceName, whom.port}, 1, ARES_FLAG_NOCHECKRESP);
+        if (!channel) return channel.error();
+        auto& asking = *all.emplace_back(std::make_unique<Asking>());
+        asking.answer.server = server;
+        asking.channel = std::move(*channel);
+        ares_query(asking.channel.get(), name.c_str(), kInternet, static_cast<int>(RecordType::a),
+                   keepServerAnswer, &asking);
+    }
+    std::vector<ares_channel> channels;
+    for (const auto& each : all) channels.push_back(each->channel.get());
+    while (std::ranges::any_of(all, [](const auto& each) { return each->running; })) {
+        const Wait wait = turn(channels, until);
+        if (wait == Wait::stopped) return waitFailure(wait, "the name server");
+        if (wait == Wait::timeout) break;
+    }
+    for (const ares_channel each : channels) ares_cancel(each);
+    std::vector<NameServerAnswer> answers;
+    for (const auto& each : all) answers.push_back(each->answer);
+    return answers;
 }
 
 std::string freshName(const std::string& wildcardSuffix) {

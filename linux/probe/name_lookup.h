@@ -27,6 +27,12 @@ enum class RecordType : int { a = 1, aaaa = 28 };
 /// *Any* thread.
 std::vector<IPAddress> addressesFromAnswer(RecordType type, Bytes answer);
 
+/// Asks each of the first six servers by itself for the name's IPv4 address, all at once, once, for up to 2 s: which of
+/// them work, which the lookup of a name does not tell as long as one does. An error is only that it was stopped, or
+/// could not begin. *Any* thread.
+Known<std::vector<NameServerAnswer>> askEachServer(const std::string& name, const NameServerSet& whom,
+                                                   const Until& until);
+
 /// A name that no cache holds: eight random letters before the suffix, for a zone that answers to every name.
 std::string freshName(const std::string& wildcardSuffix);
 

@@ -1,10 +1,11 @@
 #include "linux/probe/portal_api.h"
 
 #include "exchange/json_reader.h"
+#include "service/plain_text.h"
 
 namespace wp {
 
-std::optional<bool> captiveFromApi(std::string_view json) {
+std::optional<PortalApiAnswer> portalFromApi(std::string_view json) {
     const auto read = readJSON(json, {.bytes = kLongestPortalAnswer, .depth = 8});
     const Value* value = std::get_if<Value>(&read);
     const DictionaryPointer* entries = value != nullptr ? value->as<DictionaryPointer>() : nullptr;
@@ -16,7 +17,7 @@ std::optional<bool> captiveFromApi(std::string_view json) {
     const std::string* text = page ? page->as<std::string>() : nullptr;
     // Without a page the user could do nothing about it; such an answer is not believed.
     if (*flag && (text == nullptr || text->empty())) return std::nullopt;
-    return *flag;
+    return PortalApiAnswer{*flag, text != nullptr ? plainText(*text, 2048) : std::string()};
 }
 
 std::string portalApiIn(const std::map<std::string, std::string>& lease) {

@@ -10,9 +10,15 @@ namespace wp {
 /// The longest answer of a portal's API that is read; a true one has a few hundred bytes.
 inline constexpr std::size_t kLongestPortalAnswer = 4096;
 
-/// Whether the portal's API says that this device is captive (RFC 8908). Nothing for what is no such answer:
-/// not JSON, without "captive", or captive without a page to go to. *Any* thread.
-std::optional<bool> captiveFromApi(std::string_view json);
+/// What the portal's API says (RFC 8908).
+struct PortalApiAnswer {
+    bool captive = false;
+    std::string page;  ///< where the user is to go; may be empty for a device that is not captive
+};
+
+/// Nothing for what is no such answer: not JSON, without "captive", or captive without a page to go to. *Any*
+/// thread.
+std::optional<PortalApiAnswer> portalFromApi(std::string_view json);
 
 /// The address of the portal's API among the options of a lease, by their numbers or the names that managers
 /// give them (RFC 8910, option 114; 160 is its withdrawn code); empty where the network names none.

@@ -3,6 +3,7 @@
 #include <curl/curl.h>
 
 #include <algorithm>
+#include <ctime>
 #include <memory>
 
 #include "linux/wait_any.h"
@@ -39,6 +40,32 @@ std::string partOf(const std::string& url, Part wanted) {
     if (curl_url_get(parsed.get(), wanted.part, &text, wanted.flags) != CURLUE_OK) return {};
     const std::unique_ptr<char, decltype(&curl_free)> owner(text, curl_free);
     return text;
+}
+
+/// OpenSSL's numbers of what is wrong with a certificate. The library checks the host's name first, and leaves the
+/// number as it was before it looked at anything else.
+CertificateFault faultOfCode(long code) {
+    switch (code) {
+        case 0:
+        case 1:
+        case 62:
+            return CertificateFault::wrongHost;
+        case 9:
+            return CertificateFault::notYetValid;
+        case 10:
+            return CertificateFault::expired;
+        case 18:
+        case 19:
+            return CertificateFault::selfSigned;
+        case 2:
+        case 20:
+        case 21:
+            return CertificateFault::unknownIssuer;
+        case 23:
+            return CertificateFault::revoked;
+        default:
+            return CertificateFault::other;
+    }
 }
 
 /// One request under way.
@@ -86,7 +113,12 @@ class Transfer {
         // A body that is too long, or breaks off, comes after an answer all the same.
         const bool answered = code == CURLE_OK || (status != 0 && code != CURLE_PEER_FAILED_VERIFICATION);
         answer.end = answered ? WebAnswer::End::answered : WebAnswer::End::failed;
-        if (code == CURLE_PEER_FAILED_VERIFICATION) answer.end = WebAnswer::End::badCertificate;
+        if (code == CURLE_PEER_FAILED_VERIFICATION) {
+            answer.end = WebAnswer::End::badCertificate;
+            answer.fault = fault();
+        }
+        answer.steps = steps(code == CURLE_OK);
+        answer.clockOffset = clockOffset();
         if (!answered) answer.why = curl_easy_strerror(code);
         return answer;
     }
@@ -132,6 +164,40 @@ class Transfer {
         const char* text = nullptr;
         curl_easy_getinfo(easy_.get(), which, &text);
         return text != nullptr ? plainText(text, 2048) : std::string();
+    }
+
+    /// The moment of a step in ms since the beginning; 0 where it was not reached.
+    double moment(CURLINFO which) const {
+        curl_off_t microseconds = 0;
+        curl_easy_getinfo(easy_.get(), which, &microseconds);
+        return static_cast<double>(microseconds) / 1000.0;
+    }
+
+    ContactSteps steps(bool complete) const {
+        const double connected = moment(CURLINFO_CONNECT_TIME_T),
+                     secured = moment(CURLINFO_APPCONNECT_TIME_T),
+                     asked = moment(CURLINFO_PRETRANSFER_TIME_T),
+                     answered = moment(CURLINFO_STARTTRANSFER_TIME_T);
+        ContactSteps steps;
+        if (connected > 0) steps.connect = connected - moment(CURLINFO_NAMELOOKUP_TIME_T);
+        if (secured > connected) steps.secure = secured - connected;
+        if (complete && !request_.connectOnly && answered > asked) steps.firstByte = answered - asked;
+        return steps;
+    }
+
+    CertificateFault fault() const {
+        long code = 0;
+        curl_easy_getinfo(easy_.get(), CURLINFO_SSL_VERIFYRESULT, &code);
+        return faultOfCode(code);
+    }
+
+    std::optional<std::int64_t> clockOffset() const {
+        curl_header* date = nullptr;
+        if (curl_easy_header(easy_.get(), "Date", 0, CURLH_HEADER, -1, &date) != CURLHE_OK)
+            return std::nullopt;
+        const std::time_t server = curl_getdate(date->value, nullptr);
+        if (server == -1) return std::nullopt;
+        return std::int64_t{std::time(nullptr)} - std::int64_t{server};
     }
 
     static std::size_t take(char* data, std::size_t, std::size_t size, void* self) {

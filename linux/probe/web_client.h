@@ -7,6 +7,7 @@
 
 #include "linux/stop_signal.h"
 #include "service/ip_address.h"
+#include "service/reachability.h"
 
 namespace wp {
 
@@ -33,6 +34,9 @@ struct WebAnswer {
     std::string contentType;
     std::optional<IPAddress> server;
     std::chrono::milliseconds took{0};
+    ContactSteps steps;
+    CertificateFault fault = CertificateFault::none;
+    std::optional<std::int64_t> clockOffset;  ///< s by which this device is ahead of the answer's "Date"
 };
 
 /// Called after each answer with all answers so far; true ends the others at once, as failed.

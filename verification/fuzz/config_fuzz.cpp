@@ -17,7 +17,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     if (refusal && shown != kDefaults) std::abort();
     Config again = Config::defaults();
     if (applyConfig(shown, again) || endpointsAsJson(again) != shown) std::abort();
-    captiveFromApi(text);
+    portalFromApi(text);
     nameFromSupplicant(text);
     dateFromText(text);
     return 0;

@@ -4,6 +4,7 @@
 
 #include "exchange/anonymous_addresses.h"
 #include "exchange/anonymous_names.h"
+#include "platform/json_writer.h"
 
 namespace wp {
 namespace {
@@ -20,6 +21,29 @@ TEST(Anonymise, ReplacesNamesAndAddressesThroughoutARecording) {
     for (const char* secret : {"Ann", "Zed", "café", "Typed", "aa:bb", "AA:BB", "aa-bb", "8.8.8.8", "1.1.1.1",
                                "9.9.9.9", "2a00", "ccff"})
         EXPECT_EQ(text.find(secret), std::string::npos) << secret;
+}
+
+TEST(Anonymise, ReplacesNamesAndAddressesInDetailsButNoOtherWord) {
+    const auto network = Dictionary::make(
+        {{"ssid", "redirect"}, {"bssid", "aa:bb:cc:dd:ee:ff"}, {"security", "WPA2 Personal"}});
+    const auto details = Dictionary::make({{"networks", Array{network}},
+                                           {"kind", "redirect"},
+                                           {"url", "http://login.hotel-rose.example/?mac=AABBCCDDEEFF"},
+                                           {"hops", Array{"81.2.3.4", Value()}}});
+    Recording recording;
+    recording.answers.emplace_back();
+    recording.answers[0].test = 24;
+    recording.answers[0].response.results =
+        DiagnosticsTestResults{std::make_shared<DiagnosticsTestResult>(DiagnosticsTestResult{
+            true, false, Dictionary::make({{"Details", details}, {"NetworkName", "redirect"}})})};
+
+    const Recording without = anonymised(recording);
+
+    EXPECT_EQ(
+        jsonText(without.answers[0].response.results->front()->info, JSONStyle::compact),
+        R"({"Details":{"hops":["198.18.0.1",null],"kind":"redirect","networks":[{"bssid":"02:00:00:00:00:01",)"
+        R"("security":"WPA2 Personal","ssid":"Net 0001"}],"url":"http://portal.example/"},)"
+        R"("NetworkName":"Net 0001"})");
 }
 
 TEST(Anonymise, LeavesTheOriginalAlone) {

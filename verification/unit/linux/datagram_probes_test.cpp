@@ -219,6 +219,37 @@ TEST(NameLookup, GarbageIsNoAnswer) {
     EXPECT_NE(answer->why, "");
 }
 
+TEST(NameLookup, EachServerIsToldApart) {
+    const UdpServer server([](const Message& query) { return dnsAnswer(query, {203, 0, 113, 7}, {}); });
+    NameServerSet both = at(server);
+    both.servers.push_back(*IPAddress::fromText("127.0.0.2"));  // nothing listens there
+    const auto answers = askEachServer("host.example", both, patience());
+    ASSERT_TRUE(answers);
+    ASSERT_EQ(answers->size(), 2U);
+    EXPECT_TRUE(answers->at(0).answered);
+    EXPECT_EQ(answers->at(0).code, "NOERROR");
+    EXPECT_EQ(answers->at(0).server, IPAddress::fromText("127.0.0.1"));
+    EXPECT_FALSE(answers->at(1).answered);
+    EXPECT_EQ(answers->at(1).code, "unreachable");
+}
+
+TEST(NameLookup, AServersOwnWordIsKept) {
+    const std::pair<int, const char*> codes[] = {{2, "SERVFAIL"}, {3, "NXDOMAIN"}, {5, "REFUSED"}};
+    for (const auto& [code, word] : codes) {
+        const UdpServer server(
+            [rcode = code](const Message& query) { return dnsAnswer(query, {}, {}, rcode); });
+        const auto answers = askEachServer("host.example", at(server), patience());
+        ASSERT_TRUE(answers);
+        EXPECT_EQ(answers->front().code, word);
+        EXPECT_TRUE(answers->front().answered);
+    }
+    const UdpServer dead(silence);
+    const auto answers = askEachServer("host.example", at(dead), patience(100ms));
+    ASSERT_TRUE(answers);
+    EXPECT_EQ(answers->front().code, "timeout");
+    EXPECT_FALSE(answers->front().answered);
+}
+
 TEST(NameLookup, BeingStoppedEndsIt) {
     const StopOnceAsked asked;
     const UdpServer server(asked);

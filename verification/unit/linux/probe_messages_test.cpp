@@ -211,16 +211,20 @@ TEST(Soap, ReadsTheOuterAddress) {
 }
 
 TEST(PortalApi, BelievesACaptiveAnswerOnlyWithAPageToGoTo) {
-    EXPECT_EQ(captiveFromApi(R"({"captive":true,"user-portal-url":"https://p.example/"})"), true);
-    EXPECT_EQ(captiveFromApi(R"({"captive":false})"), false);
-    EXPECT_EQ(captiveFromApi(R"({"captive":true})"), std::nullopt);
-    EXPECT_EQ(captiveFromApi(R"({"captive":true,"user-portal-url":""})"), std::nullopt);
-    EXPECT_EQ(captiveFromApi(R"({"captive":"true"})"), std::nullopt);
-    EXPECT_EQ(captiveFromApi(R"([true])"), std::nullopt);
-    EXPECT_EQ(captiveFromApi("<html>"), std::nullopt);
-    EXPECT_EQ(captiveFromApi(R"({"captive":false,"x":")" + std::string(kLongestPortalAnswer, 'x') + "\"}"),
-              std::nullopt);
-    EXPECT_EQ(captiveFromApi(std::string(100, '[')), std::nullopt);
+    const auto captive = portalFromApi(R"({"captive":true,"user-portal-url":"https://p.example/"})");
+    ASSERT_TRUE(captive);
+    EXPECT_TRUE(captive->captive);
+    EXPECT_EQ(captive->page, "https://p.example/");
+    const auto open = portalFromApi(R"({"captive":false})");
+    ASSERT_TRUE(open);
+    EXPECT_FALSE(open->captive);
+    EXPECT_FALSE(portalFromApi(R"({"captive":true})"));
+    EXPECT_FALSE(portalFromApi(R"({"captive":true,"user-portal-url":""})"));
+    EXPECT_FALSE(portalFromApi(R"({"captive":"true"})"));
+    EXPECT_FALSE(portalFromApi(R"([true])"));
+    EXPECT_FALSE(portalFromApi("<html>"));
+    EXPECT_FALSE(portalFromApi(R"({"captive":false,"x":")" + std::string(kLongestPortalAnswer, 'x') + "\"}"));
+    EXPECT_FALSE(portalFromApi(std::string(100, '[')));
 }
 
 TEST(PortalApi, IsNamedByALease) {

@@ -100,6 +100,29 @@ TEST_F(WebClient, ASecureConnectionNeedsACertificateOfTheHost) {
     EXPECT_EQ(ask(stranger).end, End::badCertificate);
 }
 
+TEST_F(WebClient, TellsWhatIsWrongWithACertificate) {
+    EXPECT_EQ(ask(secure("/204")).fault, CertificateFault::none);
+    EXPECT_EQ(ask(secure("/204", "other.example")).fault, CertificateFault::wrongHost);
+    WebRequest stranger = secure("/204");
+    stranger.authorities.clear();
+    EXPECT_EQ(ask(stranger).fault, CertificateFault::selfSigned);
+}
+
+TEST_F(WebClient, TellsTheStepsOfARequestAndTheServersClock) {
+    const WebAnswer answer = ask(secure("/page")), open = ask(plain("/204"));
+    WebRequest connecting = secure("/hang");
+    connecting.connectOnly = true;
+    const WebAnswer connected = ask(connecting);
+
+    EXPECT_TRUE(answer.steps.connect && answer.steps.secure && answer.steps.firstByte);
+    EXPECT_TRUE(open.steps.connect && !open.steps.secure);
+    EXPECT_TRUE(connected.steps.secure && !connected.steps.firstByte);
+    ASSERT_TRUE(open.clockOffset);
+    EXPECT_LE(std::abs(*open.clockOffset), 60);
+    EXPECT_EQ(ask(plain("/yesterday")).clockOffset.value_or(0) / 3600, 24);
+    EXPECT_FALSE(connected.clockOffset);
+}
+
 TEST_F(WebClient, ConnectingAloneAsksForNothing) {
     WebRequest request = secure("/hang");
     request.connectOnly = true;

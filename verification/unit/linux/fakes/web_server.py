@@ -3,10 +3,12 @@
 
 Usage: web_server.py CERTIFICATE KEY
 """
+import email.utils
 import http.server
 import ssl
 import sys
 import threading
+import time
 
 API = b'{"captive": true, "user-portal-url": "https://portal.example/"}'
 DESCRIPTION = b"""<?xml version="1.0"?><root><device><manufacturer>Example Networks</manufacturer>
@@ -33,6 +35,10 @@ class Handler(http.server.BaseHTTPRequestHandler):
         path = self.path
         if path == "/204":
             self.answer(204)
+        elif path == "/yesterday":
+            self.send_response_only(204)
+            self.send_header("Date", email.utils.formatdate(time.time() - 86400 - 60, usegmt=True))
+            self.end_headers()
         elif path == "/empty":
             self.answer(200)
         elif path == "/page":
