@@ -13,7 +13,8 @@ LIMIT = re.compile(r"struct \w+Limits \{(.*?)\n\};", re.DOTALL)
 NAMED = re.compile(r"(\w+)\s*(?:=\s*|\{)(-?[\d.']+)\}?(?=[,;]|$)")
 # Numbers of protocols and forms, by which nothing is judged.
 NO_THRESHOLDS = {"kFirstMembershipSelector", "kFastestDirectSequenceRate", "kVendor", "kExtension", "kVendorElement", "kEscapeSize",
-                 "kSecondaryAbove", "kSecondaryBelow", "kOlderStationsPresent", "kProtectionInUse", "kUnknownSignal", "kMaximumSize"}  # fmt: skip
+                 "kSecondaryAbove", "kSecondaryBelow", "kOlderStationsPresent", "kProtectionInUse", "kUnknownSignal", "kMaximumSize", "kFixed",
+                 "kVhtPart", "kCohostedPart"}  # fmt: skip
 
 
 def numbers_in(text: str) -> dict[str, str]:
