@@ -6,7 +6,7 @@
 
 namespace wp {
 
-/// A file descriptor that closes itself.
+/// An open file descriptor that is closed with its owner, or none.
 class Descriptor {
   public:
     explicit Descriptor(int number = -1) : number_(number) {}
@@ -21,7 +21,8 @@ class Descriptor {
     ~Descriptor() { close(); }
 
     int number() const { return number_; }
-    bool isOpen() const { return number_ >= 0; }
+    /// Whether it is open.
+    explicit operator bool() const { return number_ >= 0; }
     /// Whether closing told of no error; harmless when nothing is open.
     bool close() { return number_ < 0 || ::close(std::exchange(number_, -1)) == 0; }
 

@@ -119,7 +119,7 @@ std::optional<std::string> ServiceProcess::waitForEnd(Duration patience) {
     while (!reap()) {
         auto left = std::chrono::ceil<milliseconds>(until - Clock::now());
         if (left.count() <= 0) return std::nullopt;
-        if (watch.isOpen()) {
+        if (watch) {
             pollfd ended{watch.number(), POLLIN, 0};
             ::poll(&ended, 1, static_cast<int>(left.count()));
         } else {

@@ -50,7 +50,7 @@ std::string resolved(const std::string& path) {
 
 std::optional<Refusal> writeDirectly(const std::string& path, std::string_view text) {
     Descriptor file(::open(path.c_str(), O_WRONLY | O_CLOEXEC | O_NOCTTY));
-    if (!file.isOpen()) return Refusal{"", reason("cannot be opened")};
+    if (!file) return Refusal{"", reason("cannot be opened")};
     if (!writeAll(file.number(), text)) return Refusal{"", reason("cannot be written")};
     return std::nullopt;
 }
@@ -58,7 +58,7 @@ std::optional<Refusal> writeDirectly(const std::string& path, std::string_view t
 std::optional<Refusal> replaceFile(const std::string& path, std::string_view text, mode_t permissions) {
     std::string beside = path + ".XXXXXX";
     Descriptor file(::mkostemp(beside.data(), O_CLOEXEC));
-    if (!file.isOpen()) return Refusal{"", reason("cannot be created")};
+    if (!file) return Refusal{"", reason("cannot be created")};
     bool isWritten = writeAll(file.number(), text) && ::fchmod(file.number(), permissions) == 0 &&
                      ::fsync(file.number()) == 0 && file.close() &&
                      ::rename(beside.c_str(), path.c_str()) == 0;
@@ -73,7 +73,7 @@ std::optional<Refusal> replaceFile(const std::string& path, std::string_view tex
 std::variant<std::string, Refusal> readWholeFile(const std::string& path, std::size_t limit) {
     if (path == "-") return readAll(STDIN_FILENO, limit);
     Descriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NOCTTY));
-    if (!file.isOpen()) return Refusal{"", reason("cannot be opened")};
+    if (!file) return Refusal{"", reason("cannot be opened")};
     return readAll(file.number(), limit);
 }
 

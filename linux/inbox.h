@@ -4,7 +4,7 @@
 #include <mutex>
 #include <vector>
 
-#include "linux/descriptor.h"
+#include "exchange/descriptor.h"
 
 namespace wp {
 

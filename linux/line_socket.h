@@ -4,7 +4,7 @@
 #include <string>
 #include <string_view>
 
-#include "linux/descriptor.h"
+#include "exchange/descriptor.h"
 
 namespace wp {
 

@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-#include "linux/descriptor.h"
+#include "exchange/descriptor.h"
 #include "service/bytes.h"
 #include "service/known.h"
 

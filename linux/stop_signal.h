@@ -3,7 +3,7 @@
 #include <chrono>
 #include <memory>
 
-#include "linux/descriptor.h"
+#include "exchange/descriptor.h"
 #include "service/known.h"
 
 namespace wp {

@@ -3,7 +3,7 @@
 #include <fcntl.h>
 #include <sys/stat.h>
 
-#include "linux/descriptor.h"
+#include "exchange/descriptor.h"
 
 namespace wp {
 namespace {

@@ -6,7 +6,7 @@
 #include <string>
 #include <vector>
 
-#include "linux/descriptor.h"
+#include "exchange/descriptor.h"
 #include "linux/wait_any.h"
 #include "service/ip_address.h"
 

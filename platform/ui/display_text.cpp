@@ -1,21 +1,17 @@
 #include "platform/ui/display_text.h"
 
-#include <algorithm>
 #include <array>
 #include <cstdio>
+
+#include "platform/ui/code_point_ranges.h"
 
 namespace wp::ui {
 namespace {
 
-struct Range {
-    char32_t first;
-    char32_t last;
-};
-
 // Unicode 15: the line and paragraph separators and everything with the property
 // Default_Ignorable_Code_Point (zero-width, direction, tag and filler characters), then the interlinear
 // annotation characters and the noncharacters at the end of the first plane. Sorted.
-constexpr std::array kWithoutGlyph = std::to_array<Range>({
+constexpr std::array kWithoutGlyph = std::to_array<CodePointRange>({
     {0x00AD, 0x00AD},
     {0x034F, 0x034F},
     {0x061C, 0x061C},
@@ -37,18 +33,12 @@ constexpr std::array kWithoutGlyph = std::to_array<Range>({
 });
 
 // Where a text or emoji presentation may be chosen (emoji-variation-sequences.txt, taken as blocks).
-constexpr std::array kWithTwoPresentations = std::to_array<Range>({
+constexpr std::array kWithTwoPresentations = std::to_array<CodePointRange>({
     {0x0023, 0x0023}, {0x002A, 0x002A}, {0x0030, 0x0039}, {0x00A9, 0x00A9}, {0x00AE, 0x00AE},
     {0x203C, 0x203C}, {0x2049, 0x2049}, {0x2122, 0x2122}, {0x2139, 0x2139}, {0x2194, 0x21AA},
     {0x231A, 0x23FA}, {0x24C2, 0x24C2}, {0x25AA, 0x25FE}, {0x2600, 0x27BF}, {0x2934, 0x2935},
     {0x2B05, 0x2B55}, {0x3030, 0x3030}, {0x303D, 0x303D}, {0x3297, 0x3299}, {0x1F004, 0x1F6FF},
 });
-
-bool isIn(const auto& ranges, char32_t c) {
-    auto after = std::upper_bound(ranges.begin(), ranges.end(), c,
-                                  [](char32_t value, const Range& range) { return value < range.first; });
-    return after != ranges.begin() && c <= std::prev(after)->last;
-}
 
 bool isControl(char32_t c) {
     return c < 0x20 || (c >= 0x7F && c <= 0x9F);

@@ -1,21 +1,14 @@
 #include "platform/ui/unicode.h"
 
-#include <algorithm>
-#include <iterator>
-
+#include "platform/ui/code_point_ranges.h"
 #include "platform/ui/display_text.h"
 
 namespace wp::ui {
 namespace {
 
-struct Range {
-    char32_t first;
-    char32_t last;
-};
-
 // clang-format off
 // Marks that take no place of their own: general categories Mn, Me, Cf and the Hangul vowels and finals.
-constexpr Range kZeroWidth[] = {
+constexpr CodePointRange kZeroWidth[] = {
     {0x0300, 0x036F}, {0x0483, 0x0489}, {0x0591, 0x05BD}, {0x05BF, 0x05BF}, {0x05C1, 0x05C2}, {0x05C4, 0x05C5},
     {0x05C7, 0x05C7}, {0x0610, 0x061A}, {0x064B, 0x065F}, {0x0670, 0x0670}, {0x06D6, 0x06DC}, {0x06DF, 0x06E4},
     {0x06E7, 0x06E8}, {0x06EA, 0x06ED}, {0x0711, 0x0711}, {0x0730, 0x074A}, {0x07A6, 0x07B0}, {0x07EB, 0x07F3},
@@ -36,7 +29,7 @@ constexpr Range kZeroWidth[] = {
     {0xFB1E, 0xFB1E}, {0xFE00, 0xFE0F}, {0xFE20, 0xFE2F}, {0xFEFF, 0xFEFF}, {0x1F3FB, 0x1F3FF},
     {0xE0001, 0xE007F}, {0xE0100, 0xE01EF},
 };
-constexpr Range kWide[] = {
+constexpr CodePointRange kWide[] = {
     {0x1100, 0x115F}, {0x231A, 0x231B}, {0x2329, 0x232A}, {0x23E9, 0x23EC}, {0x23F0, 0x23F0}, {0x23F3, 0x23F3},
     {0x25FD, 0x25FE}, {0x2614, 0x2615}, {0x2648, 0x2653}, {0x267F, 0x267F}, {0x2693, 0x2693}, {0x26A1, 0x26A1},
     {0x26AA, 0x26AB}, {0x26BD, 0x26BE}, {0x26C4, 0x26C5}, {0x26CE, 0x26CE}, {0x26D4, 0x26D4}, {0x26EA, 0x26EA},
@@ -56,13 +49,6 @@ constexpr Range kWide[] = {
     {0x1F947, 0x1F9FF}, {0x1FA70, 0x1FAFF}, {0x20000, 0x2FFFD}, {0x30000, 0x3FFFD},
 };
 // clang-format on
-
-template <std::size_t count>
-bool isIn(const Range (&ranges)[count], char32_t codePoint) {
-    auto after = std::upper_bound(std::begin(ranges), std::end(ranges), codePoint,
-                                  [](char32_t value, const Range& range) { return value < range.first; });
-    return after != std::begin(ranges) && codePoint <= std::prev(after)->last;
-}
 
 constexpr char32_t kReplacement = 0xFFFD;
 constexpr char32_t kZeroWidthJoiner = 0x200D;

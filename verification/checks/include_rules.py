@@ -18,7 +18,7 @@ MAY_INCLUDE = {
     "service": ["platform"],
     "exchange": ["platform"],
     "linux": ["platform", "service", "exchange/codec.h", "exchange/wire.h", "exchange/json_reader.h",
-              "exchange/object_reader.h", "exchange/place.h"],
+              "exchange/object_reader.h", "exchange/place.h", "exchange/descriptor.h"],
     "screens/remote": ["platform"],
     "screens/headless": ["platform", "screens/remote"],
     "screens/terminal": ["platform", "screens/remote"],

@@ -9,7 +9,7 @@
 #include <thread>
 #include <vector>
 
-#include "linux/descriptor.h"
+#include "exchange/descriptor.h"
 #include "linux/stop_signal.h"
 
 namespace wp {
