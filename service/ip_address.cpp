@@ -85,16 +85,17 @@ std::optional<ByteList> coloned(std::string_view text) {
     return head;
 }
 
-/// Start and length of the longest run of two or more zero groups, the first of equals.
-std::pair<int, int> longestGap(const std::array<unsigned, 8>& parts) {
-    int start = -1, longest = 1;
-    for (int i = 0; i < 8; ++i) {
-        int length = 0;
-        while (i + length < 8 && parts[static_cast<std::size_t>(i + length)] == 0) ++length;
+/// Start and length of the longest run of two or more zero groups, the first of equals; past the end where there
+/// is none.
+std::pair<std::size_t, std::size_t> longestGap(const std::array<unsigned, 8>& parts) {
+    std::size_t start = parts.size(), longest = 1;
+    for (std::size_t i = 0; i < parts.size(); ++i) {
+        std::size_t length = 0;
+        while (i + length < parts.size() && parts[i + length] == 0) ++length;
         if (length > longest) start = i, longest = length;
         i += length;
     }
-    return {start, start < 0 ? 0 : longest};
+    return {start, longest};
 }
 
 std::string hexadecimal(unsigned value) {
@@ -108,14 +109,14 @@ std::string colonText(Bytes bytes) {
     for (std::size_t i = 0; i < 8; ++i) parts[i] = bytes[2 * i] << 8U | bytes[2 * i + 1];
     const auto [start, length] = longestGap(parts);
     std::string text;
-    for (int i = 0; i < 8; ++i) {
+    for (std::size_t i = 0; i < parts.size(); ++i) {
         if (i == start) {
             text += "::";
             i += length - 1;
             continue;
         }
         if (!text.empty() && text.back() != ':') text += ':';
-        text += hexadecimal(parts[static_cast<std::size_t>(i)]);
+        text += hexadecimal(parts[i]);
     }
     return text;
 }
