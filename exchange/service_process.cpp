@@ -60,7 +60,8 @@ std::string describeEnd(int status) {
     if (WIFSIGNALED(status)) {
         int signal = WTERMSIG(status);
         const char* name = ::sigdescr_np(signal);
-        return "signal " + std::to_string(signal) + (name ? std::string(", ") + name : "");
+        const char* const why = signal == SIGSYS ? ": its sandbox forbids what it was about to do" : "";
+        return "signal " + std::to_string(signal) + (name ? std::string(", ") + name : "") + why;
     }
     return "exit status " + std::to_string(WEXITSTATUS(status));
 }

@@ -188,29 +188,29 @@ constexpr Fact kPingsAndScan[] = {Fact::gatewayEcho, Fact::outsideEcho, Fact::ne
 
 // clang-format off
 constexpr FactRow kRows[] = {
-    // fact                     needs          after          most  gather               loss
-    {Fact::link,                {},            {},            3s,   link,                "anything about Wi-Fi"},
+    // fact                     name                   needs          after          most  gather               loss
+    {Fact::link,                "link",                 {},            {},            3s,   link,                "anything about Wi-Fi"},
     // A joined radio listens through two bands in 16 s.
-    {Fact::nearby,              kLink,         kPings,        30s,  nearby,              "which networks are near"},
-    {Fact::listened,            kLink,         kPingsAndScan, 20s,  listened,            "which networks hide"},
-    {Fact::station,             kLink,         {},            3s,   station,             "how strong the signal is"},
-    {Fact::survey,              kLink,         {},            3s,   survey,              "how loud the noise is"},
-    {Fact::regulation,          kLink,         {},            3s,   regulation,          "the radio's country"},
-    {Fact::addresses,           kLink,         {},            3s,   addresses,           "the addresses"},
-    {Fact::gatewayEcho,         kLink,         {},            4s,   gatewayEcho,         "whether the router and others answer"},
-    {Fact::setup,               kLink,         {},            4s,   setup,               "how the device is set up"},
-    {Fact::saved,               kLink,         {},            4s,   saved,               "the remembered networks"},
-    {Fact::bluetooth,           {},            {},            3s,   bluetooth,           "the Bluetooth devices"},
-    {Fact::driverSharesAirtime, kLink,         {},            1s,   driverSharesAirtime, "how Bluetooth shares airtime"},
-    {Fact::peerLinks,           kLink,         {},            3s,   peerLinks,           "the peer-to-peer links"},
-    {Fact::airtime,             kLink,         {},            4s,   airtime,             "how busy the channels are"},
-    {Fact::allowedChannels,     kLink,         {},            3s,   allowedChannels,     "the channels to choose from"},
-    {Fact::outsideEcho,         kLink,         {},            4s,   outsideEcho,         "whether the router and others answer"},
-    {Fact::nameAnswer,          kSetup,        {},            4s,   nameAnswer,          "whether names resolve"},
-    {Fact::portal,              kSetup,        {},            5s,   portal,              "whether there is a portal"},
-    {Fact::vendorService,       kSetup,        {},            5s,   vendorService,       "whether the vendor is reached"},
-    {Fact::router,              kLink,         {},            4s,   router,              "who made the router"},
-    {Fact::translation,         kTranslation,  {},            3s,   translation,         "how often addresses are translated"},
+    {Fact::nearby,              "nearby",               kLink,         kPings,        30s,  nearby,              "which networks are near"},
+    {Fact::listened,            "listened",             kLink,         kPingsAndScan, 20s,  listened,            "which networks hide"},
+    {Fact::station,             "station",              kLink,         {},            3s,   station,             "how strong the signal is"},
+    {Fact::survey,              "survey",               kLink,         {},            3s,   survey,              "how loud the noise is"},
+    {Fact::regulation,          "regulation",           kLink,         {},            3s,   regulation,          "the radio's country"},
+    {Fact::addresses,           "addresses",            kLink,         {},            3s,   addresses,           "the addresses"},
+    {Fact::gatewayEcho,         "gatewayEcho",          kLink,         {},            4s,   gatewayEcho,         "whether the router and others answer"},
+    {Fact::setup,               "setup",                kLink,         {},            4s,   setup,               "how the device is set up"},
+    {Fact::saved,               "saved",                kLink,         {},            4s,   saved,               "the remembered networks"},
+    {Fact::bluetooth,           "bluetooth",            {},            {},            3s,   bluetooth,           "the Bluetooth devices"},
+    {Fact::driverSharesAirtime, "driverSharesAirtime",  kLink,         {},            1s,   driverSharesAirtime, "how Bluetooth shares airtime"},
+    {Fact::peerLinks,           "peerLinks",            kLink,         {},            3s,   peerLinks,           "the peer-to-peer links"},
+    {Fact::airtime,             "airtime",              kLink,         {},            4s,   airtime,             "how busy the channels are"},
+    {Fact::allowedChannels,     "allowedChannels",      kLink,         {},            3s,   allowedChannels,     "the channels to choose from"},
+    {Fact::outsideEcho,         "outsideEcho",          kLink,         {},            4s,   outsideEcho,         "whether the router and others answer"},
+    {Fact::nameAnswer,          "nameAnswer",           kSetup,        {},            4s,   nameAnswer,          "whether names resolve"},
+    {Fact::portal,              "portal",               kSetup,        {},            5s,   portal,              "whether there is a portal"},
+    {Fact::vendorService,       "vendorService",        kSetup,        {},            5s,   vendorService,       "whether the vendor is reached"},
+    {Fact::router,              "router",               kLink,         {},            4s,   router,              "who made the router"},
+    {Fact::translation,         "translation",          kTranslation,  {},            3s,   translation,         "how often addresses are translated"},
 };
 // clang-format on
 

@@ -23,6 +23,7 @@ struct Gathering {
 /// How one fact is had.
 struct FactRow {
     Fact fact;
+    const char* name;             ///< in a trace
     std::span<const Fact> needs;  ///< facts that it builds on
     std::span<const Fact> after;  ///< facts that it must not disturb: it waits while they are being gathered
     std::chrono::milliseconds most;               ///< how long it may take

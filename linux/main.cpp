@@ -1,3 +1,4 @@
+#include <malloc.h>
 #include <sys/socket.h>
 
 #include <cstdio>
@@ -89,6 +90,8 @@ bool isSocket(int descriptor) {
 }  // namespace
 
 int main(int count, char** arguments) {
+    // Some twenty threads come and go, and each would begin a heap of its own.
+    mallopt(M_ARENA_MAX, 1);
     const std::variant<Options, int> read = readOptions(count, arguments);
     if (const int* status = std::get_if<int>(&read)) return *status;
     const Options& options = std::get<Options>(read);
@@ -111,6 +114,8 @@ int main(int count, char** arguments) {
     wp::Sources sources;
     sources.interfaceName = options.interfaceName;
     sources.config = std::get<wp::Config>(config);
+    const char* const trace = std::getenv("WIFI_PROFILE_TRACE");
+    sources.traced = trace != nullptr && *trace != '\0';
     wp::PowerSwitch power;
     wp::dropPrivileges();
     const wp::Sandbox sandbox = wp::enterSandbox();

@@ -87,13 +87,24 @@ void Phase::launchWhatCan() {
     }
 }
 
+void Phase::trace(const char* fact, Clock::time_point begin) const {
+    const auto since = [](Clock::time_point from, Clock::time_point to) {
+        return std::to_string(std::chrono::duration_cast<std::chrono::milliseconds>(to - from).count());
+    };
+    const char* const kind = topic_.subject == Subject::device ? "device" : topic_.named ? "named" : "joined";
+    sources_.notes.once(std::string("trace: ") + kind + " " + fact + " began at " +
+                        since(traceStart_, begin) + " ms, took " + since(begin, Clock::now()) + " ms");
+}
+
 void Phase::launch(Fact fact) {
     state(fact) = State::running;
     const FactRow& row = rowOf(fact);
     workers_.start([self = shared_from_this(), &row]() -> Workers::Publication {
-        const Until until{self->stop_, Clock::now() + row.most};
+        const Clock::time_point begin = Clock::now();
+        const Until until{self->stop_, begin + row.most};
         Store store =
             row.gather({self->facts_, self->topic_, self->startedAt_, self->sources_, until, row.loss});
+        if (self->sources_.traced) self->trace(row.name, begin);
         return [self, &row, store = std::move(store)] {
             store(self->facts_);
             self->state(row.fact) = State::done;

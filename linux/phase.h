@@ -20,6 +20,7 @@ struct Sources {
     EchoSocket gatewayEcho;
     EchoSocket outsideEcho;
     Config config = Config::defaults();
+    bool traced = false;  ///< whether a note says when each fact was gathered
 };
 
 /// What one phase is about.
@@ -57,9 +58,11 @@ class Phase : public std::enable_shared_from_this<Phase> {
     void want(Fact fact);
     void launchWhatCan();
     void launch(Fact fact);
+    void trace(const char* fact, Clock::time_point begin) const;
 
     PhaseTopic topic_;
     std::int64_t startedAt_ = bootMilliseconds();
+    Clock::time_point traceStart_ = Clock::now();
     Sources& sources_;
     Workers& workers_;
     std::shared_ptr<const StopSignal> stop_;

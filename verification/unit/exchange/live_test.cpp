@@ -149,6 +149,12 @@ TEST_F(Live, SaysHowAServiceEnded) {
     EXPECT_EQ(errorOf(1), "wifi-profile-service ended (signal 9, Killed) (code 4)");
     EXPECT_EQ(service_->failure()->code, 4);
 
+    start({R"("test":1)", "forbidden"});
+    EXPECT_EQ(errorOf(1),
+              "wifi-profile-service ended (signal 31, Bad system call: its sandbox forbids what it was about "
+              "to do) "
+              "(code 4)");
+
     start({R"("test":1)", "close"});
     EXPECT_EQ(errorOf(1), "wifi-profile-service closed the connection (code 4)");
 

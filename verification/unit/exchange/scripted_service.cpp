@@ -9,6 +9,7 @@
 //   deaf          reads nothing any more
 //   exit:N        ends with this status
 //   crash         is killed by a signal
+//   forbidden     is killed as its sandbox would do it
 //   close         closes the connection and lives on
 //
 // "start" in place of a request's text is done before the first request is read. The environment's
@@ -63,6 +64,8 @@ void perform(const std::string& action, std::string_view line) {
         sleepForEver();
     } else if (action.starts_with("exit:")) {
         ::_exit(std::atoi(rest("exit:").c_str()));
+    } else if (action == "forbidden") {
+        ::raise(SIGSYS);
     } else if (action == "crash") {
         ::raise(SIGKILL);
     } else if (action == "close") {
