@@ -13,7 +13,7 @@ using std::chrono::milliseconds;
 // A network that hides its name is often missed by one visit of 30 ms on its channel.
 constexpr int kListenAttempts = 3;
 constexpr int kStartAttempts = 4;
-// NetworkManager puts a scan off when another one has just ended, by up to 8 s while it is connected.
+// Managers put a scan off for some seconds when another one has just ended.
 constexpr std::chrono::seconds kManagersDelay{10};
 
 /// One row of scans for one wish.
