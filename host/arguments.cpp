@@ -3,6 +3,7 @@
 #include <charconv>
 #include <cmath>
 #include <set>
+#include <span>
 
 #include "host/exit.h"
 
@@ -11,12 +12,13 @@ namespace {
 
 enum class Takes { nothing, value, optionalValue };
 
+template <class Options>
 struct Option {
     const char* name;
     Takes takes;
     const char* placeholder;
     const char* help;
-    void (*apply)(RunOptions&, const std::string& value);
+    void (*apply)(Options&, const std::string& value);
 };
 
 constexpr const char* kDefaultDemo = "home";
@@ -51,8 +53,13 @@ OutputFormat formatFrom(const std::string& text) {
     refuse("--format: " + quoted(text) + " is no format of a run; give json or text");
 }
 
+OutputFormat reportFormatFrom(const std::string& text) {
+    if (text == "text") return OutputFormat::text;
+    refuse("--format: " + quoted(text) + " is no format of a report; give text");
+}
+
 // clang-format off
-const Option kOptions[] = {
+const Option<RunOptions> kRunOptions[] = {
     {"--request", Takes::value, "FILE", "the request's parameters as a JSON object (-: standard input)",
      [](RunOptions& o, const std::string& v) { o.requestFile = v; }},
     {"--max-scan-cache-age", Takes::value, "N", "accept scans up to N seconds old, 0 to 600 (default 60)",
@@ -96,51 +103,84 @@ const Option kOptions[] = {
 };
 // clang-format on
 
-const Option* optionNamed(const std::string& name) {
-    for (const Option& option : kOptions)
-        if (name == option.name) return &option;
-    return nullptr;
-}
+// clang-format off
+const Option<ReportOptions> kReportOptions[] = {
+    {"--format", Takes::value, "FORMAT", "text (default)",
+     [](ReportOptions& o, const std::string& v) { o.format = reportFormatFrom(v); }},
+    {"--all", Takes::nothing, "", "every test, not only the findings",
+     [](ReportOptions& o, const std::string&) { o.all = true; }},
+    {"--locale", Takes::value, "NAME", "language of the report: en, de, ja or x-keys",
+     [](ReportOptions& o, const std::string& v) { o.locale = v; }},
+    {"--config", Takes::value, "FILE", "the thresholds that the run went by (JSON)",
+     [](ReportOptions& o, const std::string& v) { o.configFile = v; }},
+    {"--output", Takes::value, "FILE", "write the report there instead of to standard output",
+     [](ReportOptions& o, const std::string& v) { o.outputFile = v; }},
+    {"--extension", Takes::value, "PATH", "the diagnostic's module, where it is not beside the program",
+     [](ReportOptions& o, const std::string& v) { o.extension = v; }},
+};
 
-/// Walks through the words after `run`.
-class RunOptionsReader {
+const Option<ReportOptions> kTestsOptions[] = {
+    {"--locale", Takes::value, "NAME", "language of the catalogue: en, de, ja or x-keys",
+     [](ReportOptions& o, const std::string& v) { o.locale = v; }},
+    {"--config", Takes::value, "FILE", "thresholds other than the program's own (JSON)",
+     [](ReportOptions& o, const std::string& v) { o.configFile = v; }},
+};
+// clang-format on
+
+/// Walks through the words after a command.
+template <class Options>
+class OptionsReader {
   public:
-    explicit RunOptionsReader(const std::vector<std::string>& words) : words_(words) {}
+    /// \param file where a word that is no option goes; null: there is none
+    OptionsReader(const std::vector<std::string>& words, std::span<const Option<Options>> known,
+                  std::string* file = nullptr)
+        : words_(words), command_(words[0]), known_(known), file_(file) {}
 
     /// Returns whether help was asked for.
-    bool readInto(RunOptions& options) {
+    bool readInto(Options& options) {
         while (next_ < words_.size()) {
             if (words_[next_] == "--help" || words_[next_] == "-h") return true;
             readOne(options);
         }
-        if (options.showEndpoints) refuseWithoutRun();
         return false;
     }
 
-  private:
-    void refuseWithoutRun() const {
-        for (const std::string& name : seen_) {
-            if (name == "--show-endpoints" || name == "--config" || name == "--interface") continue;
-            refuse(name + ": not together with --show-endpoints, which ends without a run");
-        }
-    }
+    /// The names of the options that were given.
+    const std::set<std::string>& seen() const { return seen_; }
 
-    void readOne(RunOptions& options) {
+  private:
+    void readOne(Options& options) {
         std::string word = words_[next_++];
-        if (word.rfind("--", 0) != 0)
-            refuse(quoted(word) + " is not an option of run; `wifi-profile run --help` lists them");
+        if (word.rfind("--", 0) != 0) return takeFile(word);
         std::optional<std::string> value;
         if (std::size_t equals = word.find('='); equals != std::string::npos) {
             value = word.substr(equals + 1);
             word.resize(equals);
         }
-        const Option* option = optionNamed(word);
-        if (!option) refuse(word + ": no such option of run; `wifi-profile run --help` lists them");
+        const Option<Options>* option = optionNamed(word);
+        if (!option)
+            refuse(word + ": no such option of " + command_ + "; `wifi-profile " + command_ +
+                   " --help` lists them");
         if (!seen_.insert(word).second) refuse(word + ": given twice; give it once");
         option->apply(options, valueOf(*option, std::move(value)));
     }
 
-    std::string valueOf(const Option& option, std::optional<std::string> value) {
+    void takeFile(const std::string& word) {
+        if (!file_)
+            refuse(quoted(word) + " is not an option of " + command_ + "; `wifi-profile " + command_ +
+                   " --help` lists them");
+        if (!file_->empty()) refuse(quoted(word) + ": " + command_ + " takes one file; leave it out");
+        if (word.empty()) refuse(command_ + ": the file's name is empty; give FILE (or -)");
+        *file_ = word;
+    }
+
+    const Option<Options>* optionNamed(const std::string& name) const {
+        for (const Option<Options>& option : known_)
+            if (name == option.name) return &option;
+        return nullptr;
+    }
+
+    std::string valueOf(const Option<Options>& option, std::optional<std::string> value) {
         bool isLast = next_ == words_.size();
         if (option.takes == Takes::nothing) {
             if (value)
@@ -158,9 +198,19 @@ class RunOptionsReader {
     }
 
     const std::vector<std::string>& words_;
+    const std::string& command_;
+    std::span<const Option<Options>> known_;
+    std::string* file_;
     std::size_t next_ = 1;
     std::set<std::string> seen_;
 };
+
+void refuseWithoutRun(const std::set<std::string>& given) {
+    for (const std::string& name : given) {
+        if (name == "--show-endpoints" || name == "--config" || name == "--interface") continue;
+        refuse(name + ": not together with --show-endpoints, which ends without a run");
+    }
+}
 
 void refuseConflicts(const RunOptions& options) {
     if (options.requestFile) {
@@ -187,11 +237,35 @@ void refuseConflicts(const RunOptions& options) {
 }
 
 Arguments reportArguments(const std::vector<std::string>& words) {
-    if (words.size() < 2) refuse("report: needs the result's FILE (or -)");
     Arguments arguments;
     arguments.command = Command::report;
-    arguments.reportFile = words[1];
+    ReportOptions& options = arguments.report;
+    if (OptionsReader<ReportOptions>(words, kReportOptions, &options.file).readInto(options))
+        arguments.command = Command::reportHelp;
+    else if (options.file.empty())
+        refuse("report: needs a FILE (or -), a result or a recording");
     return arguments;
+}
+
+Arguments testsArguments(const std::vector<std::string>& words) {
+    Arguments arguments;
+    arguments.command = Command::tests;
+    if (OptionsReader<ReportOptions>(words, kTestsOptions).readInto(arguments.report))
+        arguments.command = Command::help;
+    return arguments;
+}
+
+template <class Options>
+std::string listed(std::span<const Option<Options>> options) {
+    std::string text;
+    for (const Option<Options>& option : options) {
+        std::string left = std::string("  ") + option.name;
+        if (option.takes == Takes::value) left += std::string(" ") + option.placeholder;
+        if (option.takes == Takes::optionalValue) left += std::string(" [") + option.placeholder + "]";
+        left.resize(std::max<std::size_t>(left.size() + 2, 28), ' ');
+        text += left + option.help + "\n";
+    }
+    return text;
 }
 
 void refuseMore(const std::vector<std::string>& words) {
@@ -207,17 +281,18 @@ Arguments parseArguments(const std::vector<std::string>& words) {
     const std::string& first = words[0];
     if (first == "run") {
         arguments.command = Command::run;
-        if (RunOptionsReader(words).readInto(arguments.run)) {
+        OptionsReader<RunOptions> reader(words, kRunOptions);
+        if (reader.readInto(arguments.run)) {
             arguments.command = Command::runHelp;
-        } else {
-            refuseConflicts(arguments.run);
+            return arguments;
         }
+        if (arguments.run.showEndpoints) refuseWithoutRun(reader.seen());
+        refuseConflicts(arguments.run);
         return arguments;
     }
     if (first == "report") return reportArguments(words);
-    if (first == "tests") {
-        arguments.command = Command::tests;
-    } else if (first == "--help" || first == "-h") {
+    if (first == "tests") return testsArguments(words);
+    if (first == "--help" || first == "-h") {
         arguments.command = Command::help;
     } else if (first == "--version") {
         arguments.command = Command::version;
@@ -233,9 +308,9 @@ std::string helpText() {
            "\n"
            "usage:\n"
            "  wifi-profile run [options]     one run; prints the result as JSON on standard output\n"
-           "  wifi-profile tests             the catalogue of tests and what counts as a finding\n"
-           "  wifi-profile report FILE       a result (or -) as a report that a person reads\n"
-           "  wifi-profile run --help        the options of run\n"
+           "  wifi-profile tests [--locale]  the catalogue of tests and what counts as a finding\n"
+           "  wifi-profile report FILE       a result or a recording (or -) as a report for people\n"
+           "  wifi-profile run --help        the options of run; report --help: those of report\n"
            "  wifi-profile --help, --version\n"
            "\n"
            "exit status: 0 the run is complete; 2 unusable arguments or files; 12 to 17 the run ended\n"
@@ -243,15 +318,13 @@ std::string helpText() {
 }
 
 std::string runHelpText() {
-    std::string text = "usage: wifi-profile run [options]\n\noptions:\n";
-    for (const Option& option : kOptions) {
-        std::string left = std::string("  ") + option.name;
-        if (option.takes == Takes::value) left += std::string(" ") + option.placeholder;
-        if (option.takes == Takes::optionalValue) left += std::string(" [") + option.placeholder + "]";
-        left.resize(std::max<std::size_t>(left.size() + 2, 28), ' ');
-        text += left + option.help + "\n";
-    }
-    return text;
+    return "usage: wifi-profile run [options]\n\noptions:\n" + listed<RunOptions>(kRunOptions);
+}
+
+std::string reportHelpText() {
+    return "usage: wifi-profile report FILE [options]\n\n"
+           "FILE is a result or, with more to tell, a recording (-: standard input).\n\noptions:\n" +
+           listed<ReportOptions>(kReportOptions);
 }
 
 }  // namespace wp::host

@@ -9,7 +9,7 @@ namespace wp::host {
 
 enum class ScreenChoice { automatic, tv, terminal, headless, none };
 enum class OutputFormat { json, text, html };
-enum class Command { run, tests, report, help, runHelp, version };
+enum class Command { run, tests, report, help, runHelp, reportHelp, version };
 
 /// The options of `wifi-profile run` as they were given; what they mean together is decided where they are
 /// used.
@@ -36,18 +36,30 @@ struct RunOptions {
     std::optional<std::string> extension;
 };
 
+/// The options of `wifi-profile report`; those of `tests` are among them.
+struct ReportOptions {
+    std::string file;  ///< a result or a recording; "-" is standard input
+    OutputFormat format = OutputFormat::text;
+    bool all = false;  ///< every test, not findings alone
+    std::optional<std::string> locale;
+    std::optional<std::string> configFile;
+    std::optional<std::string> outputFile;
+    std::optional<std::string> extension;
+};
+
 struct Arguments {
     Command command = Command::help;
     RunOptions run;
-    std::string reportFile;
+    ReportOptions report;
 };
 
 /// Reads the command line (without the program's own name). Throws `Exit` with status 2 and a line that names
 /// the argument. *Main*.
 Arguments parseArguments(const std::vector<std::string>& words);
 
-/// The texts of `--help` and `run --help`.
+/// The texts of `--help`, `run --help` and `report --help`.
 std::string helpText();
 std::string runHelpText();
+std::string reportHelpText();
 
 }  // namespace wp::host

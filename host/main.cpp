@@ -6,11 +6,11 @@
 #include <vector>
 
 #include "host/arguments.h"
-#include "host/catalogue.h"
 #include "host/diagnostics_log.h"
 #include "host/exit.h"
 #include "host/files.h"
 #include "host/output_file.h"
+#include "host/report_command.h"
 #include "host/run.h"
 
 namespace wp::host {
@@ -27,13 +27,15 @@ int perform(const Arguments& arguments) {
         case Command::run:
             return runDiagnostic(arguments.run);
         case Command::tests:
-            return print(catalogueText());
+            return print(catalogueOf(arguments.report));
         case Command::report:
-            refuse("report: this build writes no reports yet; the result itself is JSON");
+            return writeReport(arguments.report);
         case Command::help:
             return print(helpText());
         case Command::runHelp:
             return print(runHelpText());
+        case Command::reportHelp:
+            return print(reportHelpText());
         case Command::version:
             break;
     }

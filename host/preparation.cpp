@@ -15,15 +15,6 @@ namespace {
 /// The recording holds the names of networks nearby: nobody else's business.
 constexpr mode_t kRecordingMode = 0600;
 
-LocaleChoice localeOf(const RunOptions& options) {
-    if (!options.locale) return localeOfEnvironment();
-    std::optional<LocaleChoice> choice = localeNamed(*options.locale);
-    if (choice) return *choice;
-    std::string names;
-    for (const std::string& name : stringTableNames()) names += (names.empty() ? "" : ", ") + name;
-    refuse("--locale: there are no texts for \"" + *options.locale + "\"; give one of " + names);
-}
-
 std::shared_ptr<const Recording> loaded(const std::string& option, const std::string& file) {
     std::variant<Recording, Refusal> recording = readRecording(readFile(option, file));
     if (const Refusal* refusal = std::get_if<Refusal>(&recording))
@@ -88,11 +79,17 @@ void refuseOneFileForTwo(const RunOptions& options) {
 
 }  // namespace
 
+LocaleChoice localeChoice(const std::optional<std::string>& name) {
+    if (!name) return localeOfEnvironment();
+    if (std::optional<LocaleChoice> choice = localeNamed(*name)) return *choice;
+    std::string names;
+    for (const std::string& each : stringTableNames()) names += (names.empty() ? "" : ", ") + each;
+    refuse("--locale: there are no texts for \"" + *name + "\"; give one of " + names);
+}
+
 Preparation prepare(const RunOptions& options) {
-    if (options.format != OutputFormat::json)
-        refuse("--format: this build writes no report yet; leave it out to get the result as JSON");
     Preparation prepared;
-    prepared.locale = localeOf(options);
+    prepared.locale = localeChoice(options.locale);
     prepared.parameters = requestParameters(options);
     prepared.recording = recordingOf(options);
     // A replay has its capabilities from the recording; a file that was named is read all the same.

@@ -27,6 +27,9 @@ struct Preparation {
     std::optional<OutputFile> transcript;  ///< absent also for "-"
 };
 
+/// What `--locale` names, else the environment's. Throws `Exit` (status 2). *Main*.
+LocaleChoice localeChoice(const std::optional<std::string>& name);
+
 /// Throws `Exit` (status 2) with the first thing that is not acceptable. *Main*.
 Preparation prepare(const RunOptions& options);
 

@@ -2,7 +2,7 @@
 
 #include <algorithm>
 
-#include "host/catalogue.h"
+#include "host/report/catalogue.h"
 
 namespace wp::host {
 namespace {

@@ -19,6 +19,9 @@
 #include "host/output_file.h"
 #include "host/preparation.h"
 #include "host/progress_client.h"
+#include "host/report/journal.h"
+#include "host/report/report.h"
+#include "host/report/text_form.h"
 #include "host/result_document.h"
 #include "host/services.h"
 #include "host/transcript.h"
@@ -43,10 +46,13 @@ std::unique_ptr<Transcript> transcriptOf(const RunOptions& options, const Prepar
                                                                : Transcript::Target::nowhere);
 }
 
+/// Whether somebody watches the run, or its evidence alone is wanted, at once and without a word.
+enum class Purpose { run, evidence };
+
 /// One run: all that a diagnostic sees, in the order in which it is made.
 class Run {
   public:
-    Run(const RunOptions& options, const Preparation& prepared)
+    Run(const RunOptions& options, const Preparation& prepared, Purpose purpose)
         : options_(options),
           prepared_(prepared),
           module_(options.extension),
@@ -55,9 +61,11 @@ class Run {
           interruption_(std::make_unique<Interruption>(
               Interruption::Actions{[this] { onInterrupted(); }, [] { restoreTerminal(); }},
               options.timeout)),
-          backgroundQueue_(activity_),
+          backgroundQueue_(activity_, purpose == Purpose::evidence ? BackgroundQueue::Delays::skipped
+                                                                   : BackgroundQueue::Delays::kept),
           services_(makeServices(options, prepared, mainQueue_, log_)),
-          progress_(services_->diagnosticsClient(), log_),
+          journal_(services_->diagnosticsClient()),
+          progress_(journal_, log_),
           automation_(services_->isAutomated() || options.automationFile, prepared.automation),
           localization_(prepared.locale),
           screen_([this](std::string_view line) { log_.note(line); }),
@@ -70,7 +78,9 @@ class Run {
                     log_,
                     localization_,
                     screen_},
-          transcript_(transcriptOf(options, prepared)) {}
+          transcript_(transcriptOf(options, prepared)) {
+        if (purpose == Purpose::evidence) log_.mute();
+    }
 
     /// What a failure on the way left running ends before anything that it uses goes.
     ~Run() {
@@ -90,6 +100,17 @@ class Run {
         return report(obstacle);
     }
 
+    /// The run without its outputs.
+    Evidence evidenceAlone() {
+        setUp();
+        std::optional<std::string> obstacle = drive();
+        tearDown(obstacle.has_value());
+        if (obstacle) fail(*obstacle);
+        if (std::optional<int> interrupted = interruption_->exitStatus())
+            throw Exit(*interrupted, "interrupted");
+        return evidence();
+    }
+
   private:
     void onInterrupted();
     void setUp();
@@ -100,6 +121,8 @@ class Run {
     int report(const std::optional<std::string>& obstacle);
     void writeOutputs(bool hasResult);
     void writeResult();
+    Evidence evidence() const;
+    std::string outputText() const;
 
     const RunOptions& options_;
     const Preparation& prepared_;
@@ -114,6 +137,7 @@ class Run {
     std::unique_ptr<Interruption> interruption_;
     BackgroundQueue backgroundQueue_;
     std::unique_ptr<Services> services_;
+    Journal journal_;
     ProgressClient progress_;
     AutomationFile automation_;
     IcuLocalization localization_;
@@ -204,10 +228,25 @@ void Run::writeOutputs(bool hasResult) {
     if (failure) std::rethrow_exception(failure);
 }
 
+Evidence Run::evidence() const {
+    const DiagnosticResult& result = controller_->result();
+    return journal_.evidence(result.statusCode().value_or(0), result.data());
+}
+
+std::string Run::outputText() const {
+    if (options_.format == OutputFormat::json) return resultDocument(controller_->result());
+    Evidence found = evidence();
+    Texts texts(prepared_.locale.stringTable);
+    TextForm form;
+    if (!prepared_.output && isatty(STDOUT_FILENO)) form.style = TextForm::Style::terminal;
+    Report report = makeReport(found, thresholdsFrom(prepared_.configuration.thresholds), texts);
+    return reportText(report, found, form, texts);
+}
+
 void Run::writeResult() {
-    std::string document = resultDocument(controller_->result());
-    if (prepared_.output) return prepared_.output->write(document);
-    if (std::optional<std::string> error = writeAll(STDOUT_FILENO, document))
+    std::string text = outputText();
+    if (prepared_.output) return prepared_.output->write(text);
+    if (std::optional<std::string> error = writeAll(STDOUT_FILENO, text))
         fail("standard output: the result cannot be written: " + *error);
 }
 
@@ -223,7 +262,11 @@ int showEndpoints(const RunOptions& options) {
 int runDiagnostic(const RunOptions& options) {
     if (options.showEndpoints) return showEndpoints(options);
     Preparation prepared = prepare(options);
-    return Run(options, prepared).perform();
+    return Run(options, prepared, Purpose::run).perform();
+}
+
+Evidence replayedEvidence(const RunOptions& options, const Preparation& prepared) {
+    return Run(options, prepared, Purpose::evidence).evidenceAlone();
 }
 
 }  // namespace wp::host

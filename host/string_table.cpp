@@ -60,4 +60,10 @@ std::optional<StringTable> stringTable(std::string_view name) {
     return std::nullopt;
 }
 
+StringTable reportTable(std::string_view name) {
+    for (const StringTableSource& source : kReportTableSources)
+        if (name == source.name) return parseStringTable(source.text);
+    return parseStringTable(kReportTableSources[0].text);
+}
+
 }  // namespace wp::host

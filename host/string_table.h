@@ -24,4 +24,8 @@ std::vector<std::string> stringTableNames();
 /// The table of that name (`en`, `de`, `ja`, `x-keys`); nothing for a name that no table has. *Any*.
 std::optional<StringTable> stringTable(std::string_view name);
 
+/// The texts of reports in the table of that name. The table `x-keys` holds the default language's, for their
+/// places. *Any*.
+StringTable reportTable(std::string_view name);
+
 }  // namespace wp::host

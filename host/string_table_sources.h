@@ -10,7 +10,8 @@ struct StringTableSource {
     const char* text;
 };
 
-/// The default language first.
+/// Texts of the screens, and of the report and the catalogue; the default language first.
 extern const std::array<StringTableSource, 3> kStringTableSources;
+extern const std::array<StringTableSource, 3> kReportTableSources;
 
 }  // namespace wp::host

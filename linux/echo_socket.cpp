@@ -11,12 +11,13 @@
 #include <ctime>
 #include <random>
 
+#include "service/thresholds.h"
+
 namespace wp {
 namespace {
 
 using std::chrono::milliseconds;
 
-constexpr std::size_t kRequests = 5;
 constexpr milliseconds kApart{200};
 constexpr milliseconds kWait{1000};
 
@@ -73,7 +74,7 @@ class EchoRow {
     /// Nothing, or why the row could not be completed.
     std::optional<Error> run(const Until& until) {
         drain();
-        for (std::size_t i = 0; i < kRequests; ++i) {
+        for (std::size_t i = 0; i < kEchoRequests; ++i) {
             sent_[i] = Clock::now();
             const std::vector<std::uint8_t> request =
                 echoRequest(target_.family, {identifier_, static_cast<std::uint16_t>(firstSequence_ + i)});
@@ -82,7 +83,7 @@ class EchoRow {
                 sendto(descriptor_, request.data(), request.size(), 0, address_.get(), address_.size);
             asked_ = i + 1;
             const Clock::time_point next = sent_[0] + kApart * static_cast<int>(i + 1);
-            if (!receiveUntil(i + 1 < kRequests ? next : sent_[i] + kWait, until)) {
+            if (!receiveUntil(i + 1 < kEchoRequests ? next : sent_[i] + kWait, until)) {
                 return waitFailure(Wait::stopped, "echo");
             }
         }
@@ -94,7 +95,7 @@ class EchoRow {
   private:
     /// Takes answers until the time is over, or, after the last request, until all are there. False when stopped.
     bool receiveUntil(Clock::time_point time, const Until& until) {
-        while (asked_ < kRequests || std::ranges::any_of(answered_, [](auto& each) { return !each; })) {
+        while (asked_ < kEchoRequests || std::ranges::any_of(answered_, [](auto& each) { return !each; })) {
             const Wait wait = waitReadable(descriptor_, {until.stop, std::min(time, until.deadline)});
             if (wait == Wait::stopped) return false;
             if (wait == Wait::timeout) return true;
@@ -135,8 +136,8 @@ class EchoRow {
     SocketAddress address_;
     std::uint16_t identifier_ = randomIdentifier();
     std::uint16_t firstSequence_ = randomIdentifier();
-    std::array<Clock::time_point, kRequests> sent_{};
-    std::array<std::optional<double>, kRequests> answered_{};
+    std::array<Clock::time_point, kEchoRequests> sent_{};
+    std::array<std::optional<double>, kEchoRequests> answered_{};
     std::size_t asked_ = 0;
 };
 

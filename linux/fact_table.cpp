@@ -5,6 +5,7 @@
 
 #include "linux/gather_reach.h"
 #include "linux/gather_setup.h"
+#include "service/thresholds.h"
 
 namespace wp {
 namespace {
@@ -208,7 +209,7 @@ constexpr FactRow kRows[] = {
     {Fact::outsideEcho,         "outsideEcho",          kLink,         {},            4s,   outsideEcho,         "whether the router and others answer"},
     {Fact::nameAnswer,          "nameAnswer",           kSetup,        {},            4s,   nameAnswer,          "whether names resolve"},
     {Fact::portal,              "portal",               kSetup,        {},            5s,   portal,              "whether there is a portal"},
-    {Fact::vendorService,       "vendorService",        kSetup,        {},            5s,   vendorService,       "whether the vendor is reached"},
+    {Fact::vendorService,       "vendorService",        kSetup,        {},            kServiceTime, vendorService,       "whether the vendor is reached"},
     {Fact::router,              "router",               kLink,         {},            4s,   router,              "who made the router"},
     {Fact::translation,         "translation",          kTranslation,  {},            3s,   translation,         "how often addresses are translated"},
 };

@@ -17,8 +17,7 @@ namespace {
 
 using namespace std::chrono_literals;
 
-/// Once an answer is conclusive nothing else is waited for; what is not there after 3 s hardly comes within 5.
-constexpr auto kNameTime = 4s, kTranslationTime = 1s;
+constexpr auto kTranslationTime = 1s;
 
 Error notConfigured(const std::string& what) {
     return failure(Reason::badConfiguration, "no endpoint is configured for " + what);

@@ -33,6 +33,7 @@ void BackgroundQueue::async(Block block) {
 }
 
 void BackgroundQueue::after(std::chrono::milliseconds delay, Block block) {
+    if (delays_ == Delays::skipped) return async(std::move(block));
     activity_.begin();
     bool isRefused = false;
     {

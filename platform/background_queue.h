@@ -16,7 +16,10 @@ namespace wp {
 /// running. Threads are made as they are needed and reused. *Any* thread.
 class BackgroundQueue final : public Queue {
   public:
-    explicit BackgroundQueue(Activity& activity) : activity_(activity) {}
+    /// With `Delays::skipped` a delayed block is ready at once: for a run whose end nobody watches.
+    enum class Delays { kept, skipped };
+    explicit BackgroundQueue(Activity& activity, Delays delays = Delays::kept)
+        : activity_(activity), delays_(delays) {}
     /// Waits for the blocks that run; drops those that have not begun.
     ~BackgroundQueue() override;
 
@@ -36,6 +39,7 @@ class BackgroundQueue final : public Queue {
     void dropDelayed(std::unique_lock<std::mutex>& lock);
 
     Activity& activity_;
+    const Delays delays_;
     std::mutex mutex_;
     std::condition_variable changed_;
     std::condition_variable drained_;

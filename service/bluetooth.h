@@ -4,6 +4,7 @@
 
 #include "service/band.h"
 #include "service/outcome.h"
+#include "service/thresholds.h"
 
 namespace wp {
 
@@ -13,15 +14,6 @@ struct Bluetooth {
     bool powered = false;  ///< at least one controller is
     unsigned paired = 0;
     unsigned connected = 0;
-};
-
-/// How many are many.
-struct BluetoothLimits {
-    /// Seven active devices is what one controller's network can hold (Bluetooth Core, piconet); from the
-    /// fourth on more than half of the slots that Wi-Fi could use are spoken for.
-    unsigned connected = 3;
-    /// Each paired device is listened for; no source names a limit, this is twice what a living room has.
-    unsigned paired = 16;
 };
 
 /// Test 19: whether more devices are connected than `limits` says. Information: "BTConnectedCount".

@@ -5,20 +5,9 @@
 
 #include "service/channel_load.h"
 #include "service/outcome.h"
+#include "service/thresholds.h"
 
 namespace wp {
-
-/// When a channel counts as congested.
-struct CongestionLimits {
-    /// Share of foreign airtime. Guides for voice and video over Wi-Fi plan for less than one half; delays
-    /// grow steeply from 40 to 50 % on.
-    double load = 0.50;
-    /// The same one half on the scale of the BSS Load element, 0 to 255.
-    unsigned advertisedLoad = 128;
-    /// Sum of overlapping access points, as `overlapWeight` counts them, where nothing was measured: three
-    /// that are near share out half of the air in a busy evening. No source names a number.
-    double overlap = 3.0;
-};
 
 /// What the radio knows of the air around.
 struct AirFacts {

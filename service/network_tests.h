@@ -2,16 +2,12 @@
 
 #include "service/facts.h"
 #include "service/outcome.h"
+#include "service/thresholds.h"
 
 namespace wp {
 
 // The verdicts on a network's own properties. All are pure functions; *any* thread. An error says what could
 // not be told.
-
-/// 100 units are every maker's default. The slack is for controllers that are set in milliseconds and round.
-inline constexpr int kLongestBeaconInterval = 110;
-/// Makers of access points advise 1 or 2; many home routers ship 3.
-inline constexpr int kLongestDtimPeriod = 3;
 
 /// Whether access points carry the name out of the box, or it says nothing: two unrelated networks with it are
 /// likely to be in reach of each other.

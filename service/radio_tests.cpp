@@ -12,7 +12,6 @@ namespace {
 constexpr std::uint8_t kSecondaryAbove = 1;
 constexpr std::uint8_t kSecondaryBelow = 3;
 
-constexpr int kFastest11bRate = 22;  // 11 Mb/s
 constexpr std::uint8_t kOlderStationsPresent = 1;
 constexpr std::uint8_t kProtectionInUse = 2;
 

@@ -5,18 +5,11 @@
 
 #include "service/facts.h"
 #include "service/outcome.h"
+#include "service/thresholds.h"
 
 namespace wp {
 
 // The verdicts on modes, rates, channels and signal. All are pure functions; *any* thread.
-
-/// Phones believe an access point's country from this strength on, in dBm, and want it from two of them.
-inline constexpr int kWeakestCountrySignal = -85;
-inline constexpr std::size_t kCountryWitnesses = 2;
-
-/// Peers call a signal weak from -75 dBm (a strength of 30 in a hundred) or a signal-to-noise ratio of 18 dB on.
-inline constexpr int kWeakestSignal = -75;
-inline constexpr int kLeastSignalToNoise = 18;
 
 /// Which access points, by address, say which country; the judged one whatever its strength. None where nothing
 /// was heard.

@@ -29,10 +29,6 @@ struct NameAnswer {
     std::vector<NameServerAnswer> servers{};  ///< the same question to each server, for the details alone
 };
 
-/// An answer slower than the first is slow, slower than the second a problem; for the log only. (A desktop
-/// system's own latency check of names goes by these.)
-inline constexpr std::chrono::milliseconds kSlowName{400}, kVerySlowName{500};
-
 /// Test 7: whether a name outside resolves. Only an address that can lead outside counts: gateways that show
 /// their own page answer with a private one.
 Outcome resolvesNames(const Known<NameAnswer>& answer);

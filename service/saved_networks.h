@@ -11,6 +11,7 @@
 #include "platform/records.h"
 #include "service/network_name.h"
 #include "service/outcome.h"
+#include "service/thresholds.h"
 
 namespace wp {
 
@@ -42,12 +43,6 @@ struct SavedNetwork {
 struct SavedNetworks {
     std::string store;  ///< for the log: "NetworkManager", "wpa_supplicant", "iwd"
     std::vector<SavedNetwork> networks;
-};
-
-/// More remembered networks than these are many. No source names a limit; a scan of the list at each join
-/// stays short below it.
-struct SavedNetworkLimits {
-    unsigned count = 50;
 };
 
 /// Test 47: whether many networks are remembered. Information: "PNLCount".

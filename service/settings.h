@@ -5,15 +5,9 @@
 #include "service/maker.h"
 #include "service/reachability.h"
 #include "service/saved_networks.h"
+#include "service/thresholds.h"
 
 namespace wp {
-
-/// From when on something is a finding, as far as a configuration may say so.
-struct Thresholds {
-    BluetoothLimits bluetooth;
-    SavedNetworkLimits saved;
-    CongestionLimits congestion;
-};
 
 /// What the verdicts go by besides the facts.
 struct Settings {

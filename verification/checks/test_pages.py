@@ -8,7 +8,7 @@ import sys
 ROOT = pathlib.Path(__file__).resolve().parents[2]
 ROW = re.compile(r"^\| `([\w/.]+)` \| `(\w+)` \| (-?[\d.]+) \|", re.MULTILINE)
 # A verdict's own numbers: constants of service/, and the limits that a configuration may set.
-CONSTANT = re.compile(r"constexpr (?:int|unsigned|double|std::size_t|std::uint\d+_t|(?:std::chrono::)?milliseconds) ([^;]*);")
+CONSTANT = re.compile(r"constexpr (?:int|unsigned|double|std::size_t|std::uint\d+_t|(?:std::chrono::)?(?:milli)?seconds) ([^;]*);")
 LIMIT = re.compile(r"struct \w+Limits \{(.*?)\n\};", re.DOTALL)
 NAMED = re.compile(r"(\w+)\s*(?:=\s*|\{)(-?[\d.']+)\}?(?=[,;]|$)")
 # Numbers of protocols and forms, by which nothing is judged.

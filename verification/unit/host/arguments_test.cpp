@@ -90,7 +90,13 @@ TEST(Arguments, WhatCannotBeUsedIsRefusedWithTheArgumentAndTheReason) {
               "nothing to do; give `run`, `tests` or `report FILE`, or see `wifi-profile --help`");
     EXPECT_EQ(refusalOf({"walk"}),
               "\"walk\" is no command; give `run`, `tests` or `report FILE`, or see `--help`");
-    EXPECT_EQ(refusalOf({"tests", "14"}), "\"14\": tests takes nothing more; leave it out");
+    EXPECT_EQ(refusalOf({"tests", "14"}),
+              "\"14\" is not an option of tests; `wifi-profile tests --help` lists them");
+    EXPECT_EQ(refusalOf({"--version", "now"}), "\"now\": --version takes nothing more; leave it out");
+    EXPECT_EQ(refusalOf({"report"}), "report: needs a FILE (or -), a result or a recording");
+    EXPECT_EQ(refusalOf({"report", "a", "b"}), "\"b\": report takes one file; leave it out");
+    EXPECT_EQ(refusalOf({"report", "a", "--format", "json"}),
+              "--format: \"json\" is no format of a report; give text");
     EXPECT_EQ(refusalOf({"run", "fast"}),
               "\"fast\" is not an option of run; `wifi-profile run --help` lists them");
     EXPECT_EQ(refusalOf({"run", "--fast"}),
@@ -138,6 +144,18 @@ TEST(Arguments, OptionsThatNeedOneAnotherAreRefusedAlone) {
               "--automation: \"-\" is no file; standard output carries the result");
     EXPECT_EQ(refusalOf({"run", "--transcript", "-"}),
               "--transcript: \"-\" needs --output FILE, because standard output carries the result");
+}
+
+TEST(Arguments, AReportHasAFileAndOptionsInAnyOrder) {
+    Arguments arguments = parseArguments({"report", "--all", "-", "--locale=ja", "--output", "r.txt"});
+
+    EXPECT_EQ(arguments.command, Command::report);
+    EXPECT_EQ(arguments.report.file, "-");
+    EXPECT_TRUE(arguments.report.all);
+    EXPECT_EQ(arguments.report.locale, "ja");
+    EXPECT_EQ(arguments.report.outputFile, "r.txt");
+    EXPECT_EQ(parseArguments({"report", "--help"}).command, Command::reportHelp);
+    EXPECT_EQ(parseArguments({"tests", "--locale", "de"}).report.locale, "de");
 }
 
 TEST(Arguments, HelpNamesEveryOptionOfRun) {

@@ -1,4 +1,4 @@
-#include "host/catalogue.h"
+#include "host/report/catalogue.h"
 
 #include <gtest/gtest.h>
 
@@ -6,6 +6,7 @@
 #include <set>
 
 #include "host/progress_client.h"
+#include "host/report/catalogue_text.h"
 
 namespace wp::host {
 namespace {
@@ -70,18 +71,36 @@ TEST(Catalogue, KnowsWhichTestsAreRepeatedForASelectedNetwork) {
     EXPECT_EQ(repeated, (std::set<int>{34, 38, 39, 40, 41, 42, 43, 44, 46, 45, 36, 37, 33, 24, 28, 32}));
 }
 
-TEST(Catalogue, PrintsEveryTestWithItsQuestionAndFinding) {
-    std::string text = catalogueText();
+TEST(Catalogue, PrintsOfEveryTestWhatItAsksAndWhatAFindingMeans) {
+    std::string text = catalogueText({}, Texts("en"));
 
-    EXPECT_EQ(text.substr(0, text.find("  15")),
-              "Device\n"
-              "  14  isUsingCustomIPv4\n"
-              "      asks:    Was this device's IPv4 address set by hand?\n"
-              "      finding: true: the method is anything but automatic\n");
+    EXPECT_EQ(
+        text.substr(0, text.find("  15")),
+        "This device\n"
+        "  14  isUsingCustomIPv4\n"
+        "      asks: Was this device's IPv4 address set by hand?\n"
+        "      finding: true: the method is anything but automatic\n"
+        "      means: A fixed address stops working when the router changes, and can collide with another\n"
+        "        device's.\n"
+        "      do: Set IPv4 to automatic in this device's network settings, unless somebody chose the "
+        "address\n"
+        "        on purpose.\n"
+        "      by: you, at this device\n");
     EXPECT_NE(text.find("\nNetwork (* also of a selected network)\n   8  hasDoubleNATConfiguration\n"),
               std::string::npos);
     EXPECT_NE(text.find("  34* isBeaconIntervalLong\n"), std::string::npos);
     EXPECT_NE(text.find("\nList of networks\n  31  foundScanResults\n"), std::string::npos);
+}
+
+TEST(Catalogue, PrintsTheThresholdsThatAConfigurationChanged) {
+    Thresholds thresholds =
+        thresholdsFrom(Dictionary::make({{"connectedBluetooth", 7}, {"channelLoad", 0.25}}));
+
+    std::string text = catalogueText(thresholds, Texts("en"));
+
+    EXPECT_NE(text.find("finding: true: more than 7\n"), std::string::npos);
+    EXPECT_NE(text.find("finding: true: busy 25 % of the time"), std::string::npos);
+    EXPECT_NE(text.find("finding: true: more than 16\n"), std::string::npos);
 }
 
 TEST(Catalogue, PlansTheTestsThatARunPerforms) {

@@ -118,6 +118,17 @@ TEST(BackgroundQueue, ABlockThatWaitsDoesNotHoldUpADelayedOne) {
     EXPECT_TRUE(main.runUntil([&] { return released.try_wait(); }, MainQueue::Clock::now() + 60s));
 }
 
+TEST(BackgroundQueue, RunsADelayedBlockAtOnceWhereDelaysAreSkipped) {
+    Activity activity;
+    BackgroundQueue queue(activity, BackgroundQueue::Delays::skipped);
+    std::atomic<bool> hasRun = false;
+
+    queue.after(std::chrono::hours(1), [&] { hasRun = true; });
+    queue.drain(BackgroundQueue::Delayed::drop);
+
+    EXPECT_TRUE(hasRun);
+}
+
 TEST(BackgroundQueue, DropsDelayedBlocksWhenItIsDrainedForGood) {
     Activity activity;
     BackgroundQueue queue(activity);
