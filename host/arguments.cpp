@@ -109,6 +109,8 @@ const Option<ReportOptions> kReportOptions[] = {
      [](ReportOptions& o, const std::string& v) { o.format = reportFormatFrom(v); }},
     {"--all", Takes::nothing, "", "every test, not only the findings",
      [](ReportOptions& o, const std::string&) { o.all = true; }},
+    {"--compare", Takes::value, "OLD", "what changed since this earlier result or recording (or -)",
+     [](ReportOptions& o, const std::string& v) { o.compareFile = v; }},
     {"--locale", Takes::value, "NAME", "language of the report: en, de, ja or x-keys",
      [](ReportOptions& o, const std::string& v) { o.locale = v; }},
     {"--config", Takes::value, "FILE", "the thresholds that the run went by (JSON)",
@@ -244,6 +246,8 @@ Arguments reportArguments(const std::vector<std::string>& words) {
         arguments.command = Command::reportHelp;
     else if (options.file.empty())
         refuse("report: needs a FILE (or -), a result or a recording");
+    if (options.file == "-" && options.compareFile == "-")
+        refuse("--compare: \"-\" is read already; give a file for one of the two");
     return arguments;
 }
 

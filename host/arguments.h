@@ -40,7 +40,8 @@ struct RunOptions {
 struct ReportOptions {
     std::string file;  ///< a result or a recording; "-" is standard input
     OutputFormat format = OutputFormat::text;
-    bool all = false;  ///< every test, not findings alone
+    bool all = false;                        ///< every test, not findings alone
+    std::optional<std::string> compareFile;  ///< of an earlier run, a result or a recording
     std::optional<std::string> locale;
     std::optional<std::string> configFile;
     std::optional<std::string> outputFile;

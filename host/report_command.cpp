@@ -58,10 +58,10 @@ bool isRecording(const Value& json) {
     return object && (*object)->value("format");
 }
 
-Evidence evidenceFromFile(const ReportOptions& options) {
-    std::string place =
-        "report: " + (options.file == "-" ? std::string("standard input") : options.file) + ": ";
-    std::string text = readFile("report", options.file);
+/// The option is what the file was named with, for messages.
+Evidence evidenceFromFile(const std::string& option, const std::string& file, const ReportOptions& options) {
+    std::string place = option + ": " + (file == "-" ? std::string("standard input") : file) + ": ";
+    std::string text = readFile(option, file);
     std::variant<Value, Refusal> json = readJSON(text);
     if (const Refusal* refusal = std::get_if<Refusal>(&json)) refuse(place + refusal->text());
     if (isRecording(std::get<Value>(json))) {
@@ -88,11 +88,15 @@ int writeReport(const ReportOptions& options) {
     Thresholds thresholds = thresholdsOf(options);
     std::optional<OutputFile> output;
     if (options.outputFile && *options.outputFile != "-") output.emplace("--output", *options.outputFile);
-    Evidence evidence = evidenceFromFile(options);
+    Evidence evidence = evidenceFromFile("report", options.file, options);
+    Report report = makeReport(evidence, thresholds, texts);
+    if (options.compareFile)
+        report.comparison =
+            compared(evidenceFromFile("--compare", *options.compareFile, options), evidence, texts);
     TextForm form;
     if (options.all) form.tests = TextForm::Tests::all;
     if (!output && isatty(STDOUT_FILENO)) form.style = TextForm::Style::terminal;
-    std::string text = reportText(makeReport(evidence, thresholds, texts), evidence, form, texts);
+    std::string text = reportText(report, evidence, form, texts);
     if (output) {
         output->write(text);
     } else if (std::optional<std::string> error = writeAll(STDOUT_FILENO, text)) {

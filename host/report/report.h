@@ -1,8 +1,10 @@
 #pragma once
 
+#include <optional>
 #include <string>
 #include <vector>
 
+#include "host/report/comparison.h"
 #include "host/report/evidence.h"
 #include "host/report/limits.h"
 #include "host/report/texts.h"
@@ -56,6 +58,7 @@ struct ReportedTest {
 struct Report {
     std::string title;
     std::string summary;                    ///< one sentence on the whole
+    std::optional<Comparison> comparison;   ///< what changed; absent: no earlier run was given
     std::vector<ReportedFinding> findings;  ///< the worst first
     std::vector<Untold> untold;
     std::vector<ReportedFact> facts;

@@ -63,6 +63,7 @@ class ReportWriter {
         writer_.strongParagraph(report_.title);
         writer_.gap();
         writer_.paragraph(report_.summary);
+        if (report_.comparison) writeComparison(*report_.comparison);
         writeFindings();
         writeUntold();
         writeFacts();
@@ -72,6 +73,21 @@ class ReportWriter {
     }
 
   private:
+    void writeComparison(const Comparison& comparison) {
+        writer_.heading(texts_.text("CHANGES"));
+        for (const std::string& note : comparison.notes) writer_.paragraph(note);
+        if (comparison.changes.empty()) writer_.paragraph(texts_.text("CHANGES_NONE"));
+        for (const ReportedChange& change : comparison.changes) writeChange(change);
+    }
+
+    void writeChange(const ReportedChange& change) {
+        writer_.bullet(change.what);
+        std::string place = change.where;
+        if (!change.before.empty()) place += " · " + texts_.text("CHANGE_BEFORE", {{"value", change.before}});
+        if (!change.now.empty()) place += " · " + texts_.text("CHANGE_NOW", {{"value", change.now}});
+        writer_.paragraph(place, 2);
+    }
+
     void writeFindings() {
         writer_.heading(texts_.text("FINDINGS"));
         if (report_.findings.empty()) writer_.paragraph(texts_.text("NO_FINDINGS"));

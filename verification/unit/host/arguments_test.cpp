@@ -158,6 +158,12 @@ TEST(Arguments, AReportHasAFileAndOptionsInAnyOrder) {
     EXPECT_EQ(parseArguments({"tests", "--locale", "de"}).report.locale, "de");
 }
 
+TEST(Arguments, AReportIsComparedWithOneEarlierFile) {
+    EXPECT_EQ(parseArguments({"report", "-", "--compare", "old.json"}).report.compareFile, "old.json");
+    EXPECT_EQ(refusalOf({"report", "-", "--compare", "-"}),
+              "--compare: \"-\" is read already; give a file for one of the two");
+}
+
 TEST(Arguments, HelpNamesEveryOptionOfRun) {
     EXPECT_EQ(parseArguments({"run", "--list", "--help"}).command, Command::runHelp);
     std::string help = runHelpText();
