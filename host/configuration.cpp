@@ -20,7 +20,8 @@ std::string firstLine(const std::string& text) {
 /// What the service prints of its configuration when it is called with the option.
 std::string shown(const std::string& option, const std::optional<std::string>& named) {
     const std::string service = serviceProgram();
-    if (!std::filesystem::exists(service)) fail(service + ": not found; it reads the configuration");
+    if (!std::filesystem::exists(service))
+        fail(service + ": not found; a live run needs it beside the program (--replay and --demo do not)");
     std::vector<std::string> arguments = {option};
     if (named) arguments.insert(arguments.end(), {"--config", *named});
     const ProgramOutput printed = runProgram(service, arguments);

@@ -1,7 +1,6 @@
 #include "host/services.h"
 
 #include <chrono>
-#include <filesystem>
 #include <mutex>
 #include <optional>
 
@@ -9,7 +8,6 @@
 #include "exchange/live.h"
 #include "exchange/recorder.h"
 #include "exchange/replay.h"
-#include "host/exit.h"
 #include "host/service_program.h"
 
 namespace wp::host {
@@ -104,9 +102,6 @@ class RecordedServices final : public Services {
 std::unique_ptr<Services> answeringServices(const RunOptions& options, const Preparation& prepared,
                                             MainQueue& mainQueue, DiagnosticsLog& log) {
     if (prepared.recording) return std::make_unique<ReplayServices>(prepared.recording, mainQueue);
-    std::string service = serviceProgram();
-    if (!std::filesystem::exists(service))
-        fail(service + ": not found; a live run needs it beside the program (--replay and --demo do not)");
     return std::make_unique<LiveServices>(options, prepared, mainQueue, log);
 }
 
