@@ -66,13 +66,20 @@ Known<std::vector<AddressDetails>> gatherAddressDetails(std::uint32_t interfaceI
     return readAddressDetails(*messages, interfaceIndex);
 }
 
-Known<std::vector<IPAddress>> gatherGatewayAddresses(std::uint32_t interfaceIndex, const Until& until) {
+Known<WaysOut> gatherWaysOut(std::uint32_t interfaceIndex, const Until& until) {
     const auto messages = dump<rtmsg>(RTM_GETROUTE, "routes", until);
     if (!messages) return messages.error();
-    std::vector<IPAddress> gateways;
+    WaysOut ways;
     for (const Gateway& each : readGateways(*messages, interfaceIndex))
-        if (const auto address = IPAddress::fromBytes(each.bytes)) gateways.push_back(*address);
-    return gateways;
+        if (const auto address = IPAddress::fromBytes(each.bytes)) ways.gateways.push_back(*address);
+    ways.elsewhere = leadsElsewhere(*messages, interfaceIndex);
+    return ways;
+}
+
+Known<std::vector<IPAddress>> gatherGatewayAddresses(std::uint32_t interfaceIndex, const Until& until) {
+    auto ways = gatherWaysOut(interfaceIndex, until);
+    if (!ways) return ways.error();
+    return std::move(ways->gateways);
 }
 
 }  // namespace wp

@@ -22,7 +22,13 @@ std::vector<AddressDetails> readAddressDetails(Bytes buffer, std::uint32_t inter
 /// Asks the kernel for them.
 Known<std::vector<AddressDetails>> gatherAddressDetails(std::uint32_t interfaceIndex, const Until& until);
 
-/// The next hops of the interface's default routes, those in use first, IPv4 before IPv6.
+/// Where default routes lead.
+struct WaysOut {
+    std::vector<IPAddress> gateways;  ///< of the interface, those in use first, IPv4 before IPv6
+    bool elsewhere = false;           ///< whether there is one over another interface
+};
+Known<WaysOut> gatherWaysOut(std::uint32_t interfaceIndex, const Until& until);
+/// The gateways alone.
 Known<std::vector<IPAddress>> gatherGatewayAddresses(std::uint32_t interfaceIndex, const Until& until);
 
 }  // namespace wp

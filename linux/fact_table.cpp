@@ -128,8 +128,12 @@ Store peerLinks(const Gathering& g) {
     });
 }
 
+/// Of a channel that the radio does not stay on hardly anything is counted.
 Store airtime(const Gathering& g) {
-    return fromLink(g, &Facts::airtime, [&](const Link& found) { return gatherAirtime(found, g.until); });
+    return fromLink(g, &Facts::airtime, [&](const Link& found) -> Known<Airtime> {
+        if (g.topic.named) return Airtime();
+        return gatherAirtime(found, g.until);
+    });
 }
 
 Store allowedChannels(const Gathering& g) {
@@ -181,19 +185,19 @@ Store translation(const Gathering& g) {
 }
 
 constexpr Fact kLink[] = {Fact::link};
-// A scan leaves the channel for a while; echo requests would be lost and delayed meanwhile.
-constexpr Fact kPings[] = {Fact::gatewayEcho, Fact::outsideEcho};
+// A scan leaves the channel for a while: echo requests would be lost and delayed, and other channels counted.
+constexpr Fact kOnChannel[] = {Fact::gatewayEcho, Fact::outsideEcho, Fact::airtime};
 constexpr Fact kSetup[] = {Fact::link, Fact::setup};
 constexpr Fact kTranslation[] = {Fact::link, Fact::setup, Fact::router};
-constexpr Fact kPingsAndScan[] = {Fact::gatewayEcho, Fact::outsideEcho, Fact::nearby};
+constexpr Fact kWhileQuiet[] = {Fact::gatewayEcho, Fact::outsideEcho, Fact::airtime, Fact::nearby};
 
 // clang-format off
 constexpr FactRow kRows[] = {
     // fact                     name                   needs          after          most  gather               loss
     {Fact::link,                "link",                 {},            {},            3s,   link,                "anything about Wi-Fi"},
     // A joined radio listens through two bands in 16 s.
-    {Fact::nearby,              "nearby",               kLink,         kPings,        30s,  nearby,              "which networks are near"},
-    {Fact::listened,            "listened",             kLink,         kPingsAndScan, 20s,  listened,            "which networks hide"},
+    {Fact::nearby,              "nearby",               kLink,         kOnChannel,    30s,  nearby,              "which networks are near"},
+    {Fact::listened,            "listened",             kLink,         kWhileQuiet,   20s,  listened,            "which networks hide"},
     {Fact::station,             "station",              kLink,         {},            3s,   station,             "how strong the signal is"},
     {Fact::survey,              "survey",               kLink,         {},            3s,   survey,              "how loud the noise is"},
     {Fact::regulation,          "regulation",           kLink,         {},            3s,   regulation,          "the radio's country"},

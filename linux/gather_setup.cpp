@@ -125,6 +125,25 @@ KernelIPv6 kernelSwitches(const std::string& interfaceName) {
     return {number("disable_ipv6") != 0, number("accept_ra") > 0};
 }
 
+/// iwd looks at routers' advertisements itself and has the kernel leave them alone.
+bool iwdManages(Known<Bus>& bus, const Link& link, const Until& until) {
+    const Known<BusValue> objects = bus ? iwdObjects(*bus, until) : bus.error();
+    return objects && !iwdDevice(*objects, link.interfaceName).empty();
+}
+
+/// The name servers where no manager tells: by the lease, else by who can have named them at all.
+NameServers serversWithoutManager(const std::optional<Lease>& lease, bool client,
+                                  const std::vector<AssignedAddress>& assigned, const Known<WaysOut>& ways) {
+    NameServers names;
+    names.offerKnown = lease.has_value();
+    if (lease) names.offered = lease->servers;
+    if (lease || !ways) return names;
+    names.routers = ways->gateways;
+    // Nobody offers anything to an interface that was set up by hand; another one may have brought the servers along.
+    names.offerKnown = !client && !ways->elsewhere && allSetByHand(assigned);
+    return names;
+}
+
 Known<LinkSetup> setupFromKernel(Known<Bus>& bus, const Link& link, const Until& until) {
     const auto details = gatherAddressDetails(link.interfaceIndex, until);
     if (!details) return details.error();
@@ -132,12 +151,12 @@ Known<LinkSetup> setupFromKernel(Known<Bus>& bus, const Link& link, const Until&
     for (const AddressDetails& each : *details) assigned.push_back(each.assigned);
     const auto lease = findLease(link.interfaceName, std::time(nullptr));
     const bool client = lease || dhcpClientRuns(link.interfaceName);
+    KernelIPv6 switches = kernelSwitches(link.interfaceName);
+    switches.acceptsAdvertisements |= iwdManages(bus, link, until);
     LinkSetup setup;
-    setup.methods = {methodFromIPv4Addresses(assigned, client),
-                     methodFromIPv6Addresses(assigned, kernelSwitches(link.interfaceName))};
-    NameServers names;
-    names.offerKnown = lease.has_value();
-    if (lease) names.offered = lease->servers;
+    setup.methods = {methodFromIPv4Addresses(assigned, client), methodFromIPv6Addresses(assigned, switches)};
+    NameServers names =
+        serversWithoutManager(lease, client, assigned, gatherWaysOut(link.interfaceIndex, until));
     names.effective = effectiveServers(bus, link, {}, until);
     setup.servers = lease && !lease->servers.empty() ? lease->servers : names.effective;
     setup.nameServers = std::move(names);
@@ -172,11 +191,18 @@ struct Switch {
     const char* driver;
     const char* parameter;
 };
-// Of the drivers that have one that can be read without privileges (kernel documentation of ath9k and iwlwifi).
+// Of the drivers that have one that can be read without privileges (kernel documentation of ath9k and iwlwifi, and the
+// parameters that the modules of ath9k_htc, iwlegacy and b43 declare).
+// clang-format off
 constexpr Switch kSwitches[] = {
-    {"iwlwifi", "iwlwifi/parameters/bt_coex_active"},
-    {"ath9k", "ath9k/parameters/btcoex_enable"},
+    {"iwlwifi",   "iwlwifi/parameters/bt_coex_active"},
+    {"ath9k",     "ath9k/parameters/btcoex_enable"},
+    {"ath9k_htc", "ath9k_htc/parameters/btcoex_enable"},
+    {"iwl3945",   "iwlegacy/parameters/bt_coex_active"},
+    {"iwl4965",   "iwlegacy/parameters/bt_coex_active"},
+    {"b43",       "b43/parameters/btcoex"},
 };
+// clang-format on
 
 bool isPeerLink(std::uint32_t type) {
     constexpr std::uint32_t kClient = 8, kOwner = 9, kAwareness = 12;  // nl80211_iftype

@@ -69,12 +69,13 @@ std::optional<Gateway> nextHopAmong(Address::Family family, Bytes hops, std::uin
     return std::nullopt;
 }
 
+bool isDefaultRoute(const rtmsg& header) {
+    return header.rtm_dst_len == 0 && header.rtm_type == RTN_UNICAST;
+}
+
 std::optional<Gateway> gatewayOf(const NetlinkMessage& message, std::uint32_t interfaceIndex) {
     const std::optional<rtmsg> header = headerOf<rtmsg>(message);
-    if (message.type != RTM_NEWROUTE || !header || header->rtm_dst_len != 0 ||
-        header->rtm_type != RTN_UNICAST) {
-        return std::nullopt;
-    }
+    if (message.type != RTM_NEWROUTE || !header || !isDefaultRoute(*header)) return std::nullopt;
     const std::optional<Address::Family> family = familyOf(header->rtm_family);
     const Attributes attributes = message.attributesAfter(NLMSG_ALIGN(sizeof(rtmsg)));
     if (!family || attributes.number<std::uint32_t>(RTA_TABLE).value_or(header->rtm_table) != RT_TABLE_MAIN) {
@@ -114,6 +115,19 @@ std::vector<Gateway> readGateways(Bytes buffer, std::uint32_t interfaceIndex) {
                                            : left.metric < right.metric;
     });
     return gateways;
+}
+
+bool leadsElsewhere(Bytes buffer, std::uint32_t interfaceIndex) {
+    bool found = false;
+    forEachContent(buffer, [&](const NetlinkMessage& message) {
+        const std::optional<rtmsg> header = headerOf<rtmsg>(message);
+        if (message.type != RTM_NEWROUTE || !header || !isDefaultRoute(*header)) return;
+        const Attributes attributes = message.attributesAfter(NLMSG_ALIGN(sizeof(rtmsg)));
+        const auto out = attributes.number<std::uint32_t>(RTA_OIF);
+        // A route with several next hops leads over several interfaces as a rule.
+        found |= out ? *out != interfaceIndex : attributes.find(RTA_MULTIPATH).has_value();
+    });
+    return found;
 }
 
 std::string textOf(Address::Family family, Bytes address) {

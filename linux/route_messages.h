@@ -24,6 +24,9 @@ struct Gateway {
 /// The next hops of the interface's default routes in the main table, the ones in use first, IPv4 before IPv6.
 std::vector<Gateway> readGateways(Bytes buffer, std::uint32_t interfaceIndex);
 
+/// Whether a default route, of whatever table, leads over another interface: a cable's, or a tunnel's.
+bool leadsElsewhere(Bytes buffer, std::uint32_t interfaceIndex);
+
 /// "10.0.0.1", "fe80::1". *Any* thread.
 std::string textOf(Address::Family family, Bytes address);
 

@@ -40,6 +40,16 @@ Known<std::string> methodFromIPv6Addresses(const std::vector<AssignedAddress>& a
     return std::string("link-local");
 }
 
+bool allSetByHand(const std::vector<AssignedAddress>& addresses) {
+    bool any = false;
+    for (const AssignedAddress& each : addresses) {
+        if (each.address.linkLocal() || each.address.loopback() || each.address.unspecified()) continue;
+        if (!each.permanent || each.byAdvertisement) return false;
+        any = true;
+    }
+    return any;
+}
+
 Outcome usesCustomIPv4(const AddressMethods& methods) {
     if (!methods.ipv4) return methods.ipv4.error();
     return problem(!isOneOf(*methods.ipv4, {"auto", "dhcp", "dynamic"}),
@@ -55,16 +65,18 @@ Outcome usesCustomIPv6(const AddressMethods& methods) {
 Outcome usesCustomNameServers(const Known<NameServers>& servers) {
     if (!servers) return servers.error();
     if (!servers->manual.empty()) return problem(true);
-    bool hidden = false;
+    bool hidden = false, unexplained = false;
     for (const IPAddress& server : servers->effective) {
         if (server.loopback())
             hidden = true;
         else if (!contains(servers->offered, server) && servers->offerKnown)
             return problem(true);
+        else if (!servers->offerKnown && !contains(servers->routers, server))
+            unexplained = true;
     }
     if (hidden)
         return failure(Reason::unavailable, "a resolver on the device does not tell which servers it asks");
-    if (!servers->offerKnown && !servers->effective.empty())
+    if (unexplained)
         return failure(Reason::unavailable,
                        "no lease or manager tells which name servers the network offers");
     return problem(false);

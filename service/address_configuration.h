@@ -36,6 +36,10 @@ Known<std::string> methodFromIPv4Addresses(const std::vector<AssignedAddress>& a
 Known<std::string> methodFromIPv6Addresses(const std::vector<AssignedAddress>& addresses,
                                            const KernelIPv6& kernel);
 
+/// Whether all addresses of the interface were put there by hand, so that neither a lease nor an advertisement can have
+/// brought name servers along. *Any* thread.
+bool allSetByHand(const std::vector<AssignedAddress>& addresses);
+
 /// Test 14: whether IPv4 is set up in any other way than by itself. Information: "IPv4ConfigMethod".
 Outcome usesCustomIPv4(const AddressMethods& methods);
 /// Test 15: the same for IPv6; switched off counts as custom. Information: "IPv6ConfigMethod".
@@ -47,10 +51,12 @@ struct NameServers {
     std::vector<IPAddress> effective;  ///< those that are asked, behind a resolver on the device itself
     std::vector<IPAddress> offered;    ///< by DHCP or a router's advertisement
     bool offerKnown = false;           ///< whether what the network offers could be read at all
+    std::vector<IPAddress> routers{};  ///< the interface's; where the offer is not known they may well be it
 };
 
 /// Test 16: whether a name server was entered by hand, or one is asked that the network did not offer. A
-/// resolver on the device itself whose own servers are not known cannot be judged.
+/// resolver on the device itself whose own servers are not known cannot be judged. Where the offer is not known, a server
+/// that is the network's own router is taken for offered: asking it means going the network's way in any case.
 Outcome usesCustomNameServers(const Known<NameServers>& servers);
 
 /// Where a proxy is set, for example "environment: https_proxy"; empty when nowhere.

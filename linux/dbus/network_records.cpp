@@ -128,15 +128,17 @@ std::optional<NetworkName> nameFromSupplicant(std::string_view text) {
 }
 
 SavedSecurity securityFromSupplicant(std::string_view keyManagement, std::string_view protocols,
-                                     bool wepKey) {
-    if (contains(keyManagement, "EAP") || has(keyManagement, "IEEE8021X")) return SavedSecurity::enterprise;
-    if (contains(keyManagement, "PSK")) {
+                                     SupplicantSecrets secrets) {
+    const bool personal = contains(keyManagement, "PSK"), byName = contains(keyManagement, "EAP");
+    if ((byName && (!personal || secrets.eapMethods)) || has(keyManagement, "IEEE8021X"))
+        return SavedSecurity::enterprise;
+    if (personal) {
         const bool onlyFirst = has(protocols, "WPA") && !has(protocols, "RSN") && !has(protocols, "WPA2");
         return onlyFirst ? SavedSecurity::wpaPersonal : SavedSecurity::wpa2Personal;
     }
     if (contains(keyManagement, "SAE")) return SavedSecurity::sae;
     if (has(keyManagement, "OWE")) return SavedSecurity::owe;
-    if (has(keyManagement, "NONE")) return wepKey ? SavedSecurity::wep : SavedSecurity::open;
+    if (has(keyManagement, "NONE")) return secrets.wepKey ? SavedSecurity::wep : SavedSecurity::open;
     return SavedSecurity::unknown;
 }
 

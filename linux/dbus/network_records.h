@@ -20,7 +20,14 @@ BusByteTexts namesCalled(const NetworkName& named);
 
 /// A name in the supplicant's form: in double quotes as it stands, `P"…"` with escapes, or in hexadecimal.
 std::optional<NetworkName> nameFromSupplicant(std::string_view text);
-/// The security that the supplicant's key management, protocols and the presence of a WEP key stand for.
-SavedSecurity securityFromSupplicant(std::string_view keyManagement, std::string_view protocols, bool wepKey);
+/// What a network of the supplicant has beside its key management.
+struct SupplicantSecrets {
+    bool wepKey = false;
+    bool eapMethods = false;
+};
+/// The security that the supplicant's key management, protocols and secrets stand for. Unless told otherwise it allows
+/// both a passphrase, which it keeps to itself, and a user's own name, which needs methods.
+SavedSecurity securityFromSupplicant(std::string_view keyManagement, std::string_view protocols,
+                                     SupplicantSecrets secrets = {});
 
 }  // namespace wp

@@ -22,10 +22,12 @@ std::optional<SavedNetwork> savedFromSupplicant(const BusValue& properties, bool
     if (!name) return std::nullopt;
     SavedNetwork network;
     network.name = *name;
+    SupplicantSecrets secrets;
+    for (const char* key : {"wep_key0", "wep_key1", "wep_key2", "wep_key3"})
+        secrets.wepKey |= !properties[key].empty();
+    secrets.eapMethods = !properties["eap"].empty();
     network.security =
-        securityFromSupplicant(properties["key_mgmt"].text(), properties["proto"].text(),
-                               !properties["wep_key0"].empty() || !properties["wep_key1"].empty() ||
-                                   !properties["wep_key2"].empty() || !properties["wep_key3"].empty());
+        securityFromSupplicant(properties["key_mgmt"].text(), properties["proto"].text(), secrets);
     network.enabled = enabled && properties["disabled"].text("0") == "0";
     network.hidden = properties["scan_ssid"].text("0") == "1";
     return network;

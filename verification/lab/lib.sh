@@ -1,4 +1,5 @@
 # Functions for scripts that run inside the lab: . "$LAB_DIR/lib.sh"
+# Those that manage a device are in managers.sh.
 # State of interface X is under /run/lab/X; an access point's radio lives in the
 # network namespace ap-X, so that only the air joins it to the station.
 
@@ -11,19 +12,19 @@ wait_for() {
     until "$@" > /dev/null 2>&1; do [ $SECONDS -lt $end ] || return 1; sleep 0.1; done
 }
 
-# fresh_radios N: N new radios, wlan0..., in a kernel that remembers no regulatory domain and no scan result.
+# fresh_radios N [hwsim options]: N new radios, wlan0..., in a kernel that remembers no regulatory domain and no scan result.
 # A radio comes back from a finished network namespace only a moment later.
 no_radios() {
     [ -d /sys/module/mac80211_hwsim ] || return 0
     wait_for 10 modprobe -r mac80211_hwsim && wait_for 5 modprobe -r mac80211 cfg80211
 }
 fresh_radios() {
+    local count=$1; shift
     no_radios || return 1
-    [ "$1" = 0 ] && { modprobe cfg80211; return; }
+    [ "$count" = 0 ] && { modprobe cfg80211; return; }
     # Without that option hwsim's radios under Debian's kernel scan 6 GHz too, see README.
-    local options=''; [ "$LAB_BACK" = uml ] || options=regtest=5
-    # shellcheck disable=SC2086
-    modprobe mac80211_hwsim radios="$1" $options && wait_for 5 test -e "/sys/class/net/wlan$(($1 - 1))"
+    [ "$LAB_BACK" = uml ] || set -- regtest=5 "$@"
+    modprobe mac80211_hwsim radios="$count" "$@" && wait_for 5 test -e "/sys/class/net/wlan$((count - 1))"
 }
 
 # country CC: sets the regulatory domain and waits for it.
@@ -64,13 +65,14 @@ ap_down() {
 # ap_up_again X: after `rfkill block wifi`, which blocks every namespace's radios.
 ap_up_again() { wait_for 5 ip -n "ap-$1" link set "$1" up; }
 
-# sta X < network blocks: starts wpa_supplicant on X. sta_up X waits for it to
+# sta X < network blocks: starts wpa_supplicant on X, and on the message bus where there is one. sta_up X waits for it to
 # be associated and authorised; sta_down X stops it.
 sta() {
     local dir=/run/lab/$1
     mkdir -p "$dir"
     { echo 'ctrl_interface=/run/wpa_supplicant'; cat; } > "$dir/wpa.conf"
-    wpa_supplicant -B -i "$1" -D nl80211 -c "$dir/wpa.conf" -f "$dir/wpa.log" -P "$dir/wpa.pid" > "$dir/wpa.out" 2>&1
+    local bus=''; [ ! -S /run/dbus/system_bus_socket ] || bus=-u
+    wpa_supplicant -B $bus -i "$1" -D nl80211 -c "$dir/wpa.conf" -f "$dir/wpa.log" -P "$dir/wpa.pid" > "$dir/wpa.out" 2>&1
 }
 sta_is_up() { wpa_cli -i "$1" status | grep -q wpa_state=COMPLETED; }
 sta_up() { wait_for "${2:-20}" sta_is_up "$1"; }
@@ -99,6 +101,9 @@ S
     busybox udhcpc -i "$1" -n -t 5 -s "$dir/udhcpc" > "$dir/udhcpc.log" 2>&1
 }
 
+# peer_link_is_up: whether a Wi-Fi Direct group of the station's own radio has a channel.
+peer_link_is_up() { iw dev | grep -A9 'Interface p2p-wlan0' | grep -q channel; }
+
 # scan X [iw scan arguments]: a fresh scan, retried while the radio is busy.
 scan() {
     local dev=$1 i; shift
@@ -107,20 +112,10 @@ scan() {
     return 1
 }
 
-# network_manager X: D-Bus, wpa_supplicant and NetworkManager, for interface X
-# only. There is no udev here: NetworkManager does without it where /sys is
-# read-only.
-nm_ready() { nmcli -t -f STATE general | grep -qv '^unknown' && nmcli -t -f DEVICE,STATE device | grep -q "^$1:\(disconnected\|conn\)"; }
-network_manager() {
-    mkdir -p /run/dbus /run/lab /etc/NetworkManager/conf.d
-    [ -s /etc/machine-id ] || dbus-uuidgen > /etc/machine-id
-    dbus-daemon --system --fork
-    printf '%s\n' '[main]' 'plugins=keyfile' 'dhcp=internal' 'auth-polkit=false' 'rc-manager=file' \
-        '[keyfile]' "unmanaged-devices=*,except:interface-name:$1" \
-        '[connectivity]' 'enabled=false' > /etc/NetworkManager/NetworkManager.conf
-    wpa_supplicant -B -u -f /run/lab/wpa-dbus.log > /dev/null
-    unshare -m sh -c 'mount -o remount,bind,ro /sys; exec NetworkManager --log-level=INFO' > /run/lab/nm.log 2>&1
-    wait_for 20 nm_ready "$1" || { tail -n 20 /run/lab/nm.log; return 1; }
+# switch_of RADIO on|off: the power switch of one radio alone.
+switch_of() {
+    local switch; switch=$(echo "/sys/class/net/$1/phy80211"/rfkill*)
+    rfkill "$([ "$2" = on ] && echo unblock || echo block)" "${switch##*rfkill}"
 }
 
 # signal X DBM: the strength (-1 to -100) at which access point X is heard by
@@ -158,21 +153,35 @@ no_internet() { :; }
 # internet X [behaviours]: what the tests contact lies beyond access point X, see the head of `internet`; every name
 # leads there (for an access point with an address). The program's configuration names it.
 internet() {
-    local dev=$1 there=203.0.113.10 dir=/run/lab; shift
-    mkdir -p $dir/$dev
-    [ -s $dir/internet.pem ] || openssl req -x509 -newkey ec -pkeyopt ec_paramgen_curve:P-256 -nodes -subj /CN=lab -days 3650 \
-        -addext 'subjectAltName=DNS:portal.example,DNS:vendor.example,DNS:api.example' \
-        -keyout $dir/internet-key.pem -out $dir/internet.pem 2> /dev/null
+    local dev=$1 there=203.0.113.10; shift
     in_ap "$dev" ip addr add $there/32 dev lo 2> /dev/null
     names_lead "$dev" $there
     # A home's one translation, unless the behaviours say something else.
     [ $# -gt 0 ] || set -- nat=203.0.113.77 mapped=203.0.113.77
+    internet_at "$dev" $there 2001:db8:1::1 "$@"
+}
+
+# internet_over_ipv6 X ADDRESS [behaviours]: the same for an access point with an IPv6 address alone.
+internet_over_ipv6() {
+    local dev=$1 there=$2; shift 2
+    in_ap "$dev" ip addr add "$there/128" dev lo nodad
+    in_ap "$dev" dnsmasq --no-resolv --no-hosts --conf-file=/dev/null --address="/#/$there" --bind-dynamic \
+        --pid-file="/run/lab/$dev/dnsmasq.pid" --user=root
+    internet_at "$dev" 203.0.113.10 "$there" "$@"
+}
+
+# internet_at X IPV4 IPV6 [behaviours]
+internet_at() {
+    local dev=$1 there=$2 there6=$3 dir=/run/lab; shift 3
+    [ -s $dir/internet.pem ] || openssl req -x509 -newkey ec -pkeyopt ec_paramgen_curve:P-256 -nodes -subj /CN=lab -days 3650 \
+        -addext 'subjectAltName=DNS:portal.example,DNS:vendor.example,DNS:api.example' \
+        -keyout $dir/internet-key.pem -out $dir/internet.pem 2> /dev/null
     : > "$dir/$dev/internet.log"
-    in_ap "$dev" "$LAB_DIR/internet" $there $dir/internet.pem $dir/internet-key.pem "$@" > "$dir/$dev/internet.log" 2>&1 &
+    in_ap "$dev" "$LAB_DIR/internet" "$there" $dir/internet.pem $dir/internet-key.pem "$@" > "$dir/$dev/internet.log" 2>&1 &
     wait_for 20 grep -q ready "$dir/$dev/internet.log" || { cat "$dir/$dev/internet.log"; return 1; }
     mkdir -p /etc/wifi-profile
     cat > /etc/wifi-profile/config.json <<C
-{"endpoints": {"pingIPv4": "$there", "pingIPv6": "2001:db8:1::1", "name": "host.example",
+{"endpoints": {"pingIPv4": "$there", "pingIPv6": "$there6", "name": "host.example",
   "portalPlain": "http://portal.example/204", "portalSecure": "https://portal.example/204",
   "vendorHost": "vendor.example:443", "vendorUrl": "https://vendor.example/vendor", "stun": "$there:3478",
   "certificateAuthorities": "$dir/internet.pem"}}
@@ -189,15 +198,5 @@ names_lead() {
         --pid-file="$dir/dnsmasq.pid" --log-facility="$dir/dnsmasq.log" --user=root "${@:3}"
 }
 
-# bluetooth PAIRED CONNECTED: a Bluetooth service with so many devices, on a system bus that everybody may own names on.
-bluetooth() {
-    mkdir -p /run/dbus /run/lab
-    printf '%s\n' '<busconfig><type>system</type><listen>unix:path=/run/dbus/system_bus_socket</listen>' \
-        '<auth>EXTERNAL</auth><policy context="default"><allow send_destination="*"/><allow receive_type="method_call"/><allow receive_type="method_return"/>' \
-        '<allow receive_type="error"/><allow receive_type="signal"/><allow send_requested_reply="true"/>' \
-        '<allow own="*"/><allow user="*"/></policy></busconfig>' > /run/lab/bus.conf
-    [ -s /etc/machine-id ] || dbus-uuidgen > /etc/machine-id
-    dbus-daemon --config-file=/run/lab/bus.conf --fork
-    "$LAB_DIR/bluetooth" "$@" > /run/lab/bluetooth.log 2>&1 &
-    wait_for 60 grep -q ready /run/lab/bluetooth.log || { cat /run/lab/bluetooth.log; return 1; }
-}
+# shellcheck disable=SC1091
+. "$LAB_DIR/managers.sh"

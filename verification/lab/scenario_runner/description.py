@@ -6,6 +6,7 @@
     [station wlan0]            lines of one wpa_supplicant network block; waits until it has joined
     [shell]                    bash with lib.sh, at this place of the order
     [run]                      arguments of `wifi-profile run`
+    [during]                   bash with screen.sh: the program runs on a terminal meanwhile, and its list is looked at
     [air]                      patterns that `iw scan dump -b` must show, to check the set-up itself
     [want]                     the truth, one value a line: see `wanted`
 """
@@ -26,6 +27,9 @@ HEADERS = {
     "user": None,  # who runs the program (root)
     "radios": None,  # how many (as many as the set-up names)
     "country": None,  # the kernel's regulatory domain before the set-up (US)
+    "hwsim": None,  # options of the simulated radios
+    "machine": ("uml",),  # only the kernel that is built for the lab can show it
+    "environment": None,  # NAME=VALUE for the program
 }
 
 
@@ -56,6 +60,7 @@ class Scenario:
     headers: dict[str, str] = field(default_factory=dict)
     steps: list[tuple[str, list[str], list[str]]] = field(default_factory=list)  # (kind, arguments, lines)
     arguments: list[str] = field(default_factory=list)
+    during: list[str] = field(default_factory=list)
     air: list[str] = field(default_factory=list)
     wants: list[Want] = field(default_factory=list)
 
@@ -110,7 +115,7 @@ def read(path: Path) -> Scenario:
             raise BadScenario(f"{path.name}:{start}: {problem}") from None
 
     for number, line in enumerate(lines[1:], 2):
-        if match := re.fullmatch(r"\[(ap|station|shell|run|air|want)\b\s*(.*)\]", line):
+        if match := re.fullmatch(r"\[(ap|station|shell|run|during|air|want)\b\s*(.*)\]", line):
             end_section()
             kind, arguments, body, start = match[1], match[2].split(), [], number
         else:
@@ -133,6 +138,8 @@ def _end_section(scenario: Scenario, kind: str, arguments: list[str], body: list
         scenario.steps.append((kind, arguments, body))
     elif kind == "run":
         scenario.arguments = shlex.split(" ".join(_content(body)))
+    elif kind == "during":
+        scenario.during += body
     elif kind == "air":
         scenario.air += _content(body)
         for pattern in scenario.air:

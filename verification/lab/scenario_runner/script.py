@@ -35,7 +35,7 @@ def set_up(scenario: Scenario) -> str:
     """The set-up alone: stops with a message at the first step that fails."""
     text = '. "$LAB_DIR/lib.sh"\n'
     text += "trap 'echo \"set-up failed at: $BASH_COMMAND\"; exit 99' ERR\nset -E\n"
-    text += f"fresh_radios {scenario.radios()}\n"
+    text += f"fresh_radios {scenario.radios()} {scenario.headers.get('hwsim', '')}\n"
     text += f"country {scenario.headers.get('country', 'US')}\n" if scenario.radios() else ""
     for kind, arguments, lines in scenario.steps:
         if kind == "ap":
@@ -49,11 +49,25 @@ def set_up(scenario: Scenario) -> str:
 
 def run(scenario: Scenario, program: str, out: str) -> str:
     """Runs the program as the scenario's user; leaves result, log and exit status beside `out`."""
-    command = [program, "run", "--screen", "none", *scenario.arguments]
+    screen = "terminal" if scenario.during else "none"
+    command = [program, "run", "--screen", screen, *scenario.arguments]
+    if "environment" in scenario.headers:
+        command = ["env", scenario.headers["environment"], *command]
     user = scenario.headers.get("user")
     if user:
         command = ["setpriv", f"--reuid={user}", "--regid=nogroup", "--clear-groups", "env", "HOME=/tmp", *command]
-    return f"timeout 120 {shlex.join(command)} > {out}.json 2> {out}.log\necho $? > {out}.exit\n"
+    line = f"timeout --foreground 120 {shlex.join(command)} > {out}.json 2> {out}.log\necho $? > {out}.exit\n"
+    return _watched(line, scenario.during, out) if scenario.during else line
+
+
+def _watched(line: str, steps: list[str], out: str) -> str:
+    """The line in a terminal, while the steps press keys, change what is on the air and say what must be seen."""
+    return (
+        '. "$LAB_DIR/screen.sh"\n'
+        "trap 'echo \"stopped at: $BASH_COMMAND\"; picture; exit 99' ERR\nset -E\n"
+        f"on_a_terminal {_here_document([line])}" + "\n".join(steps) + "\n"
+        f"wait_for 150 test -s {out}.exit\n"
+    )
 
 
 def check_air(out: str) -> str:

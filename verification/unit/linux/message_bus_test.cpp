@@ -282,15 +282,16 @@ TEST(NetworkRecords, NamesOfTheSupplicantComeInThreeForms) {
 
 TEST(NetworkRecords, KeyManagementBecomesAKindOfSecurity) {
     using enum SavedSecurity;
-    EXPECT_EQ(securityFromSupplicant("WPA-EAP IEEE8021X", "", false), enterprise);
-    EXPECT_EQ(securityFromSupplicant("WPA-PSK WPA-EAP", "", false), enterprise);
-    EXPECT_EQ(securityFromSupplicant("SAE", "RSN", false), sae);
-    EXPECT_EQ(securityFromSupplicant("WPA-PSK", "WPA", false), wpaPersonal);
-    EXPECT_EQ(securityFromSupplicant("WPA-PSK SAE", "WPA RSN", false), wpa2Personal);
-    EXPECT_EQ(securityFromSupplicant("OWE", "", false), owe);
-    EXPECT_EQ(securityFromSupplicant("NONE", "", false), open);
-    EXPECT_EQ(securityFromSupplicant("NONE", "", true), wep);
-    EXPECT_EQ(securityFromSupplicant("", "", false), unknown);
+    EXPECT_EQ(securityFromSupplicant("WPA-EAP IEEE8021X", ""), enterprise);
+    EXPECT_EQ(securityFromSupplicant("WPA-PSK WPA-EAP", ""), wpa2Personal);
+    EXPECT_EQ(securityFromSupplicant("WPA-PSK WPA-EAP", "", {.eapMethods = true}), enterprise);
+    EXPECT_EQ(securityFromSupplicant("SAE", "RSN"), sae);
+    EXPECT_EQ(securityFromSupplicant("WPA-PSK", "WPA"), wpaPersonal);
+    EXPECT_EQ(securityFromSupplicant("WPA-PSK SAE", "WPA RSN"), wpa2Personal);
+    EXPECT_EQ(securityFromSupplicant("OWE", ""), owe);
+    EXPECT_EQ(securityFromSupplicant("NONE", ""), open);
+    EXPECT_EQ(securityFromSupplicant("NONE", "", {.wepKey = true}), wep);
+    EXPECT_EQ(securityFromSupplicant("", ""), unknown);
 }
 
 TEST(NetworkRecords, MomentsAreReadInOneFormOnly) {

@@ -56,6 +56,13 @@ TEST(RouteMessages, TellTheGateway) {
     EXPECT_EQ("10.0.0.1", textOf(gateways[0].family, gateways[0].bytes));
 }
 
+TEST(RouteMessages, TellWhetherAnotherInterfaceLeadsOut) {
+    const auto routes = captured("good-home-route");
+
+    EXPECT_FALSE(leadsElsewhere(routes, interfaceIn("good-home")));
+    EXPECT_TRUE(leadsElsewhere(routes, 4711));
+}
+
 TEST(RouteMessages, TellAnIPv6GatewayWhereThereIsNoOther) {
     const auto gateways = readGateways(captured("ipv6-only-route"), interfaceIn("ipv6-only"));
 

@@ -68,7 +68,7 @@ TEST(AddressConfiguration, IPv6OfARoutersAdvertisementIsDynamicEvenWithoutAnEnd)
 
 NameServers servers(std::vector<IPAddress> manual, std::vector<IPAddress> effective,
                     std::vector<IPAddress> offered) {
-    return {std::move(manual), std::move(effective), std::move(offered), true};
+    return {std::move(manual), std::move(effective), std::move(offered), true, {}};
 }
 
 TEST(NameServers, OnlyServersThatTheNetworkDidNotOfferAreCustom) {
@@ -86,11 +86,28 @@ TEST(NameServers, AResolverOnTheDeviceHidesWhatItAsks) {
 }
 
 TEST(NameServers, WithoutAnOfferToCompareWithOnlyManualOnesAreKnown) {
-    NameServers unknown{{}, {address("192.168.1.1")}, {}, false};
+    NameServers unknown{{}, {address("192.168.1.1")}, {}, false, {}};
     EXPECT_TRUE(cannotTell(usesCustomNameServers(unknown), Reason::unavailable));
     unknown.manual = {address("9.9.9.9")};
     EXPECT_TRUE(found(usesCustomNameServers(unknown)));
     EXPECT_TRUE(cannotTell(usesCustomNameServers(failure(Reason::timeout, "silent")), Reason::timeout));
+}
+
+TEST(NameServers, TheNetworksOwnRouterNeedsNoOffer) {
+    const IPAddress router = address("192.168.1.1"), own = address("9.9.9.9");
+    EXPECT_FALSE(found(usesCustomNameServers(NameServers{{}, {router}, {}, false, {router}})));
+    EXPECT_TRUE(cannotTell(usesCustomNameServers(NameServers{{}, {router, own}, {}, false, {router}}),
+                           Reason::unavailable));
+    EXPECT_TRUE(found(usesCustomNameServers(NameServers{{}, {router}, {}, true, {router}})));
+}
+
+TEST(NameServers, NobodyOffersAnyWhereAllAddressesWereSetByHand) {
+    const AssignedAddress byHand{address("192.168.1.20"), true, false}, local{address("fe80::5"), true, true};
+    EXPECT_TRUE(allSetByHand({byHand, local}));
+    EXPECT_FALSE(allSetByHand({byHand, {address("2001:db8::5"), true, true}}));
+    EXPECT_FALSE(allSetByHand({byHand, {address("192.168.1.21"), false, false}}));
+    EXPECT_FALSE(allSetByHand({local}));
+    EXPECT_FALSE(allSetByHand({}));
 }
 
 TEST(WebProxy, AnyPlaceWhereOneIsSetIsAFinding) {
