@@ -55,7 +55,8 @@ OutputFormat formatFrom(const std::string& text) {
 
 OutputFormat reportFormatFrom(const std::string& text) {
     if (text == "text") return OutputFormat::text;
-    refuse("--format: " + quoted(text) + " is no format of a report; give text");
+    if (text == "html") return OutputFormat::html;
+    refuse("--format: " + quoted(text) + " is no format of a report; give text or html");
 }
 
 // clang-format off
@@ -105,7 +106,7 @@ const Option<RunOptions> kRunOptions[] = {
 
 // clang-format off
 const Option<ReportOptions> kReportOptions[] = {
-    {"--format", Takes::value, "FORMAT", "text (default)",
+    {"--format", Takes::value, "FORMAT", "text (default) or html, one page on its own",
      [](ReportOptions& o, const std::string& v) { o.format = reportFormatFrom(v); }},
     {"--all", Takes::nothing, "", "every test, not only the findings",
      [](ReportOptions& o, const std::string&) { o.all = true; }},

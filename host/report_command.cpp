@@ -9,6 +9,7 @@
 #include "host/output_file.h"
 #include "host/preparation.h"
 #include "host/report/catalogue_text.h"
+#include "host/report/html/html_form.h"
 #include "host/report/report.h"
 #include "host/report/text_form.h"
 #include "host/run.h"
@@ -96,7 +97,8 @@ int writeReport(const ReportOptions& options) {
     TextForm form;
     if (options.all) form.tests = TextForm::Tests::all;
     if (!output && isatty(STDOUT_FILENO)) form.style = TextForm::Style::terminal;
-    std::string text = reportText(report, evidence, form, texts);
+    std::string text = options.format == OutputFormat::html ? reportPage(report, evidence, form.tests, texts)
+                                                            : reportText(report, evidence, form, texts);
     if (output) {
         output->write(text);
     } else if (std::optional<std::string> error = writeAll(STDOUT_FILENO, text)) {

@@ -49,10 +49,12 @@ HeardNetwork networkOf(const Evidence& evidence, const DictionaryPointer& entry)
     return network;
 }
 
-/// The details of whichever of the two networks' tests has them; the air is the same.
+/// Of both networks' tests, since each phase may have missed what the other heard; the joined one's come first.
 Array entriesOf(const Evidence& evidence) {
     Array entries = arrayIn(detailsOf(evidence, Part::joined, 24), "networks");
-    return entries.empty() ? arrayIn(detailsOf(evidence, Part::selected, 24), "networks") : entries;
+    for (const Value& value : arrayIn(detailsOf(evidence, Part::selected, 24), "networks"))
+        entries.push_back(value);
+    return entries;
 }
 
 constexpr int kNoSignal = -1000;

@@ -28,7 +28,7 @@ struct Stretch {
 // A device's channels: 1 to 13 of 2.4 GHz, the three stretches of 5 GHz with what lies between left out, 6 GHz.
 constexpr Stretch k2GHz[] = {{2397, 2487, 1, 2412, 1, 13}};
 constexpr Stretch k5GHz[] = {
-    {5170, 5330, 36, 5180, 4, 64}, {5490, 5730, 100, 5500, 4, 144}, {5735, 5895, 149, 5745, 4, 177}};
+    {5170, 5330, 36, 5180, 8, 64}, {5490, 5730, 100, 5500, 8, 144}, {5735, 5895, 149, 5745, 8, 177}};
 constexpr Stretch k6GHz[] = {{5945, 7125, 1, 5955, 16, 233}};
 
 std::span<const Stretch> stretchesOf(ChannelPicture::Band band) {

@@ -19,6 +19,7 @@ body { margin: 0 auto; padding: 1.5rem 1rem 3rem; max-width: 46rem; background: 
 h1 { font-size: 1.1rem; margin: 0; color: var(--quiet); font-weight: 600; }
 h2 { font-size: 1.25rem; margin: 2.25rem 0 .75rem; }
 h3 { font-size: 1.05rem; margin: 0; }
+table + h3 { margin-top: 1.1rem; }
 p { margin: .25rem 0; }
 .summary { font-size: 1.45rem; line-height: 1.3; font-weight: 600; margin: .35rem 0 0; }
 ol.findings { list-style: none; margin: 0; padding: 0; }
@@ -40,11 +41,15 @@ dd { margin: 0; }
 ul { margin: .3rem 0; padding-left: 1.3rem; }
 figure { margin: 0 0 1.75rem; break-inside: avoid; }
 figcaption { font-weight: 600; margin-bottom: .25rem; }
-.legend { color: var(--quiet); font-size: .9rem; }
+.legend { color: var(--quiet); font-size: .9rem; margin-bottom: 1rem; }
 table { border-collapse: collapse; width: 100%; font-size: .9rem; }
 th, td { text-align: start; padding: .3rem .5rem .3rem 0; border-bottom: 1px solid var(--line); vertical-align: top; }
 th { color: var(--quiet); font-weight: 600; }
-td.figure, th.figure { text-align: end; font-variant-numeric: tabular-nums; white-space: nowrap; }
+th[scope=row] { width: 9.5rem; }
+figure table { margin-top: .5rem; }
+td.figure, th.figure { text-align: end; }
+td.figure { font-variant-numeric: tabular-nums; white-space: nowrap; }
+td[dir] { min-width: 6.5rem; }
 tr.own td { font-weight: 700; }
 svg { display: block; width: 100%; height: auto; color: var(--text); }
 svg.pings { max-width: 24rem; }
@@ -64,7 +69,8 @@ svg .number, svg .own { font-weight: 700; }
 svg .answer { fill: var(--own); }
 svg .lost { fill: none; stroke: var(--bad); stroke-width: 3; }
 @media (min-width: 34rem) {
-  dl > div { display: grid; grid-template-columns: 8.5rem 1fr; gap: .75rem; }
+  dl > div { display: grid; grid-template-columns: 8.5rem 1fr; column-gap: .75rem; }
+  dd { grid-column: 2; }
 }
 @media (max-width: 34rem) {
   svg.channels text { font-size: 24px; }

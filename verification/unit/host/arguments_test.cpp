@@ -96,7 +96,7 @@ TEST(Arguments, WhatCannotBeUsedIsRefusedWithTheArgumentAndTheReason) {
     EXPECT_EQ(refusalOf({"report"}), "report: needs a FILE (or -), a result or a recording");
     EXPECT_EQ(refusalOf({"report", "a", "b"}), "\"b\": report takes one file; leave it out");
     EXPECT_EQ(refusalOf({"report", "a", "--format", "json"}),
-              "--format: \"json\" is no format of a report; give text");
+              "--format: \"json\" is no format of a report; give text or html");
     EXPECT_EQ(refusalOf({"run", "fast"}),
               "\"fast\" is not an option of run; `wifi-profile run --help` lists them");
     EXPECT_EQ(refusalOf({"run", "--fast"}),
