@@ -1,6 +1,7 @@
 #include "host/front_ends.h"
 
 #include "host/exit.h"
+#include "host/tv_screen.h"
 #include "screens/headless/headless_screen.h"
 #include "screens/terminal/terminal_screen.h"
 
@@ -30,11 +31,20 @@ std::unique_ptr<ui::FrontEnd> makeTerminal(ui::Screen& screen, MainQueue& queue,
     return std::get<std::unique_ptr<terminal::TerminalScreen>>(std::move(opened));
 }
 
+std::unique_ptr<ui::FrontEnd> makeTelevision(ui::Screen& screen, MainQueue& queue,
+                                             const Localization& localization, DiagnosticsLog& log) {
+    TvModule::Loaded module = TvModule::load();
+    if (const std::string* why = std::get_if<std::string>(&module)) refuse("--screen: tv: " + *why);
+    return std::get<TvModule>(module).open(screen, queue, localization, log);
+}
+
 }  // namespace
 
 std::unique_ptr<ui::FrontEnd> makeFrontEnd(ScreenChoice choice, ui::Screen& screen, MainQueue& queue,
-                                           const Localization& localization) {
+                                           const Localization& localization, DiagnosticsLog& log) {
     switch (choice) {
+        case ScreenChoice::tv:
+            return makeTelevision(screen, queue, localization, log);
         case ScreenChoice::terminal:
             return makeTerminal(screen, queue, localization);
         case ScreenChoice::headless:

@@ -3,11 +3,14 @@
 #include <fcntl.h>
 #include <unistd.h>
 
+#include <cstdlib>
+
 #include "host/exit.h"
 #include "host/files.h"
 #include "host/request.h"
 #include "host/screen_choice.h"
 #include "host/string_table.h"
+#include "host/tv_screen.h"
 
 namespace wp::host {
 namespace {
@@ -46,9 +49,33 @@ bool hasTerminal() {
     return true;
 }
 
-remote::Script scriptOf(const RunOptions& options) {
+bool hasDisplay() {
+    auto isNamed = [](const char* variable) {
+        const char* value = std::getenv(variable);
+        return value && *value;
+    };
+    return isNamed("WAYLAND_DISPLAY") || isNamed("DISPLAY");
+}
+
+ScreenChoice screenOf(const RunOptions& options, const Dictionary& parameters) {
+    ScreenSurroundings surroundings;
+    surroundings.hasTerminal = hasTerminal();
+    surroundings.hasList = asksForList(parameters);
+    surroundings.hasScript = options.remote.has_value();
+    surroundings.hasDisplay = hasDisplay();
+    surroundings.televisionFault = []() -> std::optional<std::string> {
+        TvModule::Loaded module = TvModule::load();
+        if (std::string* why = std::get_if<std::string>(&module)) return std::move(*why);
+        return std::nullopt;
+    };
+    return chooseScreen(options.screen, surroundings);
+}
+
+remote::Script scriptOf(const RunOptions& options, ScreenChoice screen) {
     if (!options.remote) return {};
-    remote::Script script = remote::readScript(*options.remote, remote::Pictures::refused);
+    remote::Pictures pictures =
+        screen == ScreenChoice::tv ? remote::Pictures::taken : remote::Pictures::refused;
+    remote::Script script = remote::readScript(*options.remote, pictures);
     if (script.error) refuse("--remote: " + *script.error);
     return script;
 }
@@ -95,9 +122,8 @@ Preparation prepare(const RunOptions& options) {
     // A replay has its capabilities from the recording; a file that was named is read all the same.
     if (!prepared.recording || options.configFile)
         prepared.configuration = readConfiguration(options.configFile);
-    prepared.screen = chooseScreen(
-        options.screen, {hasTerminal(), asksForList(*prepared.parameters), options.remote.has_value()});
-    prepared.script = scriptOf(options);
+    prepared.screen = screenOf(options, *prepared.parameters);
+    prepared.script = scriptOf(options, prepared.screen);
     refuseOneFileForTwo(options);
     prepared.output = outputFile("--output", options.outputFile);
     prepared.record = outputFile("--record", options.recordFile, kRecordingMode);

@@ -179,7 +179,7 @@ void Run::setUp() {
 /// Starts the diagnostic and lets it run to its end. Returns why it cannot come to one.
 std::optional<std::string> Run::drive() {
     std::unique_ptr<ui::FrontEnd> frontEnd =
-        makeFrontEnd(prepared_.screen, screen_, mainQueue_, localization_);
+        makeFrontEnd(prepared_.screen, screen_, mainQueue_, localization_, log_);
     if (prepared_.screen == ScreenChoice::terminal && isatty(STDERR_FILENO)) log_.hold();
     isUnderWay_ = true;
     if (!isBrokenOff()) controller_->start();

@@ -5,23 +5,31 @@
 namespace wp::host {
 namespace {
 
+std::optional<std::string> televisionFault(const ScreenSurroundings& surroundings) {
+    return surroundings.televisionFault ? surroundings.televisionFault() : std::nullopt;
+}
+
 ScreenChoice automaticScreen(const ScreenSurroundings& surroundings) {
     if (!surroundings.hasList) return ScreenChoice::none;
+    if (surroundings.hasDisplay && !televisionFault(surroundings)) return ScreenChoice::tv;
     if (surroundings.hasTerminal) return ScreenChoice::terminal;
     refuse(
-        "--screen: the list needs a screen and there is no terminal; give --screen headless with --remote");
+        "--screen: the list needs a screen and there is no display and no terminal; give --screen tv, or "
+        "headless "
+        "with --remote");
 }
 
 }  // namespace
 
 ScreenChoice chooseScreen(ScreenChoice wanted, const ScreenSurroundings& surroundings) {
     ScreenChoice choice = wanted == ScreenChoice::automatic ? automaticScreen(surroundings) : wanted;
-    if (choice == ScreenChoice::tv)
-        refuse("--screen: this build has no television screen; give terminal, headless or none");
+    if (wanted == ScreenChoice::tv)
+        if (std::optional<std::string> fault = televisionFault(surroundings))
+            refuse("--screen: tv: " + *fault + "; give terminal, headless or none");
     if (choice == ScreenChoice::none && surroundings.hasList)
-        refuse("--screen: none shows no list; give terminal or headless, or a request without the list");
+        refuse("--screen: none shows no list; give tv, terminal or headless, or a request without the list");
     if (choice == ScreenChoice::none && surroundings.hasScript)
-        refuse("--remote: screen none takes no keys; give --screen headless or terminal");
+        refuse("--remote: screen none takes no keys; give --screen headless, terminal or tv");
     if (choice == ScreenChoice::terminal && !surroundings.hasTerminal)
         refuse("--screen: there is no terminal; give headless or none");
     return choice;

@@ -24,6 +24,9 @@ WANTED = {
     "share/wifi-profile/vendors.json",
 }
 
+# Only where the build has the television screen.
+TELEVISION = "wifi-profile-screen-tv.so"
+
 
 def install(build, cmake, folder):
     subprocess.run([cmake, "--install", build, "--prefix", "/usr", "--strip"], check=True, stdout=subprocess.DEVNULL,
@@ -40,6 +43,8 @@ def output_of(program, *arguments):
 def main():
     build, cmake = sys.argv[1:]
     faults = []
+    if os.path.exists(f"{build}/{TELEVISION}"):
+        WANTED.add(f"lib/wifi-profile/{TELEVISION}")
     with tempfile.TemporaryDirectory() as folder:
         root, found = install(build, cmake, folder)
         faults += [f"missing: {name}" for name in sorted(WANTED - found)]

@@ -1,0 +1,68 @@
+import QtQuick
+
+// One line of text with its cursor; a longer text is shown from where the cursor is inside the field.
+Rectangle {
+    id: field
+
+    required property var stage
+    readonly property real u: stage.unit
+    required property var look
+
+    height: 76 * u
+    radius: 12 * u
+    color: "#f1f3f7"
+    border.width: u * (look.isFieldFocused ? 4 : 2)
+    border.color: look.isFieldFocused ? "#16243a" : "#b9c0cc"
+
+    Item {
+        id: view
+
+        x: 24 * field.u
+        width: parent.width - 2 * x
+        height: parent.height
+        clip: true
+
+        Text {
+            id: typed
+
+            x: Math.min(0, view.width - field.u * (4 + field.look.cursorX))
+            height: parent.height
+            verticalAlignment: Text.AlignVCenter
+            text: field.look.text
+            textFormat: Text.PlainText
+            font.family: field.stage.fontFamily
+            font.pointSize: field.u * 34
+            font.hintingPreference: Font.PreferNoHinting
+            color: "#16191f"
+        }
+        Text {
+            width: parent.width
+            height: parent.height
+            verticalAlignment: Text.AlignVCenter
+            visible: field.look.text === ""
+            text: field.look.placeholder
+            textFormat: Text.PlainText
+            elide: Text.ElideRight
+            font.family: field.stage.fontFamily
+            font.pointSize: field.u * 34
+            font.hintingPreference: Font.PreferNoHinting
+            color: "#767c87"
+        }
+        Rectangle {
+            x: typed.x + field.u * field.look.cursorX
+            y: 16 * field.u
+            width: 4 * field.u
+            height: parent.height - 2 * y
+            visible: field.look.isFieldFocused
+            color: "#1b5fc1"
+        }
+    }
+
+    Accessible.role: Accessible.EditableText
+    Accessible.name: look.placeholder
+    Accessible.description: look.text
+    Accessible.editable: true
+    Accessible.focusable: true
+    Accessible.focused: look.isFieldFocused
+    Accessible.ignored: !visible
+}

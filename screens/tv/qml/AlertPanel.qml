@@ -1,0 +1,114 @@
+import QtQuick
+
+// An alert over everything: its texts, its field, its actions one below the other.
+Rectangle {
+    id: alert
+
+    required property var stage
+    readonly property real u: stage.unit
+    readonly property var look: stage.alert
+    readonly property real wantedOpacity: look.isShown ? 1 : 0
+    readonly property real capWidth: (panel.width - 112 * u) / 22
+    readonly property real capHeight: 70 * u
+
+    function moves() {
+        if (opacity !== wantedOpacity)
+            return true
+        for (const items of [actions, caps])
+            for (let i = 0; i < items.count; ++i)
+                if (items.itemAt(i) && items.itemAt(i).isMoving)
+                    return true
+        return false
+    }
+
+    color: "#99101722"
+    opacity: wantedOpacity
+    visible: opacity > 0
+    Behavior on opacity {
+        enabled: alert.stage.hasMotion
+        NumberAnimation { duration: 180 }
+    }
+
+    Rectangle {
+        id: panel
+
+        anchors.centerIn: parent
+        width: alert.u * (alert.look.hasField ? 1240 : 860)
+        height: content.height + 96 * alert.u
+        radius: 18 * alert.u
+        color: "#ffffff"
+
+        Accessible.role: Accessible.AlertMessage
+        Accessible.name: alert.look.title !== "" ? alert.look.title : alert.look.message
+        Accessible.description: alert.look.title !== "" ? alert.look.message : ""
+        Accessible.ignored: !alert.look.isShown
+
+        Column {
+            id: content
+
+            x: 56 * alert.u
+            y: 48 * alert.u
+            width: parent.width - 2 * x
+            spacing: 26 * alert.u
+
+            AlertText {
+                stage: alert.stage
+                text: alert.look.title
+                font.pointSize: u * 38
+                font.bold: true
+                color: "#16191f"
+            }
+            AlertText {
+                stage: alert.stage
+                text: alert.look.message
+                font.pointSize: u * 30
+                color: "#3a414d"
+            }
+            AlertField {
+                stage: alert.stage
+                look: alert.look
+                width: parent.width
+                visible: look.hasField
+            }
+            Item {
+                width: parent.width
+                height: 5 * alert.capHeight
+                visible: alert.look.hasField
+
+                Accessible.role: Accessible.Grouping
+                Accessible.ignored: !visible
+
+                Repeater {
+                    id: caps
+                    model: alert.look.hasField ? alert.stage.keyboard.length : 0
+                    delegate: KeyCap {
+                        required property int index
+
+                        stage: alert.stage
+                        look: alert.stage.keyboard[index]
+                        x: look ? look.column * alert.capWidth : 0
+                        y: look ? look.row * alert.capHeight : 0
+                        width: look ? look.width * alert.capWidth : 0
+                        height: alert.capHeight
+                    }
+                }
+            }
+            Column {
+                width: parent.width
+                spacing: 6 * alert.u
+
+                Repeater {
+                    id: actions
+                    model: alert.look.actions.length
+                    delegate: ActionButton {
+                        required property int index
+
+                        stage: alert.stage
+                        look: alert.look.actions[index]
+                        width: parent ? parent.width : 0
+                    }
+                }
+            }
+        }
+    }
+}

@@ -1,0 +1,83 @@
+#include "screens/tv/window.h"
+
+#include <QGuiApplication>
+#include <QInputMethodEvent>
+#include <QKeyEvent>
+#include <QQuickItem>
+
+#include "screens/tv/key_map.h"
+
+namespace wp::tv {
+
+/// Has the scene's focus, so that what an input method commits comes here.
+class Window::InputMethodItem final : public QQuickItem {
+  public:
+    InputMethodItem(QQuickItem* parent, const Input& input) : QQuickItem(parent), input_(input) {
+        setFlag(ItemIsFocusScope);
+        setFocus(true);
+    }
+
+    void fieldChanged() {
+        bool takesText = input_.takesText();
+        if (flags().testFlag(ItemAcceptsInputMethod) != takesText) {
+            setFlag(ItemAcceptsInputMethod, takesText);
+            if (!takesText) input_.compose({});
+        }
+        QGuiApplication::inputMethod()->update(Qt::ImQueryInput | Qt::ImEnabled);
+    }
+
+  protected:
+    void inputMethodEvent(QInputMethodEvent* event) override {
+        if (!event->commitString().isEmpty()) input_.type(event->commitString());
+        input_.compose(event->preeditString());
+        event->accept();
+    }
+
+    QVariant inputMethodQuery(Qt::InputMethodQuery query) const override {
+        switch (query) {
+            case Qt::ImEnabled:
+                return input_.takesText();
+            case Qt::ImCursorRectangle:
+                return input_.cursor();
+            case Qt::ImHints:
+                // A network's name is no prose.
+                return static_cast<int>(Qt::ImhNoPredictiveText | Qt::ImhNoAutoUppercase);
+            default:
+                return QQuickItem::inputMethodQuery(query);
+        }
+    }
+
+  private:
+    const Input& input_;
+};
+
+Window::Window(Input input)
+    : input_(std::move(input)), inputMethod_(new InputMethodItem(contentItem(), input_)) {
+    setResizeMode(QQuickView::SizeRootObjectToView);
+    setColor(Qt::white);
+}
+
+void Window::fieldChanged() {
+    inputMethod_->fieldChanged();
+}
+
+void Window::keyPressEvent(QKeyEvent* event) {
+    event->accept();
+    if (auto key = keyOf(static_cast<Qt::Key>(event->key()), event->nativeScanCode()))
+        return input_.press(*key);
+    bool isCommand =
+        event->modifiers().testFlag(Qt::ControlModifier) || event->modifiers().testFlag(Qt::AltModifier);
+    QString text = event->text();
+    if (!isCommand && !text.isEmpty() && text.front().isPrint()) input_.type(text);
+}
+
+bool Window::event(QEvent* event) {
+    if (event->type() == QEvent::Close) {
+        event->ignore();
+        input_.close();
+        return true;
+    }
+    return QQuickView::event(event);
+}
+
+}  // namespace wp::tv
