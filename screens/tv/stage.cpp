@@ -123,6 +123,11 @@ void Stage::apply(const ui::SettingsTableView& table, const ui::TableChanges& ba
     lines_.play(flatTable_.lines(), changes, motion_);
 }
 
+void Stage::givePictureSize(ui::Screen& screen) {
+    constexpr ui::Size kSize{380, 380};
+    if (auto* image = screen.viewAs<ui::ImageView>(ui::identifiers::image)) image->setImageSize(kSize);
+}
+
 void Stage::takeOver(ui::Screen& screen, const QString& composed) {
     using namespace ui::identifiers;
     set(title_, lookOf(screen.viewAs<ui::Label>(title)), &Stage::titleChanged);

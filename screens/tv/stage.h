@@ -37,6 +37,8 @@ class Stage final : public QObject {
     /// Follows the table at once, batch by batch.
     void reload(const ui::SettingsTableView& table);
     void apply(const ui::SettingsTableView& table, const ui::TableChanges& changes);
+    /// Tells the tree how large the picture is, before a layout.
+    static void givePictureSize(ui::Screen& screen);
     /// Takes over everything else, as the layout left it. The text is what an input method is composing.
     void takeOver(ui::Screen& screen, const QString& composed);
     void takeKeyboard(QVariantList keys) { set(keyboard_, std::move(keys), &Stage::keyboardChanged); }

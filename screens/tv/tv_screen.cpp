@@ -138,6 +138,7 @@ class TvScreen::Loop : private ui::ScreenObserver {
 
     void update() {
         if (isUpToDate_) return;
+        stage_.givePictureSize(screen_);
         screen_.layoutIfNeeded();
         stage_.takeOver(screen_, composed_);
         auto alert = screen_.alert();

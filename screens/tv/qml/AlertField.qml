@@ -36,7 +36,8 @@ Rectangle {
             color: "#16191f"
         }
         Text {
-            width: parent.width
+            x: 10 * field.u
+            width: parent.width - x
             height: parent.height
             verticalAlignment: Text.AlignVCenter
             visible: field.look.text === ""

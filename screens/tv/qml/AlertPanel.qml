@@ -33,7 +33,7 @@ Rectangle {
         id: panel
 
         anchors.centerIn: parent
-        width: alert.u * (alert.look.hasField ? 1240 : 860)
+        width: alert.u * (alert.look.hasField ? 1240 : 960)
         height: content.height + 96 * alert.u
         radius: 18 * alert.u
         color: "#ffffff"
@@ -54,14 +54,14 @@ Rectangle {
             AlertText {
                 stage: alert.stage
                 text: alert.look.title
-                font.pointSize: u * 38
+                font.pointSize: u * 40
                 font.bold: true
                 color: "#16191f"
             }
             AlertText {
                 stage: alert.stage
                 text: alert.look.message
-                font.pointSize: u * 30
+                font.pointSize: u * 32
                 color: "#3a414d"
             }
             AlertField {

@@ -13,10 +13,7 @@ Rectangle {
         return table.moves() || bar.isMoving || alert.moves() || description.isMoving || status.isMoving
     }
 
-    gradient: Gradient {
-        GradientStop { position: 0.0; color: "#ffffff" }
-        GradientStop { position: 1.0; color: "#eef0f4" }
-    }
+    color: "#ffffff"
 
     Item {
         width: 1920 * root.stage.unit

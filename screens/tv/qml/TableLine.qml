@@ -46,7 +46,7 @@ Item {
         width: line.width - 2 * x
         height: line.height - y - (line.isLast ? 3 : 2) * line.u
         radius: 10 * line.u
-        color: "#0f1a2b40"
+        color: "#eff1f5"
     }
 
     // The focus: a dark ground, 12 points wider on either side.

@@ -13,7 +13,6 @@ Text {
     x: u * look.frame.x
     y: u * look.frame.y
     width: u * look.frame.width
-    height: u * look.frame.height
     text: look.text
     color: look.color
     textFormat: Text.PlainText

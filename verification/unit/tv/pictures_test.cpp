@@ -1,0 +1,232 @@
+// Each state of the screen as a picture, compared with the one that was looked at and found good. To take new ones
+// over: WP_TAKE_PICTURES=1 build/tv_pictures_test, and look at every one.
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <filesystem>
+
+#include "host/string_table.h"
+#include "screens/tv/tv_screen.h"
+#include "verification/unit/network_list/list_run.h"
+#include "verification/unit/tv/picture_compare.h"
+
+namespace wp::tv {
+namespace {
+
+using fakes::AccessPoint;
+using fakes::ListRun;
+using ui::Key;
+
+const std::filesystem::path kGood = std::filesystem::path(WP_SOURCE_DIR) / "verification/unit/tv/pictures";
+const std::filesystem::path kTaken = std::filesystem::path(WP_BINARY_DIR) / "pictures";
+
+std::vector<AccessPoint> neighbourhood(int count) {
+    const char* names[] = {"Blue Kite",      "Café am Eck",   "Corner Shop", "Flat 12",        "Garden Room",
+                           "Harbour Guests", "Ivy House",     "Kestrel",     "Maison Lavande", "Old Mill",
+                           "Orchard 5G",     "Printer Setup", "Quayside",    "Rowan",          "Station Café",
+                           "Upstairs",       "Vicarage",      "Willow"};
+    std::vector<AccessPoint> points;
+    for (int i = 0; i < count; ++i) points.push_back({names[i], std::to_string(i), -40 - i});
+    return points;
+}
+
+class Pictures : public testing::Test {
+  protected:
+    Pictures() {
+        setenv("QT_QPA_PLATFORM", "offscreen", 1);
+        setenv("FONTCONFIG_FILE", WP_SOURCE_DIR "/verification/unit/tv/fonts.conf", 1);
+        setenv("WIFI_PROFILE_TV_SIZE", "1280x720", 1);
+        setenv("WIFI_PROFILE_TV_MOTION", "none", 1);
+        std::filesystem::create_directories(kTaken);
+    }
+
+    void open(const std::string& locale = "en") {
+        host::StringTable table = host::stringTable(locale).value();
+        for (const auto& [key, text] : table) run.device.localization.setText(key, text);
+        Texts texts{table["KEYBOARD_SHIFT"],   table["KEYBOARD_SYMBOLS"],
+                    table["KEYBOARD_LETTERS"], table["KEYBOARD_BLANK"],
+                    table["KEYBOARD_LEFT"],    table["KEYBOARD_RIGHT"],
+                    table["KEYBOARD_ERASE"],   table["DONE"]};
+        Display::Messages messages;
+        messages.note = [](std::string_view line) { ADD_FAILURE() << line; };
+        TvScreen::Opened opened = TvScreen::open(run.device.screen, queue, texts, messages);
+        ASSERT_TRUE(std::holds_alternative<std::unique_ptr<TvScreen>>(opened))
+            << std::get<std::string>(opened);
+        tv = std::move(std::get<std::unique_ptr<TvScreen>>(opened));
+    }
+
+    void showList(const std::vector<AccessPoint>& points) {
+        run.join("Northlight", "n");
+        run.hear(points);
+        run.showList();
+    }
+
+    /// Puts the focus on the row without a key.
+    void focus(const std::string& text) { run.focus(text); }
+
+    void expectPicture(const std::string& name) {
+        std::filesystem::path file = kTaken / (name + ".png");
+        ASSERT_EQ(tv->savePicture(file.string()), std::nullopt);
+        QImage got(QString::fromStdString(file.string()));
+        std::filesystem::path good = kGood / (name + ".png");
+        if (std::getenv("WP_TAKE_PICTURES"))
+            std::filesystem::copy_file(file, good, std::filesystem::copy_options::overwrite_existing);
+        PictureDifference difference = compare(QImage(QString::fromStdString(good.string())), got);
+        std::filesystem::path differing = kTaken / (name + ".difference.png");
+        if (!difference.what.empty()) difference.picture.save(QString::fromStdString(differing.string()));
+        EXPECT_EQ(difference.what, "") << good << "\n" << file << "\n" << differing;
+    }
+
+    Activity activity;
+    MainQueue queue{activity};
+    ListRun run;
+    std::unique_ptr<TvScreen> tv;
+};
+
+TEST_F(Pictures, ListBeforeTheFirstScan) {
+    open();
+    showList({});
+
+    expectPicture("list_empty");
+}
+
+TEST_F(Pictures, ListOfAFewNetworks) {
+    open();
+    showList(neighbourhood(4));
+
+    expectPicture("list");
+}
+
+TEST_F(Pictures, ListOfManyNetworks) {
+    open();
+    showList(neighbourhood(18));
+
+    expectPicture("list_full");
+}
+
+TEST_F(Pictures, ListScrolledToItsMiddle) {
+    open();
+    showList(neighbourhood(18));
+
+    focus("Rowan");
+
+    expectPicture("list_scrolled");
+}
+
+TEST_F(Pictures, FocusOnANetwork) {
+    open();
+    showList(neighbourhood(4));
+
+    focus("Café am Eck");
+
+    expectPicture("focus_network");
+}
+
+TEST_F(Pictures, FocusOnOther) {
+    open();
+    showList(neighbourhood(4));
+
+    focus("Other…");
+
+    expectPicture("focus_other");
+}
+
+TEST_F(Pictures, FocusIsMutedWhileARescanRuns) {
+    open();
+    showList(neighbourhood(4));
+
+    run.choose("Search Again");
+    run.device.queues.runMain();
+
+    expectPicture("rescan");
+}
+
+TEST_F(Pictures, Confirmation) {
+    open();
+    showList(neighbourhood(4));
+
+    run.choose("Café am Eck");
+
+    expectPicture("confirmation");
+}
+
+TEST_F(Pictures, TextEntry) {
+    open();
+    showList(neighbourhood(4));
+
+    run.choose("Other…");
+
+    expectPicture("text_entry");
+}
+
+TEST_F(Pictures, TextEntryOfALongName) {
+    open();
+    showList(neighbourhood(4));
+
+    run.choose("Other…");
+    run.device.screen.typeText("The network of the house at the far end of the lane, second floor");
+    run.press({Key::down, Key::down});
+
+    expectPicture("text_entry_done");
+}
+
+TEST_F(Pictures, WiFiIsOff) {
+    run.device.wifi.setInitialPower(0);
+    open();
+    run.showList();
+
+    expectPicture("wifi_off");
+}
+
+TEST_F(Pictures, Progress) {
+    open();
+    showList(neighbourhood(4));
+
+    run.controller->showProgress();
+    expectPicture("progress_none");
+    run.controller->progressView()->setProgress(4.0F / 11.0F);
+    expectPicture("progress_part");
+    run.controller->progressView()->setProgress(1);
+    expectPicture("progress_whole");
+}
+
+TEST_F(Pictures, German) {
+    open("de");
+    showList(neighbourhood(4));
+
+    expectPicture("german");
+}
+
+TEST_F(Pictures, Japanese) {
+    open("ja");
+    showList({{"東京ネット", "1"}, {"ゲスト用", "2"}, {"커피숍", "3"}, {"咖啡館", "4"}});
+
+    expectPicture("japanese");
+}
+
+TEST_F(Pictures, NamesOfAllKinds) {
+    open();
+    showList({{"<b>bold</b><img src=x>", "1"},
+              {"line\nbreak\x1b[31m", "2"},
+              {"abc\u202Egnp.exe", "3"},
+              {"שלום עולם", "4"},
+              {"مقهى الزاوية", "5"},
+              {"WWWWWWWWWWWWWWWWWWWWWWWWWWWWWWWW", "6"},
+              {"東京ネットワーク東京ネット", "7"},
+              {"👩‍👩‍👧 family", "8"},
+              {std::string("\xff\xfe\x41"), "9"}});
+
+    expectPicture("names");
+}
+
+TEST_F(Pictures, InFullSize) {
+    setenv("WIFI_PROFILE_TV_SIZE", "1920x1080", 1);
+    open();
+    showList(neighbourhood(18));
+
+    expectPicture("list_1080");
+}
+
+}  // namespace
+}  // namespace wp::tv
