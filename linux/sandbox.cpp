@@ -25,6 +25,7 @@ Sandbox enterSandbox() {
 #include <memory>
 #include <sstream>
 #include <string>
+#include <utility>
 
 namespace wp {
 namespace {
@@ -55,7 +56,7 @@ constexpr const char* kAllowed[] = {
     "bind connect getpeername getsockname getsockopt recv recvfrom recvmmsg recvmmsg_time64 recvmsg",
     "send sendmmsg sendmsg sendto setsockopt shutdown socketpair",
     // who and where one is
-    "capget getegid getegid32 geteuid geteuid32 getgid getgid32 getrandom getresgid getresgid32",
+    "capget getcpu getegid getegid32 geteuid geteuid32 getgid getgid32 getrandom getresgid getresgid32",
     "getresuid getresuid32 getrlimit getrusage getuid getuid32 prlimit64 sysinfo ugetrlimit uname",
 };
 
@@ -108,13 +109,18 @@ void addThreads(Rules& rules) {
     rules.add(SCMP_ACT_ALLOW, "clone", SCMP_CMP(kCloneFlags, SCMP_CMP_MASKED_EQ, CLONE_THREAD, CLONE_THREAD));
     // Its flags cannot be looked at; the library falls back on the other.
     rules.add(SCMP_ACT_ERRNO(ENOSYS), "clone3");
-    rules.add(SCMP_ACT_ALLOW, "prctl", SCMP_CMP(0, SCMP_CMP_EQ, PR_SET_NAME));
+    for (const int naming : {PR_SET_NAME, PR_GET_NAME})
+        rules.add(SCMP_ACT_ALLOW, "prctl", SCMP_CMP(0, SCMP_CMP_EQ, static_cast<scmp_datum_t>(naming)));
 }
 
 void addFiles(Rules& rules) {
-    constexpr scmp_datum_t kWriting = O_ACCMODE | O_CREAT | O_TRUNC;
-    rules.allowWithout("openat", 2, kWriting);
-    rules.allowWithout("open", 1, kWriting);
+    // Whoever cannot write has to do without: a library may keep a log because the environment asks for one.
+    constexpr scmp_datum_t kWriting[] = {O_WRONLY, O_RDWR, O_CREAT, O_TRUNC};
+    for (const auto& [name, flags] : {std::pair("openat", 2U), std::pair("open", 1U)}) {
+        rules.allowWithout(name, flags, O_ACCMODE | O_CREAT | O_TRUNC);
+        for (const scmp_datum_t bits : kWriting)
+            rules.add(SCMP_ACT_ERRNO(EACCES), name, SCMP_CMP(flags, SCMP_CMP_MASKED_EQ, bits, bits));
+    }
 }
 
 void addSockets(Rules& rules) {
