@@ -1,6 +1,7 @@
 #include "linux/config.h"
 
 #include <charconv>
+#include <filesystem>
 
 #include "exchange/object_reader.h"
 #include "linux/files/key_value_file.h"
@@ -10,7 +11,7 @@
 namespace wp {
 namespace {
 
-constexpr std::size_t kLongestText = 512, kMostEntries = 256;
+constexpr std::size_t kLongestFile = 1U << 20, kLongestText = 512, kMostEntries = 256;
 
 struct EndpointKey {
     const char* key;
@@ -207,7 +208,7 @@ Config Config::defaults() {
 }
 
 std::optional<Refusal> applyConfig(std::string_view json, Config& config) {
-    const auto read = readJSON(json, {.bytes = std::size_t{1} << 20, .depth = 16});
+    const auto read = readJSON(json, {.bytes = kLongestFile, .depth = 16});
     if (const Refusal* refusal = std::get_if<Refusal>(&read)) return *refusal;
     try {
         Config changed = config;
@@ -233,7 +234,10 @@ std::variant<Config, std::string> loadConfig(const std::vector<std::string>& fil
     if (!named.empty()) all.push_back(named);
     for (const std::string& file : all) {
         const bool isNamed = &file == &all.back() && !named.empty();
-        const auto text = readSmallFile(file, std::size_t{1} << 20);
+        const auto text = readSmallFile(file, kLongestFile);
+        std::error_code unknown;
+        if (!text && std::filesystem::exists(file, unknown))
+            return file + ": is no readable file of at most 1 MiB";
         if (!text && isNamed) return file + ": cannot be read";
         const auto refusal = text ? applyConfig(*text, config) : std::nullopt;
         if (refusal) return file + ": " + refusal->text();

@@ -43,9 +43,10 @@ struct Options {
 std::variant<wp::Config, std::string> readConfig(const std::string& named) {
     const char* const folder = std::getenv("XDG_CONFIG_HOME");
     const char* const home = std::getenv("HOME");
-    const std::string user = folder != nullptr ? folder
-                             : home != nullptr ? std::string(home) + "/.config"
-                                               : "";
+    // An empty or relative folder counts as none.
+    const std::string user = folder != nullptr && *folder == '/' ? folder
+                             : home != nullptr                   ? std::string(home) + "/.config"
+                                                                 : "";
     return wp::loadConfig(wp::configFiles(user), named);
 }
 

@@ -127,5 +127,17 @@ TEST(Config, LaterFilesWinAndOnlyTheNamedOneMustBeThere) {
     std::filesystem::remove_all(folder);
 }
 
+TEST(Config, AFileThatIsThereAndCannotBeTakenIsNotPassedOver) {
+    std::string pattern = ::testing::TempDir() + "/wpXXXXXX";
+    const std::string folder = mkdtemp(pattern.data());
+    std::ofstream(folder + "/long") << std::string((1U << 20) + 1, ' ');
+    std::filesystem::create_directory(folder + "/config.json");
+
+    for (const char* name : {"/long", "/config.json"})
+        EXPECT_EQ(std::get<std::string>(loadConfig({folder + name}, "")),
+                  folder + name + ": is no readable file of at most 1 MiB");
+    std::filesystem::remove_all(folder);
+}
+
 }  // namespace
 }  // namespace wp
