@@ -18,7 +18,7 @@ Error withLoss(const Gathering& g, Error error) {
     const bool denied = error.code == static_cast<int>(Reason::notPermitted);
     if (!denied && error.code != static_cast<int>(Reason::unavailable)) return error;
     error.message += std::string("; without it nobody can tell ") + g.loss;
-    if (denied) g.sources.notes.once(error.message);
+    if (denied) g.sources.notes.once(g.loss, error.message);
     return error;
 }
 

@@ -16,10 +16,14 @@ class Notes {
     void setTeller(Teller teller) { teller_ = std::move(teller); }
 
     /// Tells the text unless it was told before.
-    void once(const std::string& text) {
+    void once(const std::string& text) { once(text, text); }
+
+    /// Tells the text unless something was told about the same subject before: the message bus, for one, puts
+    /// numbers that change into its reasons.
+    void once(const std::string& subject, const std::string& text) {
         {
             const std::lock_guard lock(mutex_);
-            if (!told_.insert(text).second) return;
+            if (!told_.insert(subject).second) return;
         }
         if (teller_) teller_(text);
     }

@@ -210,7 +210,8 @@ Known<ScanReport> Scanner::scanWithoutPermission(RadioSocket& radio, const ScanW
     }
     const std::optional<ScanReport> lately = heardLately(radio, wish, until);
     if (!lately) return report;
-    notes_.once(report.error().message + ": other networks are judged by what the system has heard lately");
+    notes_.once("heard lately",
+                report.error().message + ": other networks are judged by what the system has heard lately");
     return *lately;
 }
 

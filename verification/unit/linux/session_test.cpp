@@ -253,6 +253,18 @@ TEST(Notes, TellEachThingOnce) {
     EXPECT_EQ((std::vector<std::string>{"no permission", "another"}), told);
 }
 
+TEST(Notes, TellOneThingOfASubject) {
+    Notes notes;
+    std::vector<std::string> told;
+    notes.setTeller([&](const std::string& text) { told.push_back(text); });
+
+    notes.once("Bluetooth", "rejected, sender :1.5");
+    notes.once("Bluetooth", "rejected, sender :1.6");
+    notes.once("pings", "rejected, sender :1.6");
+
+    EXPECT_EQ((std::vector<std::string>{"rejected, sender :1.5", "rejected, sender :1.6"}), told);
+}
+
 TEST(StopSignal, EndsAWaitAndStaysRaised) {
     const auto stop = std::make_shared<StopSignal>();
     std::thread other([stop] { stop->raise(); });
