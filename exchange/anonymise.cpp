@@ -23,10 +23,13 @@ bool contains(const std::array<std::string_view, count>& keys, std::string_view 
     return std::find(keys.begin(), keys.end(), key) != keys.end();
 }
 
-/// A portal's page tells whose network it is and, behind its host, which device asks: the scheme alone stays.
+/// A portal's page tells whose network it is and, behind its host, which device asks: the scheme alone stays. (Of a
+/// page without one, what stands before "://" may be all of that.)
 std::string hiddenPage(const std::string& url) {
-    const std::size_t end = url.find("://");
-    return (end == std::string::npos ? "" : url.substr(0, end + 3)) + "portal.example/";
+    const char* const scheme = url.starts_with("https://")  ? "https://"
+                               : url.starts_with("http://") ? "http://"
+                                                            : "";
+    return scheme + std::string("portal.example/");
 }
 
 /// Calls `visit(key, value)` for every entry of the value's dictionaries, at any depth.

@@ -46,6 +46,19 @@ TEST(Anonymise, ReplacesNamesAndAddressesInDetailsButNoOtherWord) {
         R"("NetworkName":"Net 0001"})");
 }
 
+TEST(Anonymise, LeavesNothingOfAPortalsPageButItsScheme) {
+    const auto pageOf = [](const char* url) {
+        Recording recording;
+        recording.answers.emplace_back();
+        const auto info = Dictionary::make({{"Details", Dictionary::make({{"url", url}})}});
+        recording.answers[0].response.results = DiagnosticsTestResults{
+            std::make_shared<DiagnosticsTestResult>(DiagnosticsTestResult{true, false, info})};
+        return jsonText(anonymised(recording).answers[0].response.results->front()->info, JSONStyle::compact);
+    };
+    EXPECT_EQ(pageOf("https://rose.example/a"), R"({"Details":{"url":"https://portal.example/"}})");
+    EXPECT_EQ(pageOf("/rose?room=12&to=http://x"), R"({"Details":{"url":"portal.example/"}})");
+}
+
 TEST(Anonymise, LeavesTheOriginalAlone) {
     Recording original = std::get<Recording>(loadRecording(kFolder + "neighbourhood.json"));
     std::string before = recordingText(original);
