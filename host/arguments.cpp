@@ -87,6 +87,8 @@ const Option<RunOptions> kRunOptions[] = {
      [](RunOptions& o, const std::string&) { o.showEndpoints = true; }},
     {"--screen", Takes::value, "SCREEN", "tv, terminal, headless, none or auto (default)",
      [](RunOptions& o, const std::string& v) { o.screen = screenFrom(v); }},
+    {"--no-closing-page", Takes::nothing, "", "end at once instead of showing the outcome on the screen",
+     [](RunOptions& o, const std::string&) { o.noClosingPage = true; }},
     {"--remote", Takes::value, "SCRIPT", "remote-control keys to press (@FILE: from a file)",
      [](RunOptions& o, const std::string& v) { o.remote = v; }},
     {"--transcript", Takes::value, "FILE", "the snapshots that the script asks for (-: standard output)",

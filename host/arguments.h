@@ -26,6 +26,7 @@ struct RunOptions {
     std::optional<std::chrono::milliseconds> timeout;
     std::optional<std::string> configFile;
     bool showEndpoints = false;
+    bool noClosingPage = false;
     ScreenChoice screen = ScreenChoice::automatic;
     std::optional<std::string> remote;
     std::optional<std::string> transcriptFile;  ///< "-" is standard output

@@ -41,7 +41,7 @@ int plannedTests(const std::optional<std::string>& joined, const std::optional<s
 }
 
 DiagnosticsTestResponse ProgressClient::runTestRequests(const std::vector<DiagnosticsTestRequest>& requests) {
-    for (const DiagnosticsTestRequest& request : requests) show(request);
+    for (const DiagnosticsTestRequest& request : requests) tell(request);
     return client_.runTestRequests(requests);
 }
 
@@ -54,15 +54,18 @@ DiagnosticsStatusResponse ProgressClient::queryStatus() {
     return response;
 }
 
-void ProgressClient::show(const DiagnosticsTestRequest& request) {
+void ProgressClient::tell(const DiagnosticsTestRequest& request) {
     const CatalogueEntry* entry = catalogueEntry(request.testID);
     if (!entry || entry->scope == TestScope::list) return;
-    std::lock_guard lock(mutex_);
-    // The device's tests come first, and their configuration names the selected network where there is one.
-    if (begun_ == 0) planned_ = plannedTests(joined_, networkNameOf(request.configuration));
-    ++begun_;
-    log_.showProgress(std::string(entry->name) + " (" + std::to_string(begun_) + "/" +
-                      std::to_string(std::max(planned_, begun_)) + ")");
+    TestStep step{request.testID, entry->name};
+    {
+        std::lock_guard lock(mutex_);
+        // The device's tests come first, and their configuration names the selected network where there is one.
+        if (begun_ == 0) planned_ = plannedTests(joined_, networkNameOf(request.configuration));
+        step.number = ++begun_;
+        step.count = std::max(planned_, begun_);
+    }
+    observer_(step);
 }
 
 }  // namespace wp::host

@@ -1,10 +1,10 @@
 #pragma once
 
+#include <functional>
 #include <mutex>
 #include <optional>
 #include <string>
 
-#include "host/diagnostics_log.h"
 #include "platform/diagnostics.h"
 
 namespace wp::host {
@@ -14,21 +14,32 @@ namespace wp::host {
 /// *Any*.
 int plannedTests(const std::optional<std::string>& joined, const std::optional<std::string>& selected);
 
-/// Passes every call on, and shows on the log's progress line which test runs as the how-manieth of how many.
-/// *Any* thread.
+/// A test that begins, as the how-manieth of how many.
+struct TestStep {
+    int testID = 0;
+    const char* name = "";  ///< the catalogue's
+    int number = 0;         ///< from 1
+    int count = 0;          ///< never below the number
+};
+
+/// Passes every call on, and tells of each test of the run before it begins. *Any* thread, the observer on the
+/// caller's.
 class ProgressClient final : public DiagnosticsClient {
   public:
-    ProgressClient(DiagnosticsClient& client, DiagnosticsLog& log) : client_(client), log_(log) {}
+    using Observer = std::function<void(const TestStep&)>;
+
+    ProgressClient(DiagnosticsClient& client, Observer observer)
+        : client_(client), observer_(std::move(observer)) {}
 
     DiagnosticsTestResponse runTestRequests(const std::vector<DiagnosticsTestRequest>& requests) override;
     DiagnosticsStatusResponse queryStatus() override;
     void cancelAllRequests() override { client_.cancelAllRequests(); }
 
   private:
-    void show(const DiagnosticsTestRequest& request);
+    void tell(const DiagnosticsTestRequest& request);
 
     DiagnosticsClient& client_;
-    DiagnosticsLog& log_;
+    Observer observer_;
     std::mutex mutex_;
     std::optional<std::string> joined_;
     int begun_ = 0;

@@ -9,6 +9,7 @@
 #include <optional>
 
 #include "host/automation_file.h"
+#include "host/closing_page.h"
 #include "host/configuration.h"
 #include "host/diagnostics_log.h"
 #include "host/exit.h"
@@ -22,7 +23,9 @@
 #include "host/report/journal.h"
 #include "host/report/report.h"
 #include "host/report/text_form.h"
+#include "host/request.h"
 #include "host/result_document.h"
+#include "host/running_page.h"
 #include "host/services.h"
 #include "host/transcript.h"
 #include "platform/activity.h"
@@ -65,9 +68,10 @@ class Run {
                                                                    : BackgroundQueue::Delays::kept),
           services_(makeServices(options, prepared, mainQueue_, log_)),
           journal_(services_->diagnosticsClient()),
-          progress_(journal_, log_),
+          progress_(journal_, [this](const TestStep& step) { onTest(step); }),
           automation_(services_->isAutomated() || options.automationFile, prepared.automation),
           localization_(prepared.locale),
+          texts_(prepared.locale.stringTable),
           screen_([this](std::string_view line) { log_.note(line); }),
           platform_{progress_,
                     services_->wifiManager(),
@@ -97,7 +101,7 @@ class Run {
         setUp();
         std::optional<std::string> obstacle = drive();
         tearDown(obstacle.has_value());
-        return report(obstacle);
+        return conclude(obstacle);
     }
 
     /// The run without its outputs.
@@ -113,15 +117,21 @@ class Run {
 
   private:
     void onInterrupted();
+    void onTest(const TestStep& step);
     void setUp();
     std::optional<std::string> drive();
+    bool isWatched() const { return !options_.remote && frontEnd_ && frontEnd_->takesKeys(); }
+    void showRunningPage();
     bool isBrokenOff() const { return interruption_->exitStatus() || hasLeft_; }
     bool isOver() const { return isBrokenOff() || isFinished_; }
     void tearDown(bool hasObstacle);
-    int report(const std::optional<std::string>& obstacle);
-    void writeOutputs(bool hasResult);
+    int conclude(const std::optional<std::string>& obstacle);
+    void presentResult();
+    void closeScreen();
+    void writeOutputs(bool withResult);
     void writeResult();
     Evidence evidence() const;
+    Report report(const Evidence& found) const;
     std::string outputText() const;
 
     const RunOptions& options_;
@@ -141,10 +151,14 @@ class Run {
     ProgressClient progress_;
     AutomationFile automation_;
     IcuLocalization localization_;
+    Texts texts_;
     ui::Screen screen_;
     Platform platform_;
     std::unique_ptr<Transcript> transcript_;
     std::shared_ptr<DiagnosticViewController> controller_;
+    /// Null but in a run without the list that a viewer watches.
+    std::shared_ptr<RunningPage> runningPage_;
+    std::unique_ptr<ui::FrontEnd> frontEnd_;
 };
 
 void Run::onInterrupted() {
@@ -155,6 +169,13 @@ void Run::onInterrupted() {
         progress_.cancelAllRequests();
     }
     mainQueue_.wake();
+}
+
+/// On the thread that asks for the test.
+void Run::onTest(const TestStep& step) {
+    log_.showProgress(std::string(step.name) + " (" + std::to_string(step.number) + "/" +
+                      std::to_string(step.count) + ")");
+    if (runningPage_) mainQueue_.async([page = runningPage_, step] { page->show(step); });
 }
 
 void Run::setUp() {
@@ -178,18 +199,28 @@ void Run::setUp() {
 
 /// Starts the diagnostic and lets it run to its end. Returns why it cannot come to one.
 std::optional<std::string> Run::drive() {
-    std::unique_ptr<ui::FrontEnd> frontEnd =
-        makeFrontEnd(prepared_.screen, screen_, mainQueue_, localization_, log_);
+    frontEnd_ = makeFrontEnd(prepared_.screen, screen_, mainQueue_, localization_, log_);
     if (prepared_.screen == ScreenChoice::terminal && isatty(STDERR_FILENO)) log_.hold();
+    if (isWatched() && !asksForList(*prepared_.parameters)) showRunningPage();
     isUnderWay_ = true;
     if (!isBrokenOff()) controller_->start();
-    remote::RemoteControl remote({screen_, *frontEnd, mainQueue_, activity_, [this] { return isOver(); },
+    remote::RemoteControl remote({screen_, *frontEnd_, mainQueue_, activity_, [this] { return isOver(); },
                                   [this](std::string_view line) { transcript_->add(line); }});
     return remote.play(prepared_.script);
 }
 
+void Run::showRunningPage() {
+    bool saysWLAN = services_->capabilities().booleanAnswer("wapi");
+    runningPage_ = std::make_shared<RunningPage>(
+        localization_.localizedString(saysWLAN ? "WLAN_DIAGNOSTICS" : "WIFI_DIAGNOSTICS"),
+        localization_.localizedString("PROGRESS_TEXT"), texts_);
+    screen_.setRootViewController(runningPage_);
+}
+
 void Run::tearDown(bool hasObstacle) {
     if (isBrokenOff() || hasObstacle) {
+        // The viewer has the display back before anything is waited for.
+        frontEnd_.reset();
         log_.mute();
         services_->stopRecording();
     }
@@ -197,23 +228,46 @@ void Run::tearDown(bool hasObstacle) {
     // The dictionaries of the result are written to until no block is left that could.
     backgroundQueue_.drain(BackgroundQueue::Delayed::drop);
     mainQueue_.close();
-    log_.release();
     log_.eraseProgress();
 }
 
-int Run::report(const std::optional<std::string>& obstacle) {
+int Run::conclude(const std::optional<std::string>& obstacle) {
     std::optional<int> interrupted = interruption_->exitStatus();
     // Asked once: a run that is interrupted from here on has its result.
     bool hasResult = !interrupted && !hasLeft_ && !obstacle;
-    writeOutputs(hasResult);
+    if (hasResult) {
+        presentResult();
+    } else {
+        closeScreen();
+        writeOutputs(false);
+    }
     if (interrupted) return *interrupted;
     if (hasLeft_) return exit_status::leftByUser;
     if (obstacle) fail(*obstacle);
     return exitStatusOf(controller_->result().statusCode().value_or(1));
 }
 
+/// Files and pipes have the result before the viewer has read the closing page; a terminal shows the page, or
+/// what is printed.
+void Run::presentResult() {
+    bool hasPage = !options_.noClosingPage && isWatched();
+    bool isPrintedLater = hasPage && !prepared_.output && isatty(STDOUT_FILENO);
+    if (!hasPage) closeScreen();
+    writeOutputs(!isPrintedLater);
+    if (hasPage)
+        showClosingPage(std::make_shared<ClosingPage>(report(evidence()), texts_), screen_, *frontEnd_,
+                        kClosingPageTime, [this] { return interruption_->exitStatus().has_value(); });
+    closeScreen();
+    if (isPrintedLater) writeResult();
+}
+
+void Run::closeScreen() {
+    frontEnd_.reset();
+    log_.release();
+}
+
 /// Writes each of the three, whatever becomes of the others; the first that could not be written fails the run.
-void Run::writeOutputs(bool hasResult) {
+void Run::writeOutputs(bool withResult) {
     std::exception_ptr failure;
     auto attempt = [&failure](const std::function<void()>& write) {
         try {
@@ -222,7 +276,7 @@ void Run::writeOutputs(bool hasResult) {
             if (!failure) failure = std::current_exception();
         }
     };
-    if (hasResult) attempt([this] { writeResult(); });
+    if (withResult) attempt([this] { writeResult(); });
     attempt([this] { automation_.write(); });
     attempt([this] { services_->writeRecording(); });
     if (failure) std::rethrow_exception(failure);
@@ -233,14 +287,16 @@ Evidence Run::evidence() const {
     return journal_.evidence(result.statusCode().value_or(0), result.data());
 }
 
+Report Run::report(const Evidence& found) const {
+    return makeReport(found, thresholdsFrom(prepared_.configuration.thresholds), texts_);
+}
+
 std::string Run::outputText() const {
     if (options_.format == OutputFormat::json) return resultDocument(controller_->result());
     Evidence found = evidence();
-    Texts texts(prepared_.locale.stringTable);
     TextForm form;
     if (!prepared_.output && isatty(STDOUT_FILENO)) form.style = TextForm::Style::terminal;
-    Report report = makeReport(found, thresholdsFrom(prepared_.configuration.thresholds), texts);
-    return reportText(report, found, form, texts);
+    return reportText(report(found), found, form, texts_);
 }
 
 void Run::writeResult() {

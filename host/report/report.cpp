@@ -120,7 +120,7 @@ ClosingSummary closingSummary(const Report& report) {
     ClosingSummary closing{report.summary, {}};
     for (const ReportedFinding& finding : report.findings) {
         if (closing.findings.size() == kClosingFindings || finding.severity == Severity::notice) break;
-        closing.findings.push_back(finding.what);
+        closing.findings.push_back(finding);
     }
     return closing;
 }

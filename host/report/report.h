@@ -70,11 +70,11 @@ struct Report {
 /// Makes a report. The same evidence gives the same report. *Any*.
 Report makeReport(const Evidence& evidence, const Thresholds& thresholds, const Texts& texts);
 
-/// For the last screen of a run: the sentence on the whole and the first of the findings, three at most, a
-/// sentence each. What is only worth knowing is left out. *Any*.
+/// For the last screen of a run: the sentence on the whole and the first of the findings, three at most. What is
+/// only worth knowing is left out. *Any*.
 struct ClosingSummary {
     std::string summary;
-    std::vector<std::string> findings;
+    std::vector<ReportedFinding> findings;
 };
 ClosingSummary closingSummary(const Report& report);
 

@@ -19,21 +19,37 @@ std::string refusalOf(const std::vector<std::string>& words) {
 }
 
 TEST(Arguments, EveryOptionOfRunIsTakenOver) {
-    Arguments arguments = parseArguments({"run",         "--max-scan-cache-age",
-                                          "1.5",         "--list",
-                                          "--network",   "Office",
-                                          "--record",    "b.json",
-                                          "--anonymise", "--interface",
-                                          "wlan1",       "--timeout",
-                                          "2.5",         "--config",
-                                          "c.json",      "--screen",
-                                          "headless",    "--remote",
-                                          "down select", "--transcript",
-                                          "t",           "--automation",
-                                          "p.json",      "--locale",
-                                          "de",          "--output=o.json",
-                                          "--format",    "text",
-                                          "--extension", "x.so"});
+    Arguments arguments = parseArguments({"run",
+                                          "--max-scan-cache-age",
+                                          "1.5",
+                                          "--list",
+                                          "--network",
+                                          "Office",
+                                          "--record",
+                                          "b.json",
+                                          "--anonymise",
+                                          "--interface",
+                                          "wlan1",
+                                          "--timeout",
+                                          "2.5",
+                                          "--config",
+                                          "c.json",
+                                          "--screen",
+                                          "headless",
+                                          "--remote",
+                                          "down select",
+                                          "--transcript",
+                                          "t",
+                                          "--automation",
+                                          "p.json",
+                                          "--locale",
+                                          "de",
+                                          "--output=o.json",
+                                          "--format",
+                                          "text",
+                                          "--extension",
+                                          "x.so",
+                                          "--no-closing-page"});
 
     const RunOptions& run = arguments.run;
     EXPECT_EQ(arguments.command, Command::run);
@@ -53,6 +69,7 @@ TEST(Arguments, EveryOptionOfRunIsTakenOver) {
     EXPECT_EQ(run.outputFile, "o.json");
     EXPECT_EQ(run.format, OutputFormat::text);
     EXPECT_EQ(run.extension, "x.so");
+    EXPECT_TRUE(run.noClosingPage);
 }
 
 TEST(Arguments, ARecordingAndTheEndpointsAreAskedForAlone) {
@@ -66,6 +83,7 @@ TEST(Arguments, ARunWithoutOptionsIsLiveWithoutAListAndWritesJSON) {
     EXPECT_EQ(arguments.run.replayFile, std::nullopt);
     EXPECT_EQ(arguments.run.requestFile, std::nullopt);
     EXPECT_FALSE(arguments.run.list);
+    EXPECT_FALSE(arguments.run.noClosingPage);
     EXPECT_EQ(arguments.run.screen, ScreenChoice::automatic);
     EXPECT_EQ(arguments.run.format, OutputFormat::json);
 }

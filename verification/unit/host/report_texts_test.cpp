@@ -122,7 +122,7 @@ TEST(ReportTexts, ARuleNamesExactlyTheThresholdsThatTheServiceGoesBy) {
 }
 
 TEST(ReportTexts, EveryKeyIsUsed) {
-    std::string sources = sourcesOf(WP_SOURCE_DIR "/host/report");
+    std::string sources = sourcesOf(WP_SOURCE_DIR "/host");
     for (const std::string& key : keysOf(reportTable("en"))) {
         if (isOfATest(key)) continue;
         // The words of a cause or a reason, and the plural forms, are put together from a prefix.

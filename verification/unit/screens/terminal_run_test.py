@@ -31,10 +31,15 @@ def recording(**keys):
                         {"test": 19, "didPass": True, "delayMs": 3600000}], **keys}
 
 
+# A joined network that works and has a weak signal; every test is answered at once.
+QUICK = {**recording(), "answers": [
+    {"test": test, "didPass": True, "result": True} for test in [6, 9, 11, 32]]}
+
+
 class TerminalRun(unittest.TestCase):
-    def start(self, answers=None, options="", script=WRAPPED, **more):
+    def start(self, answers=None, options="--list", script=WRAPPED, output="> result", **more):
         terminal = Terminal("while [ ! -e go ]; do sleep 0.01; done; " + script.format(
-            program=f"{shlex.quote(PROGRAM)} run --list --locale en_GB --replay recording {options} > result"), **more)
+            program=f"{shlex.quote(PROGRAM)} run --locale en_GB --replay recording {options} {output}"), **more)
         self.addCleanup(terminal.close)
         terminal.path("recording").write_text(json.dumps(answers or recording()))
         terminal.path("go").touch()
@@ -69,9 +74,12 @@ class TerminalRun(unittest.TestCase):
         terminal.press("Enter")
         terminal.waitFor("▸[ Yes ]")
         terminal.press("Enter")
+        terminal.waitFor("The test is finished")
+        # Whoever reads the result does not wait for the viewer.
+        self.assertEqual(json.loads(terminal.waitForFile("result"))["statusCode"], 0)
+        terminal.press("Enter")
         self.assertEqual(terminal.waitForFile("status"), "0")
         self.assertRestored(terminal)
-        self.assertEqual(json.loads(terminal.path("result").read_text())["statusCode"], 0)
         self.assertIn("error[3] [ERROR] - Wi-Fi Profile: Poor Signal failed", terminal.picture())
 
     def testTestsAHiddenNetworkByItsTypedName(self):
@@ -98,6 +106,8 @@ class TerminalRun(unittest.TestCase):
 
     def testSaysThatTheWiFiWentOffByItsStatus(self):
         terminal = self.start(recording(events=[{"afterMs": 50, "power": False}]))
+        terminal.waitFor("The test is finished")
+        terminal.press("Escape")
         self.assertEqual(terminal.waitForFile("status"), "15")
         self.assertRestored(terminal)
 
@@ -121,7 +131,7 @@ class TerminalRun(unittest.TestCase):
         self.assertRestored(terminal)
 
     def testPlaysAScriptOnTheTerminalAndLeavesTheRestToTheViewer(self):
-        terminal = self.start(options="--remote 'wait down screen' --transcript lines")
+        terminal = self.start(options="--list --remote 'wait down screen' --transcript lines")
         terminal.waitFor("▸ \\x1B]0")
         terminal.press("Up")
         terminal.waitFor("▸ Northlight")
@@ -129,9 +139,55 @@ class TerminalRun(unittest.TestCase):
         terminal.press("Escape")
         self.assertEqual(terminal.waitForFile("status"), "3")
 
+    def testShowsTheOutcomeUntilItIsClosed(self):
+        for key in ["Enter", "Escape"]:
+            with self.subTest(key=key):
+                terminal = self.start(QUICK, "--screen terminal")
+                picture = terminal.waitFor("The test is finished")
+                self.assertIn("works, but one thing makes it slow", picture)
+                self.assertIn("Problem: Network “Northlight”", picture)
+                self.assertIn("The signal is weak.", picture)
+                self.assertIn("Close with OK or Back, or wait 60 seconds.", picture)
+                terminal.press("Down", "Up", key)
+                self.assertEqual(terminal.waitForFile("status"), "0")
+                self.assertRestored(terminal)
+
+    def testPrintsTheResultOnTheTerminalWhenThePageIsClosed(self):
+        terminal = self.start(QUICK, "--screen terminal --format text --record copy", output="")
+        terminal.waitFor("The test is finished")
+        self.assertTrue(terminal.path("copy").exists())
+        terminal.press("Enter")
+        self.assertEqual(terminal.waitForFile("status"), "0")
+        self.assertIn("The signal is weak.", terminal.waitFor("finished"))
+
+    def testKeepsTheResultThatASignalFindsOnTheClosingPage(self):
+        terminal = self.start(QUICK, "--screen terminal", output="")
+        terminal.waitFor("The test is finished")
+        os.kill(terminal.child(), signal.SIGTERM)
+        self.assertEqual(terminal.waitForFile("status"), "0")
+        self.assertRestored(terminal)
+        self.assertIn('"statusCode":0', terminal.picture("-S", "-200").replace(" ", "").replace("\n", ""))
+
+    def testShowsNoClosingPageWithAScriptOrWhereItIsNotWanted(self):
+        for options in ["--no-closing-page", "--remote wait"]:
+            with self.subTest(options=options):
+                terminal = self.start(QUICK, "--screen terminal " + options)
+                self.assertEqual(terminal.waitForFile("status"), "0")
+                self.assertRestored(terminal)
+
+    def testSaysWithoutTheListWhichTestIsRunning(self):
+        terminal = self.start(options="--screen terminal")
+        picture = terminal.waitFor("Bluetooth devices connected (6 of 40)")
+        self.assertIn("Testing the Wi-Fi connection.", picture)
+        self.assertIn("13 %", picture)
+        self.assertNotIn("Choose", picture)
+        terminal.press("Escape")
+        self.assertEqual(terminal.waitForFile("status"), "3")
+        self.assertRestored(terminal)
+
     def testRefusesATerminalThatCannotDrawIt(self):
         terminal = self.start(script="{program} 2> message; echo $? > status; exec sleep 1000",
-                              environment={"TERM": "dumb"}, options="--screen terminal")
+                              environment={"TERM": "dumb"}, options="--list --screen terminal")
         self.assertEqual(terminal.waitForFile("status"), "2")
         message = terminal.path("message").read_text()
         self.assertEqual(message.count("\n"), 1)
