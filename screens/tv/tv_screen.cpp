@@ -62,6 +62,8 @@ class TvScreen::Loop : private ui::ScreenObserver {
             window_.resize(*size);
             window_.show();
         } else {
+            // Without a window manager nobody else makes it as large as the screen.
+            if (QScreen* screen = window_.screen()) window_.setGeometry(screen->geometry());
             window_.showFullScreen();
         }
         window_.setCursor(Qt::BlankCursor);

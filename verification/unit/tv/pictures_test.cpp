@@ -3,6 +3,9 @@
 
 #include <gtest/gtest.h>
 
+#include <QGuiApplication>
+#include <QKeyEvent>
+#include <QWindow>
 #include <cstdlib>
 #include <filesystem>
 
@@ -218,6 +221,34 @@ TEST_F(Pictures, NamesOfAllKinds) {
               {std::string("\xff\xfe\x41"), "9"}});
 
     expectPicture("names");
+}
+
+TEST_F(Pictures, KeysThatReachTheWindowWorkTheScreen) {
+    open();
+    showList(neighbourhood(4));
+    QWindow* window = QGuiApplication::topLevelWindows().front();
+    auto press = [&](Qt::Key key, const QString& text = {}) {
+        QKeyEvent event(QEvent::KeyPress, key, Qt::NoModifier, text);
+        QCoreApplication::sendEvent(window, &event);
+    };
+
+    for (int i = 0; i < 5; ++i) press(Qt::Key_Down);
+    press(Qt::Key_Select);
+    EXPECT_EQ(
+        run.alert(),
+        "- | Enter the name of the network to test. Capital and small letters matter. | [] | Cancel, ~Done");
+    for (int i = 0; i < 3; ++i) press(Qt::Key_Right);
+    press(Qt::Key_Return);
+    press(Qt::Key_A, QStringLiteral("ä"));
+    EXPECT_EQ(run.device.screen.alert()->textFields().front()->text(), "rä");
+
+    press(Qt::Key_Return);
+
+    EXPECT_EQ(run.selected(), "rä");
+    press(Qt::Key_Select);
+    EXPECT_NE(run.device.screen.alert(), nullptr);
+    press(Qt::Key_Back);
+    EXPECT_EQ(run.device.screen.alert(), nullptr);
 }
 
 TEST_F(Pictures, InFullSize) {
