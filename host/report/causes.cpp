@@ -42,12 +42,14 @@ bool isDead(const View& view) {
     return view.no(3) && !view.yes(7) && !view.reachesOutside() && (view.no(6) || view.no(7) || view.no(9));
 }
 
-bool hasNoInternet(const View& view) {
-    return view.no(6) && !view.no(3) && !view.yes(9) && !view.yes(11) && (!view.yes(7) || view.no(9));
-}
-
+/// A certificate that does not hold came from beyond the router all the same.
 bool hasBadCertificate(const View& view) {
     return view.no(9) && textIn(detailsOf(view.evidence, Part::joined, 9), "end") == "badCertificate";
+}
+
+bool hasNoInternet(const View& view) {
+    bool isSilent = view.no(6) && !view.no(3) && !view.yes(9) && !view.yes(11);
+    return isSilent && (!view.yes(7) || view.no(9)) && !hasBadCertificate(view);
 }
 
 /// A certificate is told to be out of its time on a device whose clock is off by more than a day.
@@ -87,9 +89,14 @@ bool hasNoInterface(const View& view) {
     return endedWith(view, -3) || failedWith(view, Part::device, kNoInterface, {14, 15, 16});
 }
 
-/// The network was there when the run began, and gone when its tests came.
+/// The network was there when the run began, and gone when its tests came. A result alone then holds what a scan
+/// tells of the surroundings and nothing of the network.
 bool isLost(const View& view) {
-    return failedWith(view, Part::joined, kNotJoined, {34, 38, 12});
+    if (view.evidence.hasAnswers) return failedWith(view, Part::joined, kNotJoined, {34, 38, 12});
+    bool isUnderway = view.evidence.statusCode == 0 && view.isJoined() && !view.evidence.joinedName;
+    return isUnderway && std::ranges::none_of(std::initializer_list<int>{34, 38, 12, 9, 31}, [&](int testID) {
+               return view.yes(testID) || view.no(testID);
+           });
 }
 
 /// None of the first tests of the selected network found it in the scan.
@@ -121,7 +128,7 @@ const CauseRow kOutages[] = {
       {8, 35, 38, 39, 40, 41, 42, 43, 44, 46, 45, 36, 37, 33, 3, 6, 12, 13, 7, 9, 11, 24, 25, 26, 27, 28, 32, 30}}, isLost},
     {{"NO_ADDRESS", "NO_ADDRESS_WHOLE", 12, joined, broken, routerOwner, {13, 3, 6, 7, 9, 11, 46, 8}}, hasNoAddress},
     {{"T46",        "PORTAL_WHOLE",     46, joined, broken, viewer, {6, 7, 9, 11}},
-     [](const View& v) { return v.yes(46) && !(v.yes(9) && v.yes(11)); }},
+     [](const View& v) { return v.yes(46); }},
     {{"DEAD_LINK",   "DEAD_LINK_WHOLE",    3, joined, broken, routerOwner, {6, 7, 9, 11, 46, 8}}, isDead},
     {{"NO_INTERNET", "NO_INTERNET_WHOLE",  6, joined, broken, provider, {7, 9, 11, 46, 8}}, hasNoInternet},
     {{"T7",          "NO_NAMES_WHOLE",     7, joined, broken, routerOwner, {9, 11, 46}}, [](const View& v) { return v.no(7); }},
@@ -136,7 +143,8 @@ const CauseRow kOthers[] = {
     {{"PARTIAL", nullptr, 46, joined, problem, routerOwner, {}}, isPartial},
     {{"ROUTER_SILENT", nullptr, 3, joined, notice, nobody, {}},
      [](const View& v) { return v.no(3) && (v.yes(7) || v.reachesOutside()); }},
-    {{"OUTSIDE_SILENT", nullptr, 6, joined, notice, nobody, {}}, [](const View& v) { return v.no(6) && (v.yes(9) || v.yes(11)); }},
+    {{"OUTSIDE_SILENT", nullptr, 6, joined, notice, nobody, {}},
+     [](const View& v) { return v.no(6) && (v.yes(9) || v.yes(11) || hasBadCertificate(v)); }},
     {{"T12", nullptr, 12, joined, notice, nobody, {}}, [](const View& v) { return v.no(12) && v.yes(13) && (v.yes(7) || v.reachesOutside()); }},
     {{"T25", nullptr, 25, joined, problem, routerOwner, {24}},
      [](const View& v) { return v.yes(25) && isWhereBandIsFull(v, 1, kHighest2GHzChannel); }},

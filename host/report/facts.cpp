@@ -124,13 +124,20 @@ void Collector::addChannel() {
                                     {{"channel", texts_.number(*channel, 0)}, {"band", texts_.text(band)}}));
 }
 
+/// An average in ms; none is said to be nothing.
+std::string echoTime(double time, const Texts& texts) {
+    constexpr double kShortest = 0.1;
+    if (time < kShortest) return "<" + texts.number(kShortest, 1);
+    return texts.number(time, time < 10 ? 1 : 0);
+}
+
 void Collector::addPing(const char* label, const char* key) {
     DictionaryPointer ping = dictionaryIn(section_, key);
     std::optional<double> time = numberIn(ping, "avg"), loss = numberIn(ping, "packetLoss"),
                           count = numberIn(ping, "count");
     if (!time || !loss || !count) return;
     const char* word = latencyWord(*time, kEchoLatency);
-    add(label, texts_.text("FACT_PING_VALUE", {{"time", texts_.number(*time, *time < 10 ? 1 : 0)},
+    add(label, texts_.text("FACT_PING_VALUE", {{"time", echoTime(*time, texts_)},
                                                {"word", texts_.text(word)},
                                                {"lost", texts_.number(*loss * *count, 0)},
                                                {"count", texts_.number(*count, 0)}}));

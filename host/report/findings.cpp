@@ -8,6 +8,7 @@ namespace wp::host {
 namespace {
 
 constexpr int kHighest2GHzChannel = 14;
+constexpr std::size_t kMostNamed = 10;  // tests in one sentence
 
 /// Of findings that are equally severe, those that people feel most come first.
 constexpr int kFeltMost[] = {46, 31, 12, 3, 6, 7, 9, 11, 32, 24, 25, 26, 22, 39, 38, 40, 36, 37, 41};
@@ -63,8 +64,8 @@ std::vector<std::string> followersOf(const ReportInput& input, const Cause& caus
         if (check.isFinding()) found.push_back(input.texts.text(testKey(check.test->testID, "FOUND")));
         if (check.isUntold()) untestable.push_back(input.texts.text(testKey(check.test->testID, "NAME")));
     }
-    // What was not heard at all need not be told test by test.
-    if (!untestable.empty() && untestable.size() < cause.follow.size())
+    // Where nearly nothing could be tested the cause says so itself, not test by test.
+    if (!untestable.empty() && untestable.size() < cause.follow.size() && untestable.size() <= kMostNamed)
         found.push_back(input.texts.text("NOT_TESTABLE", {{"tests", input.texts.list(untestable)}}));
     return found;
 }

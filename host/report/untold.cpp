@@ -11,9 +11,16 @@ constexpr const char* kReasons[] = {
     "NOT_STATED",    "NO_INTERFACE", "NOT_JOINED", "NOT_FOUND",     "UNAVAILABLE", "UNSUPPORTED",
     "NOT_PERMITTED", "TIMEOUT",      "CANCELLED",  "CONFIGURATION", "MALFORMED",
 };
-constexpr int kNoRecordedAnswer = -1;
+constexpr int kNoRecordedAnswer = -1, kNotFound = 3;
+
+/// A network that is not joined shows no sign-in page: nothing went wrong.
+bool isToldOnceJoined(const Check& check) {
+    bool isUnknown = !check.answer || (check.answer->error && check.answer->error->code == kNotFound);
+    return check.part == Part::selected && check.test->testID == 46 && isUnknown;
+}
 
 std::string reasonKey(const Check& check, bool hasAnswers) {
+    if (isToldOnceJoined(check)) return "AFTER_JOINING";
     if (!check.answer) return hasAnswers ? "NOT_RECORDED" : "NOT_STATED";
     int code = check.answer->error ? check.answer->error->code : 0;
     if (code == kNoRecordedAnswer) return "NOT_RECORDED";

@@ -29,6 +29,18 @@ icu::UnicodeString unicode(std::string_view text) {
         icu::StringPiece(text.data(), static_cast<std::int32_t>(text.size())));
 }
 
+/// Whether the text breaks at this place between a number and its unit, which belong on one line.
+bool partsUnit(const icu::UnicodeString& text, std::int32_t at) {
+    if (at < 2 || text[at - 1] != u' ' || !u_isdigit(text[at - 2])) return false;
+    for (const char16_t* unit : {u"dBm", u"dB", u"MHz", u"GHz", u"Mb/s", u"ms", u"s", u"%"}) {
+        icu::UnicodeString word(unit);
+        std::int32_t end = at + word.length();
+        if (text.compare(at, word.length(), word) == 0 && (end >= text.length() || !u_isalnum(text[end])))
+            return true;
+    }
+    return false;
+}
+
 /// The lines of one text while pieces are added that must not be broken.
 class LineMaker {
   public:
@@ -90,8 +102,11 @@ std::vector<std::string> wrappedLines(std::string_view text, int columns) {
     }
     breaks->setText(whole);
     std::int32_t from = breaks->first();
-    for (std::int32_t to = breaks->next(); to != icu::BreakIterator::DONE; from = to, to = breaks->next())
+    for (std::int32_t to = breaks->next(); to != icu::BreakIterator::DONE; to = breaks->next()) {
+        if (partsUnit(whole, to)) continue;
         lines.add(whole.tempSubString(from, to - from));
+        from = to;
+    }
     return lines.finished();
 }
 

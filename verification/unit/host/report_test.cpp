@@ -163,6 +163,63 @@ TEST(Report, AWrongClockIsToldApartFromATroubledService) {
     EXPECT_EQ(whatOf(report), std::vector<std::string>{"This device's clock is wrong."});
 }
 
+TEST(Report, ACertificateOutOfItsTimeBlamesTheClockOnlyWhereItIsKnownToBeOff) {
+    auto summaryWith = [](std::optional<int> offset, const char* fault) {
+        Evidence evidence =
+            withJoined({{"pingedWAN", false}, {"reachedVantor", false}, {"retrievedVantor", false}});
+        DictionaryPointer details =
+            Dictionary::make({{"end", "badCertificate"}, {"certificateFault", fault}});
+        if (offset) details->setValue("clockOffset", *offset);
+        evidence.hasAnswers = true;
+        evidence.answers.push_back(Answer{9, {}, false, Dictionary::make({{"Details", details}}), {}});
+        return reportOn(evidence).summary;
+    };
+    const std::string clock = "This device's clock is wrong, so secure connections fail.";
+    const std::string tampered = "Secure connections through the network “Home” are tampered with or fail.";
+
+    EXPECT_EQ(summaryWith(-90000, "notYetValid"), clock);
+    EXPECT_EQ(summaryWith(90000, "expired"), clock);
+    EXPECT_EQ(summaryWith(60, "expired"), tampered);
+    EXPECT_EQ(summaryWith({}, "notYetValid"), tampered);
+    EXPECT_EQ(summaryWith(-90000, "unknownIssuer"), tampered);
+}
+
+TEST(Report, ASignInPageIsNeverSaidToBeANetworkThatWorks) {
+    EXPECT_EQ(reportOn(withJoined({{"isCaptive", true}})).summary,
+              "A sign-in page stands between the network “Home” and the Internet.");
+}
+
+TEST(Report, AResultAloneTellsThatTheNetworkWasLost) {
+    DictionaryPointer surroundings = Dictionary::make({{"2GHzChannel", 1}, {"is2GHzCongested", false}});
+    DictionaryPointer data = Dictionary::make({{"device", Dictionary::make()},
+                                               {"currentNetwork", surroundings},
+                                               {"selectedNetwork", Dictionary::make()}});
+
+    Report report = reportOn(evidenceFrom(0, data));
+
+    EXPECT_EQ(report.summary, "The connection to the network was lost during the tests.");
+    EXPECT_TRUE(report.untold.empty());
+    ASSERT_EQ(report.findings.size(), 1u);
+    EXPECT_TRUE(report.findings[0].follows.empty());
+}
+
+TEST(Report, TheSignInPageOfANetworkThatIsNotJoinedIsNothingThatWentWrong) {
+    Report report = reportOn(withJoined({}, {{"networkName", "Office"}, {"isUsingWEPSecurity", false}}));
+
+    auto found = std::ranges::find(
+        report.untold, "Whether there is one shows only once the network is joined.", &Untold::reason);
+    ASSERT_NE(found, report.untold.end());
+    EXPECT_EQ(found->tests, std::vector<std::string>{"Sign-in page (Selected network “Office”)"});
+}
+
+TEST(Report, NoAnswerIsSaidToTakeNoTime) {
+    DictionaryPointer ping = Dictionary::make({{"avg", 0.04}, {"packetLoss", 0.0}, {"count", 5}});
+    Report report = reportOn(withJoined({{"pingLANResult", ping}}));
+
+    ASSERT_FALSE(report.facts.empty());
+    EXPECT_EQ(report.facts[0].value, "answers in <0.1 ms (quick), 0 of 5 requests lost");
+}
+
 TEST(Report, ASilentHostBesideOneThatAnswersAlarmsNobody) {
     Report report = reportOn(withJoined({{"pingedLAN", false}, {"pingedWAN", false}}));
 
@@ -362,6 +419,8 @@ TEST(Wrapping, LinesBreakWhereTheLanguageAllowsIt) {
     EXPECT_EQ(wrappedLines("電波が弱いです。", 8), (std::vector<std::string>{"電波が弱", "いです。"}));
     EXPECT_EQ(wrappedLines("abcdefgh ij", 4), (std::vector<std::string>{"abcd", "efgh", "ij"}));
     EXPECT_TRUE(wrappedLines("", 8).empty());
+    EXPECT_EQ(wrappedLines("at -85 dBm", 7), (std::vector<std::string>{"at", "-85 dBm"}));
+    EXPECT_EQ(wrappedLines("uses 5 sheets", 7), (std::vector<std::string>{"uses 5", "sheets"}));
     EXPECT_EQ(columnsOf("é電"), 3);
 }
 
