@@ -1,5 +1,6 @@
 #include "screens/tv/stage.h"
 
+#include <QAccessible>
 #include <cmath>
 
 #include "platform/ui/controls.h"
@@ -140,6 +141,12 @@ void Stage::takeOver(ui::Screen& screen, const QString& composed) {
     alert.isShown = false;
     if (auto shown = screen.alert()) alert = lookOf(*shown, composed);
     set(alert_, std::move(alert), &Stage::alertChanged);
+}
+
+void Stage::tellFocus(QQuickItem* item) {
+    if (!item) return;
+    QAccessibleEvent event(item, QAccessible::Focus);
+    QAccessible::updateAccessibility(&event);
 }
 
 void Stage::takeTable(const ui::Screen& screen) {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QObject>
+#include <QQuickItem>
 
 #include "platform/ui/screen.h"
 #include "screens/tv/looks.h"
@@ -41,6 +42,8 @@ class Stage final : public QObject {
     static void givePictureSize(ui::Screen& screen);
     /// Takes over everything else, as the layout left it. The text is what an input method is composing.
     void takeOver(ui::Screen& screen, const QString& composed);
+    /// Tells a screen reader that this part of the scene has the focus now; the toolkit's own focus never moves.
+    Q_INVOKABLE static void tellFocus(QQuickItem* item);
     void takeKeyboard(QVariantList keys) { set(keyboard_, std::move(keys), &Stage::keyboardChanged); }
 
   signals:

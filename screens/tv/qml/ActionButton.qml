@@ -11,6 +11,7 @@ Item {
     readonly property bool isMoving: focusLook.opacity !== wantedFocus
 
     height: 72 * u
+    onWantedFocusChanged: if (wantedFocus) Qt.callLater(stage.tellFocus, button)
 
     Rectangle {
         x: 12 * button.u
@@ -51,7 +52,10 @@ Item {
     }
 
     Accessible.role: Accessible.Button
+    Accessible.ignored: !stage.alert.isShown
     Accessible.name: look ? look.title : ""
     Accessible.focusable: true
+    // What the select key works on; the toolkit passes no state for disabled ones.
+    Accessible.selectable: look ? look.isEnabled : false
     Accessible.focused: look ? look.isFocused : false
 }

@@ -8,6 +8,11 @@ Rectangle {
     readonly property real u: stage.unit
     required property var look
 
+    // While a key of the keyboard on the screen has the focus, a screen reader follows that one.
+    readonly property bool isRead: look.isFieldFocused && !stage.keyboard.some(key => key.isFocused)
+
+    onIsReadChanged: if (isRead) Qt.callLater(stage.tellFocus, field)
+
     height: 76 * u
     radius: 12 * u
     color: "#f1f3f7"
@@ -64,6 +69,6 @@ Rectangle {
     Accessible.description: look.text
     Accessible.editable: true
     Accessible.focusable: true
-    Accessible.focused: look.isFieldFocused
+    Accessible.focused: isRead
     Accessible.ignored: !visible
 }

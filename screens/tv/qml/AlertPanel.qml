@@ -75,7 +75,9 @@ Rectangle {
                 height: 5 * alert.capHeight
                 visible: alert.look.hasField
 
+                // The keyboard is named by what is typed with it.
                 Accessible.role: Accessible.Grouping
+                Accessible.name: alert.look.placeholder
                 Accessible.ignored: !visible
 
                 Repeater {

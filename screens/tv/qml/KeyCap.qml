@@ -12,6 +12,7 @@ Item {
     readonly property bool isMoving: focusLook.opacity !== wantedFocus
 
     z: wantedFocus
+    onWantedFocusChanged: if (wantedFocus) Qt.callLater(stage.tellFocus, cap)
 
     Rectangle {
         anchors.fill: parent
@@ -49,7 +50,10 @@ Item {
     }
 
     Accessible.role: Accessible.Button
+    Accessible.ignored: !stage.alert.isShown
     Accessible.name: look ? look.name : ""
     Accessible.focusable: true
+    // What the select key works on; the toolkit passes no state for disabled ones.
+    Accessible.selectable: look ? look.isEnabled : false
     Accessible.focused: wantedFocus === 1
 }

@@ -26,6 +26,7 @@ Item {
     height: u * lineHeight
     opacity: wantedOpacity
     z: isFocused ? 1 : isLeaving ? -1 : 0
+    onIsFocusedChanged: if (isFocused) Qt.callLater(stage.tellFocus, line)
 
     Behavior on opacity {
         enabled: line.stage.hasMotion
@@ -36,7 +37,10 @@ Item {
         NumberAnimation { duration: 200; easing.type: Easing.OutCubic }
     }
     onOpacityChanged: if (isLeaving && opacity === 0) stage.lines.release(lineId)
-    Component.onCompleted: isThere = true
+    Component.onCompleted: {
+        isThere = true
+        if (isFocused) Qt.callLater(stage.tellFocus, line)
+    }
 
     // The ground of a row; the rows of a group stand closer to each other than to the next group.
     Rectangle {
