@@ -110,4 +110,12 @@ std::vector<std::string> wrappedLines(std::string_view text, int columns) {
     return lines.finished();
 }
 
+std::string withUnitsKept(std::string_view text) {
+    icu::UnicodeString kept = unicode(text);
+    for (std::int32_t at = 1; at < kept.length(); ++at)
+        if (partsUnit(kept, at)) kept.setCharAt(at - 1, u'\u00A0');
+    std::string out;
+    return kept.toUTF8String(out);
+}
+
 }  // namespace wp::host

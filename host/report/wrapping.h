@@ -13,4 +13,7 @@ int columnsOf(std::string_view text);
 /// anywhere. Blanks at the ends of lines are left out; an empty text gives no line. *Any*.
 std::vector<std::string> wrappedLines(std::string_view text, int columns);
 
+/// The text with no-break blanks between numbers and their units, for what is broken into lines elsewhere. *Any*.
+std::string withUnitsKept(std::string_view text);
+
 }  // namespace wp::host

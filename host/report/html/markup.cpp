@@ -1,5 +1,6 @@
 #include "host/report/html/markup.h"
 
+#include "host/report/wrapping.h"
 #include "platform/ui/display_text.h"
 
 namespace wp::host {
@@ -55,7 +56,7 @@ void Markup::close() {
 }
 
 void Markup::text(std::string_view text) {
-    out_ += escaped(text);
+    out_ += withUnitsKept(escaped(text));
 }
 
 void Markup::element(std::string_view name, std::string_view content, const Attributes& attributes) {

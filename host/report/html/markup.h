@@ -9,7 +9,7 @@ namespace wp::host {
 
 /// Writes HTML that is well-formed XML too. Every text and every attribute's value passes through here: it is put
 /// into its display form (`platform/ui/display_text.h`), so that no character hides, reorders or commands, and what
-/// HTML would read as markup is escaped. Not for several threads at once.
+/// HTML would read as markup is escaped. A text's numbers stay beside their units. Not for several threads at once.
 class Markup {
   public:
     using Attributes = std::vector<std::pair<std::string_view, std::string>>;

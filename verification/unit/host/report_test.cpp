@@ -421,6 +421,7 @@ TEST(Wrapping, LinesBreakWhereTheLanguageAllowsIt) {
     EXPECT_TRUE(wrappedLines("", 8).empty());
     EXPECT_EQ(wrappedLines("at -85 dBm", 7), (std::vector<std::string>{"at", "-85 dBm"}));
     EXPECT_EQ(wrappedLines("uses 5 sheets", 7), (std::vector<std::string>{"uses 5", "sheets"}));
+    EXPECT_EQ(withUnitsKept("2.4 GHz, 5 sheets"), "2.4\u00A0GHz, 5 sheets");
     EXPECT_EQ(columnsOf("é電"), 3);
 }
 
