@@ -66,30 +66,40 @@ Servers effectiveServers(Known<Bus>& bus, const Link& link, const Servers& ofMan
     return servers;
 }
 
-Known<std::string> methodOf(const BusValue& settings, const char* family) {
-    const std::string method = settings[family]["method"].text();
+Known<std::string> methodOf(const Known<BusValue>& settings, const char* family) {
+    if (!settings) return settings.error();
+    const std::string method = (*settings)[family]["method"].text();
     if (!method.empty()) return method;
-    return failure(Reason::notJoined, "NetworkManager has no active connection on the interface");
+    return failure(Reason::unavailable, std::string("NetworkManager tells no method of ") + family);
 }
 
-LinkSetup setupFromNetworkManager(Known<Bus>& bus, const Link& link, const NetworkManagerLink& managed,
-                                  const Until& until) {
-    LinkSetup setup;
-    setup.methods = {methodOf(managed.settings, "ipv4"), methodOf(managed.settings, "ipv6")};
+Known<NameServers> managedNameServers(Known<Bus>& bus, const Link& link, const NetworkManagerLink& managed,
+                                      const Until& until) {
+    if (!managed.settings) return managed.settings.error();
+    const auto global = networkManagerGlobalServers(*bus, until);
+    if (!global) return global.error();
     NameServers names;
-    names.manual = manualServers(managed.settings);
-    add(names.manual, networkManagerGlobalServers(*bus, until));
-    names.offerKnown = true;
+    names.manual = manualServers(*managed.settings);
+    add(names.manual, *global);
     names.offered = fromWords(optionOf(managed.lease4, "domain_name_servers"));
     add(names.offered, fromWords(optionOf(managed.lease6, "dhcp6_name_servers")));
     // What stands in the settings of IPv6 and was not entered came with a router's advertisement.
     for (const IPAddress& each : without(managed.servers, names.manual))
         if (!each.isIPv4()) names.offered.push_back(each);
     // Another interface's servers are no setting of this one.
-    names.effective = without(effectiveServers(bus, link, managed.servers, until),
-                              networkManagerServersElsewhere(*bus, link.interfaceName, until));
+    const auto elsewhere = networkManagerServersElsewhere(*bus, link.interfaceName, until);
+    names.effective =
+        without(effectiveServers(bus, link, managed.servers, until), elsewhere ? *elsewhere : Servers());
+    names.offerKnown = managed.offerRead && elsewhere;
+    return names;
+}
+
+LinkSetup setupFromNetworkManager(Known<Bus>& bus, const Link& link, const NetworkManagerLink& managed,
+                                  const Until& until) {
+    LinkSetup setup;
+    setup.methods = {methodOf(managed.settings, "ipv4"), methodOf(managed.settings, "ipv6")};
     setup.servers = managed.servers;
-    setup.nameServers = std::move(names);
+    setup.nameServers = managedNameServers(bus, link, managed, until);
     setup.portalApi = portalApiIn(managed.lease4);
     if (setup.portalApi.empty()) setup.portalApi = portalApiIn(managed.lease6);
     setup.leaseText = plainText(optionOf(managed.lease4, "vendor_encapsulated_options") + " " +
@@ -167,15 +177,21 @@ Known<LinkSetup> setupFromKernel(Known<Bus>& bus, const Link& link, const Until&
     return setup;
 }
 
-WebProxyPlaces allProxies(const BusValue& settings) {
-    WebProxyPlaces places = findProxies([](const char* name) -> const char* { return std::getenv(name); });
-    const std::string ofProfile = proxyOf(settings);
-    if (!ofProfile.empty()) places.push_back(ofProfile);
-    return places;
+bool is(const Error& error, Reason reason) {
+    return error.code == static_cast<int>(reason);
 }
 
 bool isStopped(const Error& error) {
-    return error.code == static_cast<int>(Reason::cancelled);
+    return is(error, Reason::cancelled);
+}
+
+/// \param settings of the profile in use. A profile that cannot be read may hold a proxy; without one there is none.
+Known<WebProxyPlaces> allProxies(const Known<BusValue>& settings) {
+    WebProxyPlaces places = findProxies([](const char* name) -> const char* { return std::getenv(name); });
+    const std::string ofProfile = settings ? proxyOf(*settings) : "";
+    if (!ofProfile.empty()) places.push_back(ofProfile);
+    if (!settings && places.empty() && !is(settings.error(), Reason::notJoined)) return settings.error();
+    return places;
 }
 
 std::optional<std::string> driverOf(const Link& link, const std::string& root) {
@@ -225,7 +241,7 @@ Known<LinkSetup> gatherSetup(const Link& link, const Until& until) {
         setup = setupFromKernel(bus, link, until);
     }
     if (!setup) return setup;
-    setup->proxies = allProxies(managed ? managed->settings : BusValue());
+    setup->proxies = allProxies(managed ? managed->settings : Known<BusValue>(BusValue()));
     return setup;
 }
 
@@ -234,7 +250,9 @@ Known<SavedNetworks> gatherSaved(const Link& link, const Until& until) {
     if (!bus) return bus.error();
     const auto managed = readNetworkManagerLink(*bus, link.interfaceName, until);
     if (managed) return networkManagerNetworks(*bus, until);
-    if (isStopped(managed.error())) return managed.error();
+    // One that is there and silent may have the interface: what it hands to the supplicant is not its store.
+    if (!is(managed.error(), Reason::notFound) && !is(managed.error(), Reason::unavailable))
+        return managed.error();
     const auto objects = iwdObjects(*bus, until);
     if (objects && !iwdDevice(*objects, link.interfaceName).empty()) return iwdNetworks(*objects);
     const auto interface = supplicantInterface(*bus, link.interfaceName, until);

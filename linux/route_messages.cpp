@@ -35,10 +35,12 @@ std::optional<Address> addressOf(const ifaddrmsg& header, const Attributes& attr
     if (!bytes) bytes = attributes.find(IFA_ADDRESS);
     if (!family || !bytes || bytes->size() != sizeOf(*family)) return std::nullopt;
     const std::uint32_t flags = attributes.number<std::uint32_t>(IFA_FLAGS).value_or(header.ifa_flags);
+    // No new connection begins from an IPv6 address whose time is up (RFC 4862).
+    const std::uint32_t passed = *family == Address::Family::ipv6 ? IFA_F_DEPRECATED : 0;
     return Address{*family,
                    {bytes->begin(), bytes->end()},
                    header.ifa_scope == RT_SCOPE_UNIVERSE,
-                   (flags & (IFA_F_TENTATIVE | IFA_F_DADFAILED)) == 0};
+                   (flags & (IFA_F_TENTATIVE | IFA_F_DADFAILED | passed)) == 0};
 }
 
 /// The next hop; one of the other family stands behind two bytes that name it.

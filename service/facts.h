@@ -47,7 +47,8 @@ struct Address {
     Family family = Family::ipv4;
     std::vector<std::uint8_t> bytes;  ///< 4 or 16
     bool global = false;              ///< of universal scope
-    bool usable = true;               ///< neither being checked for duplicates nor found to be one
+    /// Neither being checked for duplicates nor found to be one, and not deprecated (IPv6).
+    bool usable = true;
 };
 using Addresses = std::vector<Address>;
 

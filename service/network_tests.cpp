@@ -64,7 +64,8 @@ Outcome dtimIntervalIsLong(const Facts& facts) {
     if (!judged) return judged.error();
     std::optional<std::uint8_t> period;
     if (!facts.named && facts.station) period = facts.station->dtimPeriod;
-    if (!period) period = (*judged)->says.dtimPeriod;
+    // 0 is the driver's word for a beacon that it has not heard yet.
+    if (period.value_or(0) == 0) period = (*judged)->says.dtimPeriod;
     if (!period) return failure(Reason::unsupported, "no beacon with a DTIM period was heard");
     if (*period == 0) return failure(Reason::malformed, "the access point names a DTIM period of 0");
     return problem(*period > kLongestDtimPeriod, {{"DTIMInterval", std::int64_t{*period}}});

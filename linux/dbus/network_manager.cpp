@@ -1,6 +1,7 @@
 #include "linux/dbus/network_manager.h"
 
 #include <algorithm>
+#include <functional>
 
 #include "linux/dbus/network_records.h"
 
@@ -35,37 +36,40 @@ Known<BusObject> deviceOf(Bus& bus, const std::string& interfaceName, const Unti
     return objectAt(*path);
 }
 
-BusValue activeSettings(Bus& bus, const std::string& activePath, const Until& until) {
-    if (!isPath(activePath)) return {};
+Known<BusValue> activeSettings(Bus& bus, const std::string& activePath, const Until& until) {
+    const Error inactive =
+        failure(Reason::notJoined, "NetworkManager has no active connection on the interface");
+    if (!isPath(activePath)) return inactive;
     const auto connection =
         bus.property({kService, activePath}, kService + ".Connection.Active", "Connection", until);
-    if (!connection || !isPath(connection->text())) return {};
-    auto settings =
-        bus.call(objectAt(*connection), kService + ".Settings.Connection", "GetSettings", {}, until);
-    return settings ? std::move(*settings) : BusValue();
+    if (!connection) return connection.error();
+    if (!isPath(connection->text())) return inactive;
+    return bus.call(objectAt(*connection), kService + ".Settings.Connection", "GetSettings", {}, until);
 }
 
-std::map<std::string, std::string> leaseAt(Bus& bus, const std::string& path, const std::string& kind,
-                                           const Until& until) {
-    std::map<std::string, std::string> options;
-    if (!isPath(path)) return options;
+/// Whether the lease could be read; none is a lease without options.
+bool readLease(Bus& bus, const std::string& path, const std::string& kind, const Until& until,
+               std::map<std::string, std::string>& options) {
+    if (!isPath(path)) return true;
     const auto read = bus.property({kService, path}, kService + "." + kind, "Options", until);
-    if (!read) return options;
+    if (!read) return false;
     for (const auto& [name, value] : read->map())
         if (const auto* text = value.as<std::string>()) options.emplace(name, *text);
-    return options;
+    return true;
 }
 
-void addServers(Bus& bus, const std::string& path, const std::string& kind, const Until& until,
-                std::vector<IPAddress>& servers) {
-    if (!isPath(path)) return;
+/// Whether the servers could be read.
+bool readServers(Bus& bus, const std::string& path, const std::string& kind, const Until& until,
+                 std::vector<IPAddress>& servers) {
+    if (!isPath(path)) return true;
     const auto config = bus.properties({kService, path}, kService + "." + kind, until);
-    if (!config) return;
+    if (!config) return false;
     for (const BusValue& each : (*config)["NameserverData"].list())
         if (const auto address = IPAddress::fromText(each["address"].text())) servers.push_back(*address);
     if (kind == "IP6Config")
         for (const BusValue& each : (*config)["Nameservers"].list())
             if (const auto address = IPAddress::fromBytes(each.bytes())) servers.push_back(*address);
+    return true;
 }
 
 /// In `dns` an IPv4 address is a number in network order as it lies in memory, an IPv6 one 16 bytes;
@@ -126,10 +130,12 @@ Known<NetworkManagerLink> readNetworkManagerLink(Bus& bus, const std::string& in
     NetworkManagerLink link;
     link.device = *device;
     link.settings = activeSettings(bus, (*properties)["ActiveConnection"].text(), until);
-    link.lease4 = leaseAt(bus, (*properties)["Dhcp4Config"].text(), "DHCP4Config", until);
-    link.lease6 = leaseAt(bus, (*properties)["Dhcp6Config"].text(), "DHCP6Config", until);
-    addServers(bus, (*properties)["Ip4Config"].text(), "IP4Config", until, link.servers);
-    addServers(bus, (*properties)["Ip6Config"].text(), "IP6Config", until, link.servers);
+    const auto path = [&properties](const char* name) { return (*properties)[name].text(); };
+    const bool read[] = {readLease(bus, path("Dhcp4Config"), "DHCP4Config", until, link.lease4),
+                         readLease(bus, path("Dhcp6Config"), "DHCP6Config", until, link.lease6),
+                         readServers(bus, path("Ip4Config"), "IP4Config", until, link.servers),
+                         readServers(bus, path("Ip6Config"), "IP6Config", until, link.servers)};
+    link.offerRead = std::ranges::all_of(read, std::identity());
     if (until.stop->raised()) return waitFailure(Wait::stopped, kService);
     return link;
 }
@@ -141,21 +147,23 @@ std::vector<IPAddress> manualServers(const BusValue& settings) {
     return servers;
 }
 
-std::vector<IPAddress> networkManagerGlobalServers(Bus& bus, const Until& until) {
+Known<std::vector<IPAddress>> networkManagerGlobalServers(Bus& bus, const Until& until) {
     std::vector<IPAddress> servers;
     const auto global = bus.property(kManager, kService, "GlobalDnsConfiguration", until);
-    if (!global) return servers;
+    // An old one that does not know the property has no such servers.
+    if (!global && global.error().code == static_cast<int>(Reason::notFound)) return servers;
+    if (!global) return global.error();
     for (const BusValue& each : (*global)["domains"]["*"]["servers"].list())
         if (const auto address = IPAddress::fromText(each.text())) servers.push_back(*address);
     return servers;
 }
 
-std::vector<IPAddress> networkManagerServersElsewhere(Bus& bus, const std::string& interfaceName,
-                                                      const Until& until) {
+Known<std::vector<IPAddress>> networkManagerServersElsewhere(Bus& bus, const std::string& interfaceName,
+                                                             const Until& until) {
     std::vector<IPAddress> servers, here;
     const BusObject manager{kService, "/org/freedesktop/NetworkManager/DnsManager"};
     const auto all = bus.property(manager, kService + ".DnsManager", "Configuration", until);
-    if (!all) return servers;
+    if (!all) return all.error();
     for (const BusValue& each : all->list())
         for (const BusValue& text : each["nameservers"].list())
             if (const auto address = IPAddress::fromText(text.text()))

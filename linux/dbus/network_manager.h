@@ -13,10 +13,12 @@ namespace wp {
 /// What NetworkManager tells of the interface that it manages.
 struct NetworkManagerLink {
     BusObject device;
-    BusValue settings;  ///< of the active connection: section, then key; empty where none is active
+    /// Of the active connection: section, then key. Fails as `notJoined` where none is active.
+    Known<BusValue> settings;
     std::map<std::string, std::string> lease4;  ///< options of the DHCPv4 lease by their names
     std::map<std::string, std::string> lease6;
     std::vector<IPAddress> servers;  ///< name servers in effect, of both families
+    bool offerRead = true;           ///< whether leases and servers are all that there is
 };
 
 /// NetworkManager's object for the interface. Fails as `notFound` where it does not manage the interface.
@@ -34,10 +36,10 @@ std::string proxyOf(const BusValue& settings);
 std::optional<SavedNetwork> savedFromNetworkManager(const BusValue& settings);
 
 /// The name servers that a person set for all connections at once.
-std::vector<IPAddress> networkManagerGlobalServers(Bus& bus, const Until& until);
+Known<std::vector<IPAddress>> networkManagerGlobalServers(Bus& bus, const Until& until);
 /// The name servers that NetworkManager asks for the sake of other interfaces.
-std::vector<IPAddress> networkManagerServersElsewhere(Bus& bus, const std::string& interfaceName,
-                                                      const Until& until);
+Known<std::vector<IPAddress>> networkManagerServersElsewhere(Bus& bus, const std::string& interfaceName,
+                                                             const Until& until);
 
 /// All Wi-Fi networks that NetworkManager remembers. *Any* thread.
 Known<SavedNetworks> networkManagerNetworks(Bus& bus, const Until& until);

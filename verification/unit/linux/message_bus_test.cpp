@@ -11,6 +11,7 @@
 #include "linux/dbus/network_records.h"
 #include "linux/dbus/resolved.h"
 #include "linux/dbus/supplicant.h"
+#include "linux/gather_setup.h"
 #include "linux/manager_scan.h"
 #include "verification/unit/linux/fakes/child_process.h"
 #include "verification/unit/linux/stop.h"
@@ -29,11 +30,13 @@ class MessageBus : public ::testing::Test {
         address_ = "unix:path=" + folder_ + "/bus";
         daemon_ = new ChildProcess({"dbus-daemon", "--session", "--nofork", "--nopidfile", "--print-address",
                                     "--address=" + address_});
+        setenv("DBUS_SYSTEM_BUS_ADDRESS", address_.c_str(), 1);
         services_ = new ChildProcess({"/usr/bin/python3",
                                       WP_SOURCE_DIR "/verification/unit/linux/fakes/bus_services.py",
                                       address_, "nm", "supplicant", "iwd", "bluez", "resolved", "broken"});
     }
     static void TearDownTestSuite() {
+        unsetenv("DBUS_SYSTEM_BUS_ADDRESS");
         delete services_;
         delete daemon_;
         std::filesystem::remove_all(folder_);
@@ -140,12 +143,14 @@ TEST_F(MessageBus, NetworkManagerTellsOfTheLinkThatItManages) {
     Bus bus = this->bus();
     const auto link = readNetworkManagerLink(bus, "wlan0", patience());
     ASSERT_TRUE(link) << link.error().text();
-    EXPECT_EQ(link->settings["ipv4"]["method"].text(), "manual");
-    EXPECT_EQ(link->settings["ipv6"]["method"].text(), "auto");
+    ASSERT_TRUE(link->settings);
+    EXPECT_EQ((*link->settings)["ipv4"]["method"].text(), "manual");
+    EXPECT_EQ((*link->settings)["ipv6"]["method"].text(), "auto");
+    EXPECT_TRUE(link->offerRead);
     EXPECT_EQ(link->lease4.at("domain_name_servers"), "192.168.1.1 192.168.1.2");
     EXPECT_EQ(textsOf(link->servers), "192.168.1.1 2001:db8::53 ");
-    EXPECT_EQ(textsOf(manualServers(link->settings)), "9.9.9.9 2620:fe::9 ");
-    EXPECT_EQ(proxyOf(link->settings), "NetworkManager profile: pac-url");
+    EXPECT_EQ(textsOf(manualServers(*link->settings)), "9.9.9.9 2620:fe::9 ");
+    EXPECT_EQ(proxyOf(*link->settings), "NetworkManager profile: pac-url");
 }
 
 TEST_F(MessageBus, AnInterfaceThatNetworkManagerLeavesAloneIsNotItsOwn) {
@@ -153,6 +158,40 @@ TEST_F(MessageBus, AnInterfaceThatNetworkManagerLeavesAloneIsNotItsOwn) {
     const auto link = readNetworkManagerLink(bus, "wlan1", patience());
     ASSERT_FALSE(link);
     EXPECT_EQ(link.error().code, codeOf(Reason::notFound));
+}
+
+TEST_F(MessageBus, WithoutAnActiveConnectionNothingIsSetUpByHand) {
+    const auto setup = gatherSetup({"wlan6", 9996, 0, true, {}}, patience());
+    ASSERT_TRUE(setup) << setup.error().text();
+    ASSERT_TRUE(!setup->methods.ipv4 && !setup->methods.ipv6 && !setup->nameServers);
+    EXPECT_EQ(setup->methods.ipv4.error().code, codeOf(Reason::notJoined));
+    EXPECT_EQ(setup->nameServers.error().code, codeOf(Reason::notJoined));
+    EXPECT_TRUE(setup->proxies);
+}
+
+TEST_F(MessageBus, WhatTheProfileKeepsToItselfIsNotTakenForEmpty) {
+    Bus bus = this->bus();
+    const auto link = readNetworkManagerLink(bus, "wlan5", patience());
+    ASSERT_TRUE(link) << link.error().text();
+    EXPECT_FALSE(link->offerRead);  // its lease is not there
+
+    const auto setup = gatherSetup({"wlan5", 9995, 0, true, {}}, patience());
+    ASSERT_TRUE(setup) << setup.error().text();
+    ASSERT_TRUE(!setup->methods.ipv4 && !setup->nameServers);
+    EXPECT_EQ(setup->methods.ipv4.error().code, codeOf(Reason::notPermitted));
+    EXPECT_EQ(setup->nameServers.error().code, codeOf(Reason::notPermitted));
+    // This machine itself may have one.
+    EXPECT_TRUE(setup->proxies ? !setup->proxies->empty()
+                               : setup->proxies.error().code == codeOf(Reason::notPermitted));
+}
+
+TEST_F(MessageBus, TheStoreOfASilentManagerIsNotReplacedByItsSupplicants) {
+    const auto saved = gatherSaved({"wlan7", 9997, 0, true, {}}, patience());
+    ASSERT_FALSE(saved);
+    EXPECT_EQ(saved.error().code, codeOf(Reason::timeout));
+    const auto iwds = gatherSaved({"wlan2", 9992, 0, true, {}}, patience());
+    ASSERT_TRUE(iwds) << iwds.error().text();
+    EXPECT_EQ(iwds->store, "iwd");
 }
 
 TEST_F(MessageBus, NetworkManagerTellsItsNetworks) {

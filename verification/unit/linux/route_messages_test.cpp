@@ -49,6 +49,32 @@ TEST(RouteMessages, TellNoAddressOfAnotherInterface) {
     EXPECT_TRUE(texts(readAddresses(captured("not-joined-addr"), interfaceIn("not-joined"))).empty());
 }
 
+/// The kernel's message on 2001:db8::5/64 of interface 3. \param origin who made it, \param life in seconds
+std::vector<std::uint8_t> addressMessage(std::uint8_t origin, std::uint32_t life, std::uint32_t flags = 0) {
+    const std::uint8_t address[] = {0x20, 1, 0xD, 0xB8, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 5};
+    const ifa_cacheinfo times{life, life, 0, 0};
+    NetlinkRequest message(RTM_NEWADDR, 0);
+    message.header<ifaddrmsg>() = {AF_INET6, 64, 0, 0, 3};
+    message.put(IFA_ADDRESS, address);
+    if (life == 0xFFFF'FFFF) flags |= IFA_F_PERMANENT;
+    message.put(IFA_FLAGS, flags);
+    message.put(11, Bytes(&origin, 1));
+    message.put(IFA_CACHEINFO, Bytes(reinterpret_cast<const std::uint8_t*>(&times), sizeof times));
+    const auto* bytes = reinterpret_cast<const std::uint8_t*>(&message.message());
+    return {bytes, bytes + message.message().nlmsg_len};
+}
+
+TEST(RouteMessages, CallAnIPv6AddressUsableThatIsNeitherInDoubtNorDeprecated) {
+    const auto usable = [](std::uint32_t flags) {
+        return !texts(readAddresses(addressMessage(0, 3600, flags), 3)).empty();
+    };
+
+    EXPECT_TRUE(usable(0));
+    EXPECT_FALSE(usable(IFA_F_DEPRECATED));
+    EXPECT_FALSE(usable(IFA_F_TENTATIVE));
+    EXPECT_FALSE(usable(IFA_F_DADFAILED));
+}
+
 TEST(RouteMessages, TellTheGateway) {
     const auto gateways = readGateways(captured("good-home-route"), interfaceIn("good-home"));
 
@@ -92,20 +118,6 @@ TEST(AddressDetails, TellAddressAndNetwork) {
     const auto details = readAddressDetails(captured("ipv6-only-addr"), interfaceIn("ipv6-only"));
     EXPECT_EQ(linesOf(details), "2001:db8:1::7/64 forever\n");
     EXPECT_TRUE(readAddressDetails(captured("ipv6-only-addr"), 9999).empty());
-}
-
-/// The kernel's message on 2001:db8::5/64 of interface 3. \param origin who made it, \param life in seconds
-std::vector<std::uint8_t> addressMessage(std::uint8_t origin, std::uint32_t life) {
-    const std::uint8_t address[] = {0x20, 1, 0xD, 0xB8, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 5};
-    const ifa_cacheinfo times{life, life, 0, 0};
-    NetlinkRequest message(RTM_NEWADDR, 0);
-    message.header<ifaddrmsg>() = {AF_INET6, 64, 0, 0, 3};
-    message.put(IFA_ADDRESS, address);
-    message.put(IFA_FLAGS, life == 0xFFFF'FFFF ? std::uint32_t{IFA_F_PERMANENT} : 0U);
-    message.put(11, Bytes(&origin, 1));
-    message.put(IFA_CACHEINFO, Bytes(reinterpret_cast<const std::uint8_t*>(&times), sizeof times));
-    const auto* bytes = reinterpret_cast<const std::uint8_t*>(&message.message());
-    return {bytes, bytes + message.message().nlmsg_len};
 }
 
 TEST(AddressDetails, TellLifetimeAndOrigin) {

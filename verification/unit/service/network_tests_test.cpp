@@ -37,6 +37,17 @@ TEST(NetworkTests, TakeTheDtimPeriodFromTheLinkBeforeTheBeacon) {
     EXPECT_TRUE(resultOf(35, facts));
 }
 
+TEST(NetworkTests, TakeTheDtimPeriodFromTheBeaconWhereTheDriverKnowsNone) {
+    Facts facts = joinedTo({heard(kHome)});
+    facts.station = Station{{-50}, 0, 100};
+
+    EXPECT_EQ(Value(2), infoOf(35, facts, "DTIMInterval"));
+}
+
+TEST(NetworkTests, RefuseADtimPeriodOfZeroInTheBeacon) {
+    EXPECT_EQ(10, errorOf(35, joinedTo({heard(element(5, {0, 0, 0, 0}))})));
+}
+
 TEST(NetworkTests, CallADtimPeriodOf3Usual) {
     EXPECT_FALSE(resultOf(35, joinedTo({heard(element(5, {0, 3, 0, 0}))})));
 }

@@ -31,7 +31,10 @@ def network_manager():
     nm, base = "org.freedesktop.NetworkManager", "/org/freedesktop/NetworkManager"
     main = service(nm, base, nm, {"WirelessEnabled": True, "WirelessHardwareEnabled": True})
     main.AddMethod(nm, "GetDeviceByIpIface", "s", "o",
-                   "ret = dbus.ObjectPath('%s/Devices/' + {'wlan0': '1', 'wlan1': '2', 'wlan4': '4'}[args[0]])" % base)
+                   "if args[0] == 'wlan7': raise dbus.exceptions.DBusException("
+                   "'silent', name='org.freedesktop.DBus.Error.NoReply')\n"
+                   "ret = dbus.ObjectPath('%s/Devices/' + {'wlan0': '1', 'wlan1': '2', 'wlan4': '4', 'wlan5': '5',"
+                   " 'wlan6': '6'}[args[0]])" % base)
     device = nm + ".Device"
     main.AddObject(base + "/Devices/1", device, {
         "Managed": True, "ActiveConnection": dbus.ObjectPath(base + "/ActiveConnection/1"),
@@ -45,6 +48,12 @@ def network_manager():
     dbusmock.get_object(base + "/Devices/4").AddMethod(
         device + ".Wireless", "RequestScan", "a{sv}", "", "raise dbus.exceptions.DBusException("
         "'Not authorized', name='org.freedesktop.NetworkManager.Device.PermissionDenied')")
+    main.AddObject(base + "/Devices/5", device, {
+        "Managed": True, "ActiveConnection": dbus.ObjectPath(base + "/ActiveConnection/5"),
+        "Dhcp4Config": dbus.ObjectPath(base + "/DHCP4Config/5")}, [])
+    main.AddObject(base + "/ActiveConnection/5", nm + ".Connection.Active",
+                   {"Connection": dbus.ObjectPath(base + "/Settings/5")}, [])
+    main.AddObject(base + "/Devices/6", device, {"Managed": True, "ActiveConnection": dbus.ObjectPath("/")}, [])
     main.AddObject(base + "/ActiveConnection/1", nm + ".Connection.Active",
                    {"Connection": dbus.ObjectPath(base + "/Settings/1")}, [])
     main.AddObject(base + "/DHCP4Config/1", nm + ".DHCP4Config", {"Options": dbus.Dictionary({
@@ -80,6 +89,11 @@ def network_manager():
                    "802-11-wireless": {"ssid": text(b"Cellar"), "hidden": True}})
     connection(4, {"connection": {"type": "802-11-wireless"},
                    "802-11-wireless": {"ssid": text(b"Hotspot"), "mode": "ap"}})
+    # One that belongs to somebody else.
+    main.AddObject(base + "/Settings/5", settings + ".Connection", {}, [])
+    dbusmock.get_object(base + "/Settings/5").AddMethod(
+        settings + ".Connection", "GetSettings", "", "a{sa{sv}}", "raise dbus.exceptions.DBusException("
+        "'not yours', name='org.freedesktop.NetworkManager.Settings.PermissionDenied')")
     main.AddObject(base + "/Settings", settings, {}, [])
     dbusmock.get_object(base + "/Settings").AddMethod(
         settings, "ListConnections", "", "ao",
