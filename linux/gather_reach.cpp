@@ -208,13 +208,15 @@ Known<PortalEvidence> gatherPortal(const Link& link, const LinkSetup& setup, con
     auto secureRequest = beside([&] { return requestFor(secureUrl, link, setup, endpoints, until); });
     const auto plain = requestFor(plainUrl, link, setup, endpoints, until);
     const auto secure = secureRequest.get();
-    Known<std::vector<WebAnswer>> answers = failure(Reason::cancelled, "cancelled");
-    if (plain && secure)
+    Known<std::vector<WebAnswer>> answers;
+    if (!plain || !secure)
+        answers = plain ? secure.error() : plain.error();
+    else
         answers = runWebRequests({*plain, *secure}, until, [](const auto& all) { return decides(all[0]); });
     const auto declared = api.get();
     if (!answers) return answers.error();
     if (!declared) return declared.error();
-    if (plainUrl.empty() && !declared->captive) return notConfigured("the captive portal's probe");
+    if (plainUrl.empty() && !declared->captive && !declared->unrestricted) return notConfigured("the captive portal's probe");
     return PortalEvidence{*declared, portalAnswer((*answers)[0], *plain),
                           portalAnswer((*answers)[1], *secure)};
 }

@@ -16,6 +16,10 @@ constexpr int kStartAttempts = 4;
 // Managers put a scan off for some seconds when another one has just ended.
 constexpr std::chrono::seconds kManagersDelay{10};
 
+bool hearsOthers(const std::vector<AccessPoint>& found) {
+    return std::ranges::any_of(found, [](const AccessPoint& each) { return !each.joined; });
+}
+
 /// One row of scans for one wish.
 class ScanRun {
   public:
@@ -27,7 +31,8 @@ class ScanRun {
 
     Known<ScanReport> run() {
         Known<ScanReport> report = complete(fullOrder());
-        if (report && wish_.named) return withBeacons(std::move(*report));
+        if (!report) return wasCutShort_ ? cutShort(report.error()) : report;
+        if (wish_.named) return withBeacons(std::move(*report));
         return report;
     }
 
@@ -83,6 +88,17 @@ class ScanRun {
         return reportNow();
     }
 
+    /// What was heard before scans were cut short has to do, where that is more than the joined access point and,
+    /// where a network is looked for, that one; otherwise the reason stands.
+    Known<ScanReport> cutShort(const Error& why) {
+        Known<ScanReport> report = reportNow();
+        if (!report || !hearsOthers(report->accessPoints)) return why;
+        const auto isNamed = [this](const AccessPoint& each) { return each.says.name == *wish_.named; };
+        if (wish_.named && std::ranges::none_of(report->accessPoints, isNamed)) return why;
+        report->completedAt = 0;
+        return report;
+    }
+
     Known<ScanReport> reportNow() {
         const std::int64_t completedAt = bootMilliseconds();
         Known<std::vector<AccessPoint>> found = results();
@@ -105,6 +121,7 @@ class ScanRun {
             if (finished && (error == 0 || isAsGood(*event, order))) return std::nullopt;
             if (!finished && error == 0 && std::exchange(aborted, true)) break;
         }
+        wasCutShort_ = true;
         return failure(Reason::timeout, "scans were aborted or the radio was busy with others'");
     }
 
@@ -148,6 +165,7 @@ class ScanRun {
     const Until& until_;
     RadioAbilities abilities_;
     std::int64_t startedAt_;
+    bool wasCutShort_ = false;
 };
 
 bool sees(const std::vector<AccessPoint>& found, const std::optional<NetworkName>& name) {
@@ -167,9 +185,7 @@ std::optional<ScanReport> heardLately(RadioSocket& radio, const ScanWish& wish, 
     std::erase_if(*known, [&](const AccessPoint& each) {
         return !each.joined && (!each.lastSeen || *each.lastSeen < wish.freshSince);
     });
-    const bool heardOthers =
-        std::ranges::any_of(*known, [](const AccessPoint& each) { return !each.joined; });
-    if (!heardOthers) return std::nullopt;
+    if (!hearsOthers(*known)) return std::nullopt;
     return ScanReport{std::move(*known), 0};
 }
 
@@ -191,7 +207,9 @@ bool Scanner::Remembered::serves(const ScanWish& wish) const {
 Known<ScanReport> Scanner::scanNow(RadioSocket& radio, const ScanWish& wish, const Until& until) {
     Known<ScanReport> report = ScanRun(radio, wish, until).run();
     if (isNotPermitted(report)) return scanWithoutPermission(radio, wish, until);
-    if (report && !wish.named && wish.manner == ScanWish::Manner::listening)
+    if (report && report->completedAt == 0)
+        notes_.once("scans were cut short: other networks are judged by what was heard until then");
+    else if (report && !wish.named && wish.manner == ScanWish::Manner::listening)
         listened_ = Remembered{wish.interfaceIndex, *report};
     return report;
 }

@@ -192,6 +192,7 @@ TEST_F(GatherWeb, TheNetworksOwnWordIsAskedForOverASecureConnectionAlone) {
     EXPECT_EQ(portal(endpoints(), setup).declared.captive, std::nullopt);
     setup.portalApi = "urn:ietf:params:capport:unrestricted";
     EXPECT_TRUE(portal(endpoints(), setup).declared.unrestricted);
+    EXPECT_TRUE(portal({}, setup).declared.unrestricted) << "though no probe is configured";
 }
 
 TEST_F(GatherWeb, TheVendorsServiceIsReachedAndItsContentRead) {
