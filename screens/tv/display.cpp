@@ -38,6 +38,11 @@ bool endsTheProcess(QtMsgType type, const QString& text) {
            text.contains(QLatin1String("The Wayland connection experienced a fatal error"));
 }
 
+bool isAboutThePlatform(const QMessageLogContext& context, const QString& text) {
+    return (context.category && std::string_view(context.category).starts_with("qt.qpa")) ||
+           text.startsWith(QLatin1String("Failed to create wl_display"));
+}
+
 bool isAboutTheScene(const QMessageLogContext& context, const QString& text) {
     return text.startsWith(QLatin1String("qrc:")) ||
            (context.category && std::string_view(context.category).starts_with("qml"));
@@ -45,8 +50,7 @@ bool isAboutTheScene(const QMessageLogContext& context, const QString& text) {
 
 void takeMessage(QtMsgType type, const QMessageLogContext& context, const QString& text) {
     std::string line = text.section(QLatin1Char('\n'), 0, 0).toStdString();
-    bool isOfPlatform = context.category && std::string_view(context.category).starts_with("qt.qpa");
-    if (isOfPlatform && type != QtDebugMsg && type != QtInfoMsg && firstComplaint.empty())
+    if (isAboutThePlatform(context, text) && type != QtDebugMsg && type != QtInfoMsg && firstComplaint.empty())
         firstComplaint = line;
     if (endsTheProcess(type, text)) {
         bool isFatal = type == QtFatalMsg && !firstComplaint.empty();

@@ -23,6 +23,8 @@ class Window::InputMethodItem final : public QQuickItem {
             setFlag(ItemAcceptsInputMethod, takesText);
             if (!takesText) input_.compose({});
         }
+        // Under Wayland without a seat nothing has the focus, and the toolkit's input method crashes when it is asked.
+        if (QGuiApplication::focusObject() != this) return;
         QGuiApplication::inputMethod()->update(Qt::ImQueryInput | Qt::ImEnabled);
     }
 

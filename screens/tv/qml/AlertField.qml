@@ -33,6 +33,7 @@ Rectangle {
             x: Math.min(0, view.width - field.u * (4 + field.look.cursorX))
             height: parent.height
             verticalAlignment: Text.AlignVCenter
+            horizontalAlignment: Text.AlignLeft
             text: field.look.text
             textFormat: Text.PlainText
             font.family: field.stage.fontFamily
@@ -45,6 +46,7 @@ Rectangle {
             width: parent.width - x
             height: parent.height
             verticalAlignment: Text.AlignVCenter
+            horizontalAlignment: Text.AlignLeft
             visible: field.look.text === ""
             text: field.look.placeholder
             textFormat: Text.PlainText
