@@ -43,7 +43,7 @@ lab:
 	@$(LAB)/run-scenarios
 
 bench:
-	@verification/install_packages build test
+	@verification/install_packages build test tv
 	@verification/run_bench
 
 fuzz:

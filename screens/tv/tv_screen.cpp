@@ -8,6 +8,7 @@
 #include <QTimer>
 #include <algorithm>
 
+#include "screens/tv/frame_trace.h"
 #include "screens/tv/keyboard_look.h"
 #include "screens/tv/stage.h"
 #include "screens/tv/text_measurer.h"
@@ -19,7 +20,8 @@ namespace wp::tv {
 
 class TvScreen::Loop : private ui::ScreenObserver {
   public:
-    Loop(std::unique_ptr<Display> display, ui::Screen& screen, MainQueue& queue, Texts texts)
+    Loop(std::unique_ptr<Display> display, ui::Screen& screen, MainQueue& queue, Texts texts,
+         std::function<void(std::string_view)> note)
         : display_(std::move(display)),
           screen_(screen),
           queue_(queue),
@@ -27,6 +29,8 @@ class TvScreen::Loop : private ui::ScreenObserver {
           typist_(screen),
           stage_(display_->hasMotion() ? Motion::full : Motion::none),
           window_(inputs()),
+          trace_(
+              window_, [this] { return screen_.screenName(); }, std::move(note)),
           notifier_(wake_->descriptor(), QSocketNotifier::Read) {
         QObject::connect(&notifier_, &QSocketNotifier::activated, [this] { wake_->drain(); });
         auto fit = [this] { stage_.setUnit(unitFor(window_.size())); };
@@ -172,6 +176,7 @@ class TvScreen::Loop : private ui::ScreenObserver {
     QString composed_;
     bool isUpToDate_ = false;
     Window window_;
+    FrameTrace trace_;
     std::shared_ptr<Wake> wake_ = std::make_shared<Wake>();
     QSocketNotifier notifier_;
     QTimer timer_;
@@ -179,11 +184,12 @@ class TvScreen::Loop : private ui::ScreenObserver {
 
 TvScreen::Opened TvScreen::open(ui::Screen& screen, MainQueue& queue, Texts texts,
                                 Display::Messages messages) {
+    std::function<void(std::string_view)> note = messages.note;
     Display::Opened display = Display::open(std::move(messages));
     if (auto* why = std::get_if<std::string>(&display)) return *why;
     loadFonts();
     auto loop = std::make_unique<Loop>(std::move(std::get<std::unique_ptr<Display>>(display)), screen, queue,
-                                       std::move(texts));
+                                       std::move(texts), std::move(note));
     if (auto why = loop->show()) return *why;
     return std::unique_ptr<TvScreen>(new TvScreen(std::move(loop)));
 }
