@@ -258,7 +258,7 @@ Arguments testsArguments(const std::vector<std::string>& words) {
     Arguments arguments;
     arguments.command = Command::tests;
     if (OptionsReader<ReportOptions>(words, kTestsOptions).readInto(arguments.report))
-        arguments.command = Command::help;
+        arguments.command = Command::testsHelp;
     return arguments;
 }
 
@@ -315,9 +315,9 @@ std::string helpText() {
            "\n"
            "usage:\n"
            "  wifi-profile run [options]     one run; prints the result as JSON on standard output\n"
-           "  wifi-profile tests [--locale]  the catalogue of tests and what counts as a finding\n"
+           "  wifi-profile tests             the catalogue of tests and what counts as a finding\n"
            "  wifi-profile report FILE       a result or a recording (or -) as a report for people\n"
-           "  wifi-profile run --help        the options of run; report --help: those of report\n"
+           "  wifi-profile run --help        the options of run; likewise report --help, tests --help\n"
            "  wifi-profile --help, --version\n"
            "\n"
            "exit status: 0 the run is complete; 2 unusable arguments or files; 12 to 17 the run ended\n"
@@ -332,6 +332,10 @@ std::string reportHelpText() {
     return "usage: wifi-profile report FILE [options]\n\n"
            "FILE is a result or, with more to tell, a recording (-: standard input).\n\noptions:\n" +
            listed<ReportOptions>(kReportOptions);
+}
+
+std::string testsHelpText() {
+    return "usage: wifi-profile tests [options]\n\noptions:\n" + listed<ReportOptions>(kTestsOptions);
 }
 
 }  // namespace wp::host

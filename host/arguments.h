@@ -9,7 +9,7 @@ namespace wp::host {
 
 enum class ScreenChoice { automatic, tv, terminal, headless, none };
 enum class OutputFormat { json, text, html };
-enum class Command { run, tests, report, help, runHelp, reportHelp, version };
+enum class Command { run, tests, report, help, runHelp, reportHelp, testsHelp, version };
 
 /// The options of `wifi-profile run` as they were given; what they mean together is decided where they are
 /// used.
@@ -59,9 +59,10 @@ struct Arguments {
 /// the argument. *Main*.
 Arguments parseArguments(const std::vector<std::string>& words);
 
-/// The texts of `--help`, `run --help` and `report --help`.
+/// The texts of `--help` and of each command's.
 std::string helpText();
 std::string runHelpText();
 std::string reportHelpText();
+std::string testsHelpText();
 
 }  // namespace wp::host

@@ -36,6 +36,8 @@ int perform(const Arguments& arguments) {
             return print(runHelpText());
         case Command::reportHelp:
             return print(reportHelpText());
+        case Command::testsHelp:
+            return print(testsHelpText());
         case Command::version:
             break;
     }

@@ -216,7 +216,8 @@ Known<PortalEvidence> gatherPortal(const Link& link, const LinkSetup& setup, con
     const auto declared = api.get();
     if (!answers) return answers.error();
     if (!declared) return declared.error();
-    if (plainUrl.empty() && !declared->captive && !declared->unrestricted) return notConfigured("the captive portal's probe");
+    if (plainUrl.empty() && !declared->captive && !declared->unrestricted)
+        return notConfigured("the captive portal's probe");
     return PortalEvidence{*declared, portalAnswer((*answers)[0], *plain),
                           portalAnswer((*answers)[1], *secure)};
 }

@@ -3,6 +3,7 @@
 #include <fcntl.h>
 #include <linux/rfkill.h>
 
+#include <algorithm>
 #include <array>
 #include <cerrno>
 #include <cstring>
@@ -41,12 +42,16 @@ std::optional<SwitchEvent> readSwitchEvent(Bytes bytes) {
     std::memcpy(&event, bytes.data(), sizeof event);
     return SwitchEvent{event.idx,
                        event.op == RFKILL_OP_DEL ? SwitchEvent::Kind::removed : SwitchEvent::Kind::present,
-                       event.type == RFKILL_TYPE_WLAN, event.soft != 0 || event.hard != 0};
+                       event.type == RFKILL_TYPE_WLAN, event.soft != 0 || event.hard != 0, event.hard != 0};
 }
 
 PowerSwitch::PowerSwitch()
     : device_(open(kDevice, O_RDWR | O_CLOEXEC | O_NONBLOCK)), writable_(bool(device_)) {
     if (!device_) device_ = Descriptor(open(kDevice, O_RDONLY | O_CLOEXEC | O_NONBLOCK));
+    update();
+}
+
+PowerSwitch::PowerSwitch(Descriptor device) : device_(std::move(device)), writable_(bool(device_)) {
     update();
 }
 
@@ -63,6 +68,7 @@ void PowerSwitch::update() {
         }
         const auto [place, isNew] = switches_.try_emplace(event->index);
         place->second.blocked = event->blocked;
+        place->second.byHardware = event->byHardware;
         if (!isNew) continue;
         // A radio's own switch has the radio's name, "phy0"; other switches are the machine's.
         const std::string name = switchName(event->index);
@@ -72,10 +78,15 @@ void PowerSwitch::update() {
 }
 
 bool PowerSwitch::isOn(std::uint32_t radio) const {
-    for (const auto& [index, each] : switches_) {
-        if (each.blocked && !each.elsewhere && each.radio.value_or(radio) == radio) return false;
-    }
-    return true;
+    return std::ranges::none_of(switches_, [radio](const auto& entry) {
+        return entry.second.blocked && entry.second.concerns(radio);
+    });
+}
+
+bool PowerSwitch::isHeldOff(std::optional<std::uint32_t> radio) const {
+    return std::ranges::any_of(switches_, [radio](const auto& entry) {
+        return entry.second.byHardware && entry.second.concerns(radio);
+    });
 }
 
 std::optional<Error> PowerSwitch::set(bool on) {

@@ -214,20 +214,23 @@ void Session::finishDescription(std::uint64_t id, const Known<std::vector<RadioI
 void Session::handleSetPower(const WireRequest& request) {
     const std::optional<Error> error = power_.set(request.power);
     if (!error || error->code != static_cast<int>(Reason::notPermitted))
-        return answerSetPower(request.id, error);
+        return answerSetPower(request, error);
     // NetworkManager lets whoever sits at the device do it.
     workers_.start([this, request, denied = *error, stop = stop_]() -> Workers::Publication {
         Known<Bus> bus = Bus::system();
         const Until until{stop, Clock::now() + kLookAround};
         const Known<bool> done = bus ? setNetworkManagerPower(*bus, request.power, until) : bus.error();
-        return [this, id = request.id, error = done ? std::nullopt : std::optional(denied)] {
-            answerSetPower(id, error);
+        return [this, request, error = done ? std::nullopt : std::optional(denied)] {
+            answerSetPower(request, error);
         };
     });
 }
 
-void Session::answerSetPower(std::uint64_t id, const std::optional<Error>& error) {
-    wire_.send(setPowerAnswerLine(id, error));
+void Session::answerSetPower(const WireRequest& request, std::optional<Error> error) {
+    // The kernel tells at once what no wish can change; what it was wished for counts when the switch is moved.
+    if (!error && request.power && power_.isHeldOff(describedRadio_))
+        error = failure(Reason::unavailable, "a switch on the device itself keeps it off");
+    wire_.send(setPowerAnswerLine(request.id, error));
 }
 
 void Session::reportPower() {

@@ -49,7 +49,7 @@ class Session {
     void answerReadyTests();
     void answerTest(std::uint64_t id, const DiagnosticsTestResponse& response);
     void answerCancelled(std::uint64_t id, const Waiting& waiting);
-    void answerSetPower(std::uint64_t id, const std::optional<Error>& error);
+    void answerSetPower(const WireRequest& request, std::optional<Error> error);
     void finishStatus(std::uint64_t id, const Known<Link>& link);
     void finishDescription(std::uint64_t id, const Known<std::vector<RadioInterface>>& interfaces);
     /// Whether the request still waits; it no longer does afterwards.

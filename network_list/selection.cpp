@@ -64,6 +64,8 @@ void WiFiProfileViewController::takeFromList(const WiFiScanResultPointer& networ
 /// The second half: the network that was selected before becomes choosable again. A name that no scan has
 /// shown simply leaves the table.
 void WiFiProfileViewController::putBackPreviousNetwork() {
+    // The name asked about may have been selected under the open question.
+    if (previousSelectedNetworkName_ == inputs_->selectedNetworkName()) return;
     WiFiScanResultPointer previous = distinctNetworks().network(previousSelectedNetworkName_);
     if (!previous) return;
     addNetworkToFilteredNetworkList(previous);

@@ -173,6 +173,8 @@ TEST(Arguments, AReportHasAFileAndOptionsInAnyOrder) {
     EXPECT_EQ(arguments.report.locale, "ja");
     EXPECT_EQ(arguments.report.outputFile, "r.txt");
     EXPECT_EQ(parseArguments({"report", "--help"}).command, Command::reportHelp);
+    EXPECT_EQ(parseArguments({"tests", "--help"}).command, Command::testsHelp);
+    EXPECT_NE(testsHelpText().find("--config FILE"), std::string::npos) << "what a wrong option points to";
     EXPECT_EQ(parseArguments({"tests", "--locale", "de"}).report.locale, "de");
 }
 

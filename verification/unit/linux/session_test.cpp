@@ -1,6 +1,7 @@
 #include "linux/session.h"
 
 #include <gtest/gtest.h>
+#include <linux/rfkill.h>
 #include <poll.h>
 #include <stdlib.h>
 #include <sys/socket.h>
@@ -65,16 +66,16 @@ TEST(Topic, IsAboutTheJoinedNetworkWithoutAConfiguration) {
 /// A session on a thread of its own, and the host's end of its wire.
 class Conversation {
   public:
-    Conversation() {
+    Conversation() : Conversation(PowerSwitch()) {}
+    explicit Conversation(PowerSwitch given) {
         int ends[2];
         EXPECT_EQ(0, socketpair(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0, ends));
         host_.emplace(Descriptor(ends[0]));
-        service_ = std::thread([end = ends[1]] {
+        service_ = std::thread([end = ends[1], power = std::move(given)]() mutable {
             LineSocket wire{Descriptor(end)};
             Sources sources;
             // No machine has an interface of this name: what is asked here ends with an error at once or soon.
             sources.interfaceName = "no-such-wifi";
-            PowerSwitch power;
             Session(wire, sources, power).run();
         });
     }
@@ -146,6 +147,56 @@ TEST(Session, DescribesAMachineWithoutTheInterface) {
     ASSERT_TRUE(response.wifi);
     EXPECT_TRUE(response.wifi->devices.empty());
     EXPECT_FALSE(response.wifi->power);
+}
+
+/// The kernel's device for power switches, with one switch of the machine.
+class SwitchDevice {
+  public:
+    SwitchDevice(std::uint8_t soft, std::uint8_t hard) {
+        int ends[2];
+        EXPECT_EQ(0, socketpair(AF_UNIX, SOCK_SEQPACKET | SOCK_CLOEXEC | SOCK_NONBLOCK, 0, ends));
+        kernel_ = Descriptor(ends[0]);
+        const rfkill_event event{4711, RFKILL_TYPE_WLAN, RFKILL_OP_ADD, soft, hard};
+        EXPECT_EQ(ssize_t{sizeof event}, write(ends[0], &event, sizeof event));
+        power_.emplace(Descriptor(ends[1]));
+    }
+    PowerSwitch takePower() { return std::move(*power_); }
+    /// What was last written to it.
+    std::optional<rfkill_event> wish() const {
+        rfkill_event event{};
+        if (read(kernel_.number(), &event, sizeof event) != ssize_t{sizeof event}) return std::nullopt;
+        return event;
+    }
+
+  private:
+    Descriptor kernel_;
+    std::optional<PowerSwitch> power_;
+};
+
+TEST(Session, LiftsABlockOfSoftware) {
+    SwitchDevice device(1, 0);
+    Conversation conversation(device.takePower());
+
+    conversation.say("{\"id\":1,\"request\":\"setPower\",\"power\":true}\n");
+
+    EXPECT_FALSE(setPowerAnswer(conversation.answer(1)));
+    const auto wish = device.wish();
+    ASSERT_TRUE(wish);
+    EXPECT_EQ(0, wish->soft);
+}
+
+TEST(Session, SaysThatNoSoftwareLiftsABlockOfHardware) {
+    SwitchDevice device(0, 1);
+    Conversation conversation(device.takePower());
+
+    conversation.say(
+        "{\"id\":1,\"request\":\"setPower\",\"power\":true}\n"
+        "{\"id\":2,\"request\":\"setPower\",\"power\":false}\n");
+
+    EXPECT_EQ("a switch on the device itself keeps it off (code 4)",
+              setPowerAnswer(conversation.answer(1)).value_or(Error()).text());
+    EXPECT_TRUE(device.wish()) << "for when the switch is moved";
+    EXPECT_FALSE(setPowerAnswer(conversation.answer(2)));
 }
 
 TEST(Session, AnswersEachRequestOnceWhateverIsCancelledMeanwhile) {

@@ -74,6 +74,11 @@ TEST(SwitchEvent, IsBlockedByEitherBlock) {
     EXPECT_TRUE(blocked(0, 1));
 }
 
+TEST(SwitchEvent, TellsABlockThatSoftwareCannotLift) {
+    EXPECT_TRUE(readSwitchEvent(bytesOf({4, RFKILL_TYPE_WLAN, RFKILL_OP_ADD, 1, 1}))->byHardware);
+    EXPECT_FALSE(readSwitchEvent(bytesOf({4, RFKILL_TYPE_WLAN, RFKILL_OP_ADD, 1, 0}))->byHardware);
+}
+
 TEST(SwitchEvent, IsReadInItsLaterLongerForm) {
     const auto event = readSwitchEvent(bytesOf({4, RFKILL_TYPE_WLAN, RFKILL_OP_DEL, 0, 0}, 1));
 

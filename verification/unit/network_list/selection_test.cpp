@@ -53,6 +53,20 @@ TEST_F(Neighbourhood, ChoosingWithNothingSelectedPutsNothingBack) {
     EXPECT_EQ(run.repairs(), 0);
 }
 
+TEST_F(Neighbourhood, AnOpenQuestionForTheNetworkThatIsSelectedMeanwhileShowsItOnce) {
+    run.showList();
+    run.choose("Cafe");
+
+    run.join("Cafe", "2");
+    run.controller->displayNetworkList();
+    run.device.queues.runReady();
+    run.press({Key::select});
+    run.device.queues.runMain();
+
+    EXPECT_EQ(run.selected(), "Cafe");
+    EXPECT_EQ(run.list(), "(SELECTED_NETWORK) >Cafe / (CHOOSE_NETWORK) ~Home, ~Zoo / ~OTHER / ~REFRESH");
+}
+
 TEST_F(Neighbourhood, ChoosingPutsTheNetworkSelectedBeforeBackInItsSortedPlace) {
     showJoined();
 
