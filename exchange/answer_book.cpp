@@ -27,11 +27,14 @@ bool isDeviceTest(int test) {
     return std::find(deviceTests.begin(), deviceTests.end(), test) != deviceTests.end();
 }
 
-std::optional<std::string> networkOfRequest(int test, const DictionaryPointer& configuration) {
+std::optional<std::string> networkNameIn(const DictionaryPointer& configuration) {
     std::optional<Value> name = configuration ? configuration->value("NetworkName") : std::nullopt;
     const auto* text = name ? name->as<std::string>() : nullptr;
-    if (!text || isDeviceTest(test)) return std::nullopt;
-    return *text;
+    return text ? std::optional(*text) : std::nullopt;
+}
+
+std::optional<std::string> networkOfRequest(int test, const DictionaryPointer& configuration) {
+    return isDeviceTest(test) ? std::nullopt : networkNameIn(configuration);
 }
 
 AnswerBook::AnswerBook(const std::vector<RecordedAnswer>& answers) {

@@ -14,7 +14,10 @@ namespace wp {
 /// depend on a network. *Any* thread.
 bool isDeviceTest(int test);
 
-/// The network that a test request is about: the configuration's "NetworkName"; nothing where it has none,
+/// The configuration's "NetworkName"; nothing where it has none. *Any* thread.
+std::optional<std::string> networkNameIn(const DictionaryPointer& configuration);
+
+/// The network that a test request is about: the one that its configuration names; nothing where it names none,
 /// and for a test of the device's configuration. *Any* thread.
 std::optional<std::string> networkOfRequest(int test, const DictionaryPointer& configuration);
 

@@ -17,16 +17,19 @@ struct Option {
     const char* name;
     Takes takes;
     const char* placeholder;
-    const char* help;
     void (*apply)(Options&, const std::string& value);
+    const char* help;
 };
 
-constexpr const char* kDefaultDemo = "home";
 /// A run ends in minutes; a day leaves room and keeps every sum of moments far from overflow.
 constexpr double kLongestTimeoutSeconds = 86400;
 
 std::string quoted(const std::string& text) {
     return '"' + text + '"';
+}
+
+std::string demoFrom(const std::string& text) {
+    return text.empty() ? "home" : text;
 }
 
 std::chrono::milliseconds timeoutFrom(const std::string& text) {
@@ -59,76 +62,85 @@ OutputFormat reportFormatFrom(const std::string& text) {
     refuse("--format: " + quoted(text) + " is no format of a report; give text or html");
 }
 
-// clang-format off
-const Option<RunOptions> kRunOptions[] = {
-    {"--request", Takes::value, "FILE", "the request's parameters as a JSON object (-: standard input)",
-     [](RunOptions& o, const std::string& v) { o.requestFile = v; }},
-    {"--max-scan-cache-age", Takes::value, "N", "accept scans up to N seconds old, 0 to 600 (default 60)",
-     [](RunOptions& o, const std::string& v) { o.maxScanCacheAge = v; }},
-    {"--list", Takes::nothing, "", "show the list of networks and let the user choose",
-     [](RunOptions& o, const std::string&) { o.list = true; }},
-    {"--network", Takes::value, "NAME", "profile this network beside the joined one",
-     [](RunOptions& o, const std::string& v) { o.network = v; }},
-    {"--replay", Takes::value, "FILE", "take all answers from a recording instead of this machine",
-     [](RunOptions& o, const std::string& v) { o.replayFile = v; }},
-    {"--demo", Takes::optionalValue, "NAME", "replay a recording that ships with the program (default home)",
-     [](RunOptions& o, const std::string& v) { o.demo = v.empty() ? kDefaultDemo : v; }},
-    {"--record", Takes::value, "FILE", "write what platform and service answered as a recording",
-     [](RunOptions& o, const std::string& v) { o.recordFile = v; }},
-    {"--anonymise", Takes::nothing, "", "replace names and addresses in the recording consistently",
-     [](RunOptions& o, const std::string&) { o.anonymise = true; }},
-    {"--interface", Takes::value, "NAME", "the Wi-Fi interface to look at, where there are several",
-     [](RunOptions& o, const std::string& v) { o.interfaceName = v; }},
-    {"--timeout", Takes::value, "SECONDS", "end the run after that long at the latest",
-     [](RunOptions& o, const std::string& v) { o.timeout = timeoutFrom(v); }},
-    {"--config", Takes::value, "FILE", "endpoints, vendors, thresholds and capabilities (JSON)",
-     [](RunOptions& o, const std::string& v) { o.configFile = v; }},
-    {"--show-endpoints", Takes::nothing, "", "print what a live run would contact, and end",
-     [](RunOptions& o, const std::string&) { o.showEndpoints = true; }},
-    {"--screen", Takes::value, "SCREEN", "tv, terminal, headless, none or auto (default)",
-     [](RunOptions& o, const std::string& v) { o.screen = screenFrom(v); }},
-    {"--no-closing-page", Takes::nothing, "", "end at once instead of showing the outcome on the screen",
-     [](RunOptions& o, const std::string&) { o.noClosingPage = true; }},
-    {"--remote", Takes::value, "SCRIPT", "remote-control keys to press (@FILE: from a file)",
-     [](RunOptions& o, const std::string& v) { o.remote = v; }},
-    {"--transcript", Takes::value, "FILE", "the snapshots that the script asks for (-: standard output)",
-     [](RunOptions& o, const std::string& v) { o.transcriptFile = v; }},
-    {"--automation", Takes::value, "FILE", "enable test automation; what is posted to it is written there",
-     [](RunOptions& o, const std::string& v) { o.automationFile = v; }},
-    {"--locale", Takes::value, "NAME", "language of the screen: en, de, ja or x-keys",
-     [](RunOptions& o, const std::string& v) { o.locale = v; }},
-    {"--output", Takes::value, "FILE", "write the result there instead of to standard output",
-     [](RunOptions& o, const std::string& v) { o.outputFile = v; }},
-    {"--format", Takes::value, "FORMAT", "json (default) or text",
-     [](RunOptions& o, const std::string& v) { o.format = formatFrom(v); }},
-    {"--extension", Takes::value, "PATH", "the diagnostic's module, where it is not beside the program",
-     [](RunOptions& o, const std::string& v) { o.extension = v; }},
-};
-// clang-format on
+std::string asGiven(const std::string& text) {
+    return text;
+}
+
+/// What becomes of a row's value: the member takes it as a function reads it.
+template <auto member, auto read = asGiven>
+constexpr auto into = [](auto& options, const std::string& value) { options.*member = read(value); };
+
+template <auto member>
+constexpr auto on = [](auto& options, const std::string&) { options.*member = true; };
 
 // clang-format off
+const Option<RunOptions> kRunOptions[] = {
+    {"--request",            Takes::value,         "FILE",    into<&RunOptions::requestFile>,
+     "the request's parameters as a JSON object (-: standard input)"},
+    {"--max-scan-cache-age", Takes::value,         "N",       into<&RunOptions::maxScanCacheAge>,
+     "accept scans up to N seconds old, 0 to 600 (default 60)"},
+    {"--list",               Takes::nothing,       "",        on<&RunOptions::list>,
+     "show the list of networks and let the user choose"},
+    {"--network",            Takes::value,         "NAME",    into<&RunOptions::network>,
+     "profile this network beside the joined one"},
+    {"--replay",             Takes::value,         "FILE",    into<&RunOptions::replayFile>,
+     "take all answers from a recording instead of this machine"},
+    {"--demo",               Takes::optionalValue, "NAME",    into<&RunOptions::demo, demoFrom>,
+     "replay a recording that ships with the program (default home)"},
+    {"--record",             Takes::value,         "FILE",    into<&RunOptions::recordFile>,
+     "write what platform and service answered as a recording"},
+    {"--anonymise",          Takes::nothing,       "",        on<&RunOptions::anonymise>,
+     "replace names and addresses in the recording consistently"},
+    {"--interface",          Takes::value,         "NAME",    into<&RunOptions::interfaceName>,
+     "the Wi-Fi interface to look at, where there are several"},
+    {"--timeout",            Takes::value,         "SECONDS", into<&RunOptions::timeout, timeoutFrom>,
+     "end the run after that long at the latest"},
+    {"--config",             Takes::value,         "FILE",    into<&RunOptions::configFile>,
+     "endpoints, vendors, thresholds and capabilities (JSON)"},
+    {"--show-endpoints",     Takes::nothing,       "",        on<&RunOptions::showEndpoints>,
+     "print what a live run would contact, and end"},
+    {"--screen",             Takes::value,         "SCREEN",  into<&RunOptions::screen, screenFrom>,
+     "tv, terminal, headless, none or auto (default)"},
+    {"--no-closing-page",    Takes::nothing,       "",        on<&RunOptions::noClosingPage>,
+     "end at once instead of showing the outcome on the screen"},
+    {"--remote",             Takes::value,         "SCRIPT",  into<&RunOptions::remote>,
+     "remote-control keys to press (@FILE: from a file)"},
+    {"--transcript",         Takes::value,         "FILE",    into<&RunOptions::transcriptFile>,
+     "the snapshots that the script asks for (-: standard output)"},
+    {"--automation",         Takes::value,         "FILE",    into<&RunOptions::automationFile>,
+     "enable test automation; what is posted to it is written there"},
+    {"--locale",             Takes::value,         "NAME",    into<&RunOptions::locale>,
+     "language of the screen: en, de, ja or x-keys"},
+    {"--output",             Takes::value,         "FILE",    into<&RunOptions::outputFile>,
+     "write the result there instead of to standard output"},
+    {"--format",             Takes::value,         "FORMAT",  into<&RunOptions::format, formatFrom>,
+     "json (default) or text"},
+    {"--extension",          Takes::value,         "PATH",    into<&RunOptions::extension>,
+     "the diagnostic's module, where it is not beside the program"},
+};
+
 const Option<ReportOptions> kReportOptions[] = {
-    {"--format", Takes::value, "FORMAT", "text (default) or html, one page on its own",
-     [](ReportOptions& o, const std::string& v) { o.format = reportFormatFrom(v); }},
-    {"--all", Takes::nothing, "", "every test, not only the findings",
-     [](ReportOptions& o, const std::string&) { o.all = true; }},
-    {"--compare", Takes::value, "OLD", "what changed since this earlier result or recording (or -)",
-     [](ReportOptions& o, const std::string& v) { o.compareFile = v; }},
-    {"--locale", Takes::value, "NAME", "language of the report: en, de, ja or x-keys",
-     [](ReportOptions& o, const std::string& v) { o.locale = v; }},
-    {"--config", Takes::value, "FILE", "the thresholds that the run went by (JSON)",
-     [](ReportOptions& o, const std::string& v) { o.configFile = v; }},
-    {"--output", Takes::value, "FILE", "write the report there instead of to standard output",
-     [](ReportOptions& o, const std::string& v) { o.outputFile = v; }},
-    {"--extension", Takes::value, "PATH", "the diagnostic's module, where it is not beside the program",
-     [](ReportOptions& o, const std::string& v) { o.extension = v; }},
+    {"--format",             Takes::value,         "FORMAT",  into<&ReportOptions::format, reportFormatFrom>,
+     "text (default) or html, one page on its own"},
+    {"--all",                Takes::nothing,       "",        on<&ReportOptions::all>,
+     "every test, not only the findings"},
+    {"--compare",            Takes::value,         "OLD",     into<&ReportOptions::compareFile>,
+     "what changed since this earlier result or recording (or -)"},
+    {"--locale",             Takes::value,         "NAME",    into<&ReportOptions::locale>,
+     "language of the report: en, de, ja or x-keys"},
+    {"--config",             Takes::value,         "FILE",    into<&ReportOptions::configFile>,
+     "the thresholds that the run went by (JSON)"},
+    {"--output",             Takes::value,         "FILE",    into<&ReportOptions::outputFile>,
+     "write the report there instead of to standard output"},
+    {"--extension",          Takes::value,         "PATH",    into<&ReportOptions::extension>,
+     "the diagnostic's module, where it is not beside the program"},
 };
 
 const Option<ReportOptions> kTestsOptions[] = {
-    {"--locale", Takes::value, "NAME", "language of the catalogue: en, de, ja or x-keys",
-     [](ReportOptions& o, const std::string& v) { o.locale = v; }},
-    {"--config", Takes::value, "FILE", "thresholds other than the program's own (JSON)",
-     [](ReportOptions& o, const std::string& v) { o.configFile = v; }},
+    {"--locale",             Takes::value,         "NAME",    into<&ReportOptions::locale>,
+     "language of the catalogue: en, de, ja or x-keys"},
+    {"--config",             Takes::value,         "FILE",    into<&ReportOptions::configFile>,
+     "thresholds other than the program's own (JSON)"},
 };
 // clang-format on
 

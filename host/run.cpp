@@ -19,7 +19,6 @@
 #include "host/interruption.h"
 #include "host/output_file.h"
 #include "host/preparation.h"
-#include "host/progress_client.h"
 #include "host/report/journal.h"
 #include "host/report/report.h"
 #include "host/report/text_form.h"
@@ -67,13 +66,12 @@ class Run {
           backgroundQueue_(activity_, purpose == Purpose::evidence ? BackgroundQueue::Delays::skipped
                                                                    : BackgroundQueue::Delays::kept),
           services_(makeServices(options, prepared, mainQueue_, log_)),
-          journal_(services_->diagnosticsClient()),
-          progress_(journal_, [this](const TestStep& step) { onTest(step); }),
+          journal_(services_->diagnosticsClient(), [this](const TestStep& step) { onTest(step); }),
           automation_(services_->isAutomated() || options.automationFile, prepared.automation),
           localization_(prepared.locale),
           texts_(prepared.locale.stringTable),
           screen_([this](std::string_view line) { log_.note(line); }),
-          platform_{progress_,
+          platform_{journal_,
                     services_->wifiManager(),
                     services_->capabilities(),
                     automation_,
@@ -88,7 +86,7 @@ class Run {
 
     /// What a failure on the way left running ends before anything that it uses goes.
     ~Run() {
-        if (isUnderWay_) progress_.cancelAllRequests();
+        if (isUnderWay_) journal_.cancelAllRequests();
         backgroundQueue_.drain(BackgroundQueue::Delayed::drop);
         mainQueue_.close();
         // Its thread reaches for the services.
@@ -148,7 +146,6 @@ class Run {
     BackgroundQueue backgroundQueue_;
     std::unique_ptr<Services> services_;
     Journal journal_;
-    ProgressClient progress_;
     AutomationFile automation_;
     IcuLocalization localization_;
     Texts texts_;
@@ -166,7 +163,7 @@ void Run::onInterrupted() {
     log_.mute();
     if (isUnderWay_) {
         services_->stopRecording();
-        progress_.cancelAllRequests();
+        journal_.cancelAllRequests();
     }
     mainQueue_.wake();
 }

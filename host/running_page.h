@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/host_page.h"
-#include "host/progress_client.h"
+#include "host/report/journal.h"
 #include "host/report/texts.h"
 
 namespace wp::host {

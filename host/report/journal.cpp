@@ -1,10 +1,15 @@
 #include "host/report/journal.h"
 
+#include <algorithm>
+
 #include "exchange/answer_book.h"
+#include "host/report/catalogue.h"
+#include "host/report/planned_tests.h"
 
 namespace wp::host {
 
 DiagnosticsTestResponse Journal::runTestRequests(const std::vector<DiagnosticsTestRequest>& requests) {
+    for (const DiagnosticsTestRequest& request : requests) tell(request);
     DiagnosticsTestResponse response = client_.runTestRequests(requests);
     // A response to several requests does not say which test it is about; the diagnostic asks for one.
     if (requests.size() != 1) return response;
@@ -22,6 +27,20 @@ DiagnosticsStatusResponse Journal::queryStatus() {
         joinedName_ = response.status->ssid;
     }
     return response;
+}
+
+void Journal::tell(const DiagnosticsTestRequest& request) {
+    const CatalogueEntry* entry = catalogueEntry(request.testID);
+    if (!entry || entry->scope == TestScope::list) return;
+    TestStep step{request.testID, entry->name};
+    {
+        std::lock_guard lock(mutex_);
+        // The device's tests come first, and their configuration names the selected network where there is one.
+        if (begun_ == 0) planned_ = plannedTests(joinedName_, networkNameIn(request.configuration));
+        step.number = ++begun_;
+        step.count = std::max(planned_, begun_);
+    }
+    observer_(step);
 }
 
 Evidence Journal::evidence(std::int64_t statusCode, const DictionaryPointer& data) const {

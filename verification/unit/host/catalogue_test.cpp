@@ -5,8 +5,8 @@
 #include <map>
 #include <set>
 
-#include "host/progress_client.h"
 #include "host/report/catalogue_text.h"
+#include "host/report/planned_tests.h"
 
 namespace wp::host {
 namespace {

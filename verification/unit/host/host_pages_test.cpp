@@ -199,28 +199,5 @@ TEST(RunningPage, SaysWhichTestIsRunningInTheViewersLanguage) {
     EXPECT_TRUE(viewer.notes.empty());
 }
 
-TEST(ProgressClient, CountsTheTestsOfTheRunAndPassesThemOn) {
-    fakes::FakeDiagnosticsClient service;
-    service.setJoinedNetwork("Home");
-    std::vector<std::string> told;
-    ProgressClient client(service, [&](const TestStep& step) {
-        told.push_back(std::to_string(step.testID) + " " + std::to_string(step.number) + "/" +
-                       std::to_string(step.count));
-    });
-    auto request = [](int testID) {
-        DiagnosticsTestRequest made;
-        made.testID = testID;
-        return std::vector{made};
-    };
-
-    client.queryStatus();
-    client.runTestRequests(request(31));
-    client.runTestRequests(request(14));
-    client.runTestRequests(request(19));
-
-    EXPECT_THAT(told, ElementsAre("14 1/40", "19 2/40"));
-    EXPECT_THAT(service.requestedTestIDs(), ElementsAre(31, 14, 19));
-}
-
 }  // namespace
 }  // namespace wp::host

@@ -1,5 +1,6 @@
 #include "host/report/report.h"
 
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include <algorithm>
@@ -395,7 +396,7 @@ TEST(Journal, KeepsWhatWasAnsweredAboutWhichNetwork) {
     client.setJoinedNetwork("Home");
     client.setOutcome(3, fakes::failure(2, "no default route"));
     client.setOutcome(14, fakes::outcome(true, false, Dictionary::make({{"IPv4ConfigMethod", "manual"}})));
-    Journal journal(client);
+    Journal journal(client, [](const TestStep&) {});
 
     journal.queryStatus();
     DictionaryPointer named = Dictionary::make({{"NetworkName", "Office"}});
@@ -412,6 +413,29 @@ TEST(Journal, KeepsWhatWasAnsweredAboutWhichNetwork) {
     EXPECT_EQ(answerTo(evidence, Part::joined, 3)->error->code, 2);
     EXPECT_FALSE(answerTo(evidence, Part::joined, 32));
     EXPECT_TRUE(answerTo(evidence, Part::selected, 32));
+}
+
+TEST(Journal, CountsTheTestsOfTheRunAndPassesThemOn) {
+    fakes::FakeDiagnosticsClient service;
+    service.setJoinedNetwork("Home");
+    std::vector<std::string> told;
+    Journal journal(service, [&](const TestStep& step) {
+        told.push_back(std::to_string(step.testID) + " " + std::to_string(step.number) + "/" +
+                       std::to_string(step.count));
+    });
+    auto request = [](int testID) {
+        DiagnosticsTestRequest made;
+        made.testID = testID;
+        return std::vector{made};
+    };
+
+    journal.queryStatus();
+    journal.runTestRequests(request(31));
+    journal.runTestRequests(request(14));
+    journal.runTestRequests(request(19));
+
+    EXPECT_THAT(told, testing::ElementsAre("14 1/40", "19 2/40"));
+    EXPECT_THAT(service.requestedTestIDs(), testing::ElementsAre(31, 14, 19));
 }
 
 TEST(Wrapping, LinesBreakWhereTheLanguageAllowsIt) {
