@@ -14,7 +14,9 @@ import sys
 import jsonschema
 
 ROOT = pathlib.Path(__file__).resolve().parents[2]
-SCHEMA = ROOT / "docs/result.schema.json"
+sys.path.insert(0, str(ROOT / "verification/lab"))
+from scenario_runner.schema import SCHEMA, breaches  # noqa: E402
+
 PAGE = ROOT / "docs/result_document.md"
 CASES = ROOT / "verification/cases"
 FLEET = ROOT / "verification/fleet/results"
@@ -34,28 +36,6 @@ OBJECTS = {
     "data/currentNetwork/pingLANResult": "pingResult",
 }
 
-schema = json.loads(SCHEMA.read_text(encoding="utf-8"))
-validator = jsonschema.Draft202012Validator(schema)
-
-
-def misplaced(error):
-    """The places of what an object holds and should not, or lacks and should hold."""
-    here = list(error.absolute_path)
-    if error.validator == "required":
-        return [here + [key] for key in error.validator_value if key not in error.instance]
-    if error.validator == "additionalProperties":
-        return [here + [key] for key in error.instance if key not in error.schema["properties"]]
-    if "propertyNames" in error.absolute_schema_path:
-        return [here + [error.instance]]
-    return [here]
-
-
-def places(result):
-    """Where the result breaks the schema, sorted."""
-    found = {"/".join(map(str, place)) for error in validator.iter_errors(result) for place in misplaced(error)}
-    return sorted(found)
-
-
 def expected_results():
     """Name of the case, file and result, for every result among the files that the cases expect and in the fleet."""
     for file in sorted([*CASES.glob("*/expected/*"), *FLEET.glob("*/*")]):
@@ -69,8 +49,8 @@ def check_expected():
     if not results:
         yield "no case expects a result"
     for case, file, result in results:
-        if places(result) != ODD.get(case, []):
-            yield f"{file.relative_to(ROOT)}: breaks the schema at {places(result)}, not at {ODD.get(case, [])}"
+        if breaches(result) != ODD.get(case, []):
+            yield f"{file.relative_to(ROOT)}: breaks the schema at {breaches(result)}, not at {ODD.get(case, [])}"
 
 
 def check_demos(program):
@@ -80,8 +60,8 @@ def check_demos(program):
         output, error = run.communicate()
         if run.returncode != 0:
             yield f"demo {name}: ended with {run.returncode}: {error.decode()}"
-        elif places(json.loads(output)):
-            yield f"demo {name}: breaks the schema at {places(json.loads(output))}"
+        elif breaches(json.loads(output)):
+            yield f"demo {name}: breaks the schema at {breaches(json.loads(output))}"
 
 
 ABSENT = object()
@@ -103,19 +83,19 @@ def changed(result, at, value):
 def check_refusals(good):
     for change in json.loads(REFUSED.read_text(encoding="utf-8"))["changes"]:
         at = change["at"]
-        if places(changed(good, at, change["value"])) != [at]:
-            yield f"{change['why']}: {at} = {change['value']!r} breaks {places(changed(good, at, change['value']))}"
+        if breaches(changed(good, at, change["value"])) != [at]:
+            yield f"{change['why']}: {at} = {change['value']!r} breaks {breaches(changed(good, at, change['value']))}"
     for at in ("unknown", "data/unknown", *(f"{place}/unknown" for place in OBJECTS)):
-        if places(changed(good, at, 1)) != [at]:
+        if breaches(changed(good, at, 1)) != [at]:
             yield f"{at}: a key that is not explained is let in"
     for at in ("statusCode", "data", "data/device", "data/currentNetwork", "data/selectedNetwork"):
-        if places(changed(good, at, ABSENT)) != [at]:
+        if breaches(changed(good, at, ABSENT)) != [at]:
             yield f"{at}: may be missing"
 
 
 def allowed_at():
     """Place in a full result -> key -> (type word of the page, whether it may be null), as the schema has them."""
-    kinds = schema["$defs"]
+    kinds = SCHEMA["$defs"]
     allowed = {place: {key: type_of(rule) for key, rule in kinds[kind]["properties"].items()}
                for place, kind in OBJECTS.items()}
     for key in kinds["selectedNetwork"]["propertyNames"]["not"]["enum"]:
@@ -125,7 +105,7 @@ def allowed_at():
 
 def type_of(rule):
     if "$ref" in rule:
-        rule = schema["$defs"][rule["$ref"].rsplit("/", 1)[1]]
+        rule = SCHEMA["$defs"][rule["$ref"].rsplit("/", 1)[1]]
     types = rule["type"] if isinstance(rule["type"], list) else [rule["type"]]
     return {"object": "dictionary"}.get(types[0], types[0]), "null" in types
 
@@ -159,15 +139,15 @@ def check_page():
             if page[place].get(key) != allowed[place].get(key):
                 yield f"{place}/{key}: page {page[place].get(key)}, schema {allowed[place].get(key)}"
     codes = {int(code) for code in re.findall(r"^\| (-?\d) \|", PAGE.read_text(encoding="utf-8"), re.MULTILINE)}
-    if codes != set(schema["properties"]["statusCode"]["enum"]):
+    if codes != set(SCHEMA["properties"]["statusCode"]["enum"]):
         yield f"statusCode: page {sorted(codes)}"
     names = (ROOT / "service/security.cpp").read_text(encoding="utf-8").partition("nameOf(")[2]
-    if set(re.findall(r'return "([^"]+)"', names)) != set(schema["$defs"]["currentNetwork"]["properties"]["security"]["enum"]):
+    if set(re.findall(r'return "([^"]+)"', names)) != set(SCHEMA["$defs"]["currentNetwork"]["properties"]["security"]["enum"]):
         yield "security: not the names that service/security.cpp gives"
 
 
 def main():
-    jsonschema.Draft202012Validator.check_schema(schema)
+    jsonschema.Draft202012Validator.check_schema(SCHEMA)
     good = json.loads(FULLEST.read_text(encoding="utf-8"))
     faults = [*check_page(), *check_expected(), *check_demos(sys.argv[1]), *check_refusals(good)]
     for fault in faults:
