@@ -5,10 +5,6 @@
 namespace wp {
 namespace {
 
-bool inside(const IPAddress& address) {
-    return address.privateUse() || address.sharedUse();
-}
-
 using Basis = TranslationBasis;
 
 TranslationVerdict verdict(bool twice, Basis basis, std::string why) {
@@ -42,7 +38,9 @@ Known<TranslationVerdict> judgeTranslation(const TranslationEvidence& evidence) 
     if (!translated)
         return verdict(false, Basis::noInnerAddress, "the interface has no private IPv4 address");
     const auto& external = evidence.gatewayExternal;
-    if (external && inside(*external))
+    if (external && external->sharedUse())
+        return verdict(true, Basis::routerShared, "carrier-grade: " + external->text());
+    if (external && external->privateUse())
         return verdict(true, Basis::routerInside, "the router is inside too: " + external->text());
     if (external && evidence.mapped) {
         const bool differ = *external != *evidence.mapped;

@@ -28,6 +28,7 @@ struct TranslationEvidence {
 enum class TranslationBasis {
     noInnerAddress,
     routerInside,
+    routerShared,  ///< the router has an address that providers share out
     twoOuterAddresses,
     routerOutside,
     hops,

@@ -32,8 +32,9 @@ std::string_view wordOf(CertificateFault fault) {
 }
 
 std::string_view wordOf(TranslationBasis basis) {
-    constexpr std::string_view kWords[] = {"noInnerAddress", "routerInside", "twoOuterAddresses",
-                                           "routerOutside",  "hops",         "sharedHop"};
+    constexpr std::string_view kWords[] = {"noInnerAddress",    "routerInside",  "routerShared",
+                                           "twoOuterAddresses", "routerOutside", "hops",
+                                           "sharedHop"};
     return kWords[static_cast<std::size_t>(basis)];
 }
 

@@ -75,6 +75,11 @@ bool isPartial(const View& view) {
     return textIn(detailsOf(view.evidence, Part::joined, 46), "connectivity") == "partial";
 }
 
+bool isTranslatedByProvider(const View& view) {
+    std::optional<std::string> basis = textIn(detailsOf(view.evidence, Part::joined, 8), "judgedBy");
+    return view.yes(8) && (basis == "routerShared" || basis == "sharedHop");
+}
+
 /// The service's codes of errors.
 constexpr int kNoInterface = 1, kNotJoined = 2, kNotFound = 3;
 
@@ -152,6 +157,7 @@ const CauseRow kOthers[] = {
      [](const View& v) { return v.yes(26) && isWhereBandIsFull(v, kHighest2GHzChannel + 1, kHighestChannel); }},
     {{"NOT_SEEN", nullptr, 34, selected, problem, viewer, {38, 39, 40, 41, 42, 43, 44, 46, 45, 36, 37, 33, 24, 28, 32}}, isNotSeen},
     {{"REMEMBERED_PORTAL", nullptr, 46, selected, notice, viewer, {}}, [](const View& v) { return v.checks.yes(46, selected); }},
+    {{"CARRIER", nullptr, 8, joined, advice, provider, {}}, isTranslatedByProvider},
     {{"T38", nullptr, 38, joined, advice, routerOwner, {}},
      [](const View& v) { return v.yes(38) && (v.yes(44) || v.yes(45) || v.yes(46)); }},
     {{"T20", nullptr, 20, device, advice, viewer, {19}},

@@ -171,12 +171,22 @@ void Collector::addQuietest() {
     if (!all.empty()) add("FACT_QUIETEST", all);
 }
 
+ReportedFact remarkOf(const ReportedFinding& finding, const Texts& texts) {
+    std::string value = finding.what + texts.space() + finding.means;
+    if (finding.doer != Doer::nobody) value += texts.space() + finding.advice;
+    return {finding.parts.front(), texts.text(testKey(finding.testID, "NAME")),
+            value + texts.aside(finding.measured)};
+}
+
 }  // namespace
 
-std::vector<ReportedFact> factsOf(const ReportInput& input) {
+std::vector<ReportedFact> factsOf(const ReportInput& input, std::span<const ReportedFinding> remarks) {
     std::vector<ReportedFact> facts;
-    for (Part part : {Part::joined, Part::selected})
-        if (wasTested(input.evidence, part)) Collector(input, part, facts).collect();
+    for (Part part : {Part::device, Part::joined, Part::selected}) {
+        if (part != Part::device && wasTested(input.evidence, part)) Collector(input, part, facts).collect();
+        for (const ReportedFinding& remark : remarks)
+            if (remark.parts.front() == part) facts.push_back(remarkOf(remark, input.texts));
+    }
     return facts;
 }
 

@@ -43,7 +43,8 @@ std::string wholeWithoutOutage(const ReportInput& input, const std::vector<Repor
     }
     if (problems > 0) return counted("WHOLE_PROBLEMS", problems, names, texts);
     if (ofSelected > 0) return counted("WHOLE_SELECTED", ofSelected, names, texts);
-    return advice == 0 ? texts.text("WHOLE_FINE", names) : counted("WHOLE_ADVICE", advice, names, texts);
+    if (advice > 0) return counted("WHOLE_ADVICE", advice, names, texts);
+    return texts.text(input.evidence.hasAnswers ? "WHOLE_FINE" : "WHOLE_FINE_RESULT", names);
 }
 
 std::string wholeText(const ReportInput& input, const std::vector<ReportedFinding>& findings) {
@@ -107,9 +108,12 @@ Report makeReport(const Evidence& evidence, const Thresholds& thresholds, const 
     Report report;
     report.title = texts.text("TITLE");
     report.findings = findingsOf(input);
+    // Sorted: what is only worth knowing comes last.
+    auto remarks = std::ranges::find(report.findings, Severity::notice, &ReportedFinding::severity);
+    report.facts = factsOf(input, {remarks, report.findings.end()});
+    report.findings.erase(remarks, report.findings.end());
     report.summary = wholeText(input, report.findings);
     report.untold = untoldOf(input);
-    report.facts = factsOf(input);
     for (const Check& check : checks.all()) report.tests.push_back(testOf(input, check));
     if (wasTested(evidence, Part::joined)) report.joinedName = networkText(evidence.joinedName, texts);
     if (wasTested(evidence, Part::selected)) report.selectedName = networkText(evidence.selectedName, texts);
@@ -119,7 +123,7 @@ Report makeReport(const Evidence& evidence, const Thresholds& thresholds, const 
 ClosingSummary closingSummary(const Report& report) {
     ClosingSummary closing{report.summary, {}};
     for (const ReportedFinding& finding : report.findings) {
-        if (closing.findings.size() == kClosingFindings || finding.severity == Severity::notice) break;
+        if (closing.findings.size() == kClosingFindings) break;
         closing.findings.push_back(finding);
     }
     return closing;

@@ -57,9 +57,10 @@ struct ReportedTest {
 
 struct Report {
     std::string title;
-    std::string summary;                    ///< one sentence on the whole
-    std::optional<Comparison> comparison;   ///< what changed; absent: no earlier run was given
-    std::vector<ReportedFinding> findings;  ///< the worst first
+    std::string summary;                   ///< one sentence on the whole
+    std::optional<Comparison> comparison;  ///< what changed; absent: no earlier run was given
+    std::vector<ReportedFinding>
+        findings;  ///< the worst first; what is only worth knowing is among the facts
     std::vector<Untold> untold;
     std::vector<ReportedFact> facts;
     std::vector<ReportedTest> tests;  ///< in the order of the run
@@ -70,8 +71,7 @@ struct Report {
 /// Makes a report. The same evidence gives the same report. *Any*.
 Report makeReport(const Evidence& evidence, const Thresholds& thresholds, const Texts& texts);
 
-/// For the last screen of a run: the sentence on the whole and the first of the findings, three at most. What is
-/// only worth knowing is left out. *Any*.
+/// For the last screen of a run: the sentence on the whole and the first of the findings, three at most. *Any*.
 struct ClosingSummary {
     std::string summary;
     std::vector<ReportedFinding> findings;

@@ -11,7 +11,7 @@ constexpr int kIndent = 4;
 
 class Writer {
   public:
-    Writer(const Texts& texts, TextForm::Style style) : texts_(texts), style_(style) {}
+    explicit Writer(TextForm::Style style) : style_(style) {}
 
     void heading(const std::string& text) {
         out_ += "\n" + bold(text) + "\n" + std::string(static_cast<std::size_t>(columnsOf(text)), '-') + "\n";
@@ -49,7 +49,6 @@ class Writer {
         }
     }
 
-    const Texts& texts_;
     TextForm::Style style_;
     std::string out_;
 };
@@ -57,7 +56,7 @@ class Writer {
 class ReportWriter {
   public:
     ReportWriter(const Report& report, const Evidence& evidence, const TextForm& form, const Texts& texts)
-        : report_(report), evidence_(evidence), form_(form), texts_(texts), writer_(texts, form.style) {}
+        : report_(report), evidence_(evidence), form_(form), texts_(texts), writer_(form.style) {}
 
     std::string write() {
         writer_.strongParagraph(report_.title);
@@ -89,8 +88,8 @@ class ReportWriter {
     }
 
     void writeFindings() {
+        if (report_.findings.empty()) return;  // the sentence on the whole has said so
         writer_.heading(texts_.text("FINDINGS"));
-        if (report_.findings.empty()) writer_.paragraph(texts_.text("NO_FINDINGS"));
         std::size_t number = 0;
         for (const ReportedFinding& finding : report_.findings) {
             if (number > 0) writer_.gap();
@@ -105,10 +104,8 @@ class ReportWriter {
             place += " · " + texts_.text("TEST_NUMBER", {{"number", std::to_string(finding.testID)}});
         writer_.paragraph(place, kIndent);
         writer_.labelled(texts_.text("LABEL_MEASURED"), finding.measured);
-        if (finding.severity != Severity::notice) {
-            writer_.labelled(texts_.text("LABEL_LIMIT"), finding.threshold);
-            writer_.labelled(texts_.text("LABEL_SOURCE"), finding.source);
-        }
+        writer_.labelled(texts_.text("LABEL_LIMIT"), finding.threshold);
+        writer_.labelled(texts_.text("LABEL_SOURCE"), finding.source);
         writer_.labelled(texts_.text("LABEL_MEANS"), finding.means);
         if (!finding.follows.empty()) {
             writer_.paragraph(texts_.text("LABEL_FOLLOWS") + ":", kIndent);
@@ -156,8 +153,7 @@ class ReportWriter {
             if (!previous || previous->part != test.part)
                 writer_.paragraph(partText(evidence_, test.part, texts_));
             std::string number = std::to_string(test.testID);
-            std::string value = test.measured.empty() ? "" : " (" + test.measured + ")";
-            writer_.bullet(number + " " + test.question + " " + test.answer + value, 2);
+            writer_.bullet(number + " " + test.question + " " + test.answer + texts_.aside(test.measured), 2);
             previous = &test;
         }
     }

@@ -58,6 +58,11 @@ std::string Texts::space() const {
     return static_cast<unsigned char>(text("LIST_COMMA").back()) < 0x80 ? " " : "";
 }
 
+std::string Texts::aside(const std::string& text) const {
+    if (text.empty()) return "";
+    return space().empty() ? "（" + text + "）" : " (" + text + ")";
+}
+
 std::string Texts::list(const std::vector<std::string>& words) const {
     std::string all;
     for (const std::string& word : words) all += (all.empty() ? "" : text("LIST_COMMA") + space()) + word;

@@ -29,6 +29,9 @@ class Texts {
     /// What stands between two sentences: a blank, or nothing in a script without blanks.
     std::string space() const;
 
+    /// What follows another text in brackets of the language's script; nothing for nothing.
+    std::string aside(const std::string& text) const;
+
     /// The words one after another, with the language's comma between them.
     std::string list(const std::vector<std::string>& words) const;
 

@@ -35,6 +35,12 @@ bool isExplained(const std::vector<Cause>& causes, const Check& check) {
     });
 }
 
+/// A result alone does not tell some of what makes a network fail.
+bool seemsFineByResult(const ReportInput& input) {
+    bool isOut = std::ranges::any_of(input.causes, [](const Cause& cause) { return cause.whole != nullptr; });
+    return !isOut && !input.evidence.hasAnswers && wasTested(input.evidence, Part::joined);
+}
+
 Untold optedOut(const char* key, const Texts& texts) {
     return {texts.text(key), texts.text("REMEDY_OPTED_OUT"), {}};
 }
@@ -58,9 +64,11 @@ std::vector<Untold> untoldOf(const ReportInput& input) {
         if (isNew) all.push_back({texts.text("REASON_" + key), texts.text("REMEDY_" + key), {}});
         std::vector<std::string>& tests = all[place->second].tests;
         std::string name = texts.text(testKey(check.test->testID, "NAME"));
-        if (check.part == Part::selected) name += " (" + partText(input.evidence, check.part, texts) + ")";
+        if (check.part == Part::selected) name += texts.aside(partText(input.evidence, check.part, texts));
         tests.push_back(std::move(name));
     }
+    if (seemsFineByResult(input))
+        all.push_back({texts.text("REASON_RESULT_ALONE"), texts.text("REMEDY_RESULT_ALONE"), {}});
     return all;
 }
 

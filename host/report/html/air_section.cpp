@@ -145,7 +145,7 @@ class AirWriter {
         figure(std::to_string(number));
         markup_.open("td", {{"dir", "auto"}});
         markup_.text(nameOf(network));
-        if (own) markup_.text(" (" + texts_.text(network.joined ? "HTML_JOINED" : "HTML_SELECTED") + ")");
+        if (own) markup_.text(texts_.aside(texts_.text(network.joined ? "HTML_JOINED" : "HTML_SELECTED")));
         markup_.close();
         figure(std::to_string(network.channel));
         figure(texts_.text("HTML_WIDTH", {{"width", std::to_string(widthOf(network))}}));

@@ -79,9 +79,9 @@ class Page {
     }
 
     void writeFindings() {
+        if (report_.findings.empty()) return;  // the sentence on the whole has said so
         markup_.open("section");
         heading("FINDINGS");
-        if (report_.findings.empty()) markup_.element("p", texts_.text("NO_FINDINGS"));
         markup_.open("ol", {{"class", "findings"}});
         for (const ReportedFinding& finding : report_.findings) {
             markup_.raw("\n");
@@ -116,10 +116,8 @@ class Page {
         markup_.close();
         markup_.open("dl");
         labelled(texts_.text("LABEL_MEASURED"), finding.measured);
-        if (finding.severity != Severity::notice) {
-            labelled(texts_.text("LABEL_LIMIT"), finding.threshold);
-            labelled(texts_.text("LABEL_SOURCE"), finding.source);
-        }
+        labelled(texts_.text("LABEL_LIMIT"), finding.threshold);
+        labelled(texts_.text("LABEL_SOURCE"), finding.source);
         labelled(texts_.text("LABEL_MEANS"), finding.means);
         writeFollowers(finding.follows);
         if (finding.doer != Doer::nobody)
@@ -197,7 +195,7 @@ class Page {
             markup_.open("tr");
             markup_.element("td", std::to_string(test.testID), {{"class", "figure"}});
             markup_.element("td", test.question);
-            markup_.element("td", test.answer + (test.measured.empty() ? "" : " (" + test.measured + ")"));
+            markup_.element("td", test.answer + texts_.aside(test.measured));
             markup_.close();
             previous = &test;
         }

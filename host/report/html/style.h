@@ -44,12 +44,13 @@ figcaption { font-weight: 600; margin-bottom: .25rem; }
 .legend { color: var(--quiet); font-size: .9rem; margin-bottom: 1rem; }
 table { border-collapse: collapse; width: 100%; font-size: .9rem; }
 th, td { text-align: start; padding: .3rem .5rem .3rem 0; border-bottom: 1px solid var(--line); vertical-align: top; }
-th { color: var(--quiet); font-weight: 600; }
+td { min-width: 6.5rem; }
+th { color: var(--quiet); font-weight: 600; overflow-wrap: normal; }
 th[scope=row] { width: 9.5rem; }
+th[scope=col] { white-space: nowrap; }
 figure table { margin-top: .5rem; }
 td.figure, th.figure { text-align: end; }
-td.figure { font-variant-numeric: tabular-nums; white-space: nowrap; }
-td[dir] { min-width: 6.5rem; }
+td.figure { min-width: 0; font-variant-numeric: tabular-nums; white-space: nowrap; }
 tr.own td { font-weight: 700; }
 svg { display: block; width: 100%; height: auto; color: var(--text); }
 svg.pings { max-width: 24rem; }
@@ -75,12 +76,13 @@ svg .lost { fill: none; stroke: var(--bad); stroke-width: 3; }
 @media (max-width: 34rem) {
   svg.channels text { font-size: 24px; }
   svg.channels .name, svg.channels .between { display: none; }
+  figure table { font-size: .82rem; }
 }
 @media print {
   :root { color-scheme: light; --ground: #fff; --text: #000; --quiet: #444; --line: #999; --card: #fff; --own: #003d87;
     --bad: #8c0f08; --warn: #6d4100; }
   body { max-width: none; padding: 0; font-size: 10.5pt; }
-  h2 { break-after: avoid; }
+  h2, h3 { break-after: avoid; }
   tr { break-inside: avoid; }
 }
 )";

@@ -94,7 +94,7 @@ TEST(ClosingPage, WithoutFindingsSaysSoAndOffersToClose) {
     viewer.screen.setRootViewController(pageOf(withJoined({})));
 
     EXPECT_EQ(viewer.text(ui::identifiers::description),
-              "The network “Home” works, and no problem was found.");
+              "As far as this result tells, the network “Home” works, and no problem was found.");
     EXPECT_THAT(viewer.lines(), ElementsAre("Close"));
 }
 

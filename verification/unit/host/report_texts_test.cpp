@@ -146,6 +146,9 @@ TEST(ReportTexts, PlacesAreFilledByNameAndNeverTwice) {
     EXPECT_EQ(english.number(1.25, 1), "1.2");
     EXPECT_EQ(Texts("de").number(1234.5, 1), "1234,5");
     EXPECT_EQ(english.list({"a", "b"}), "a, b");
+    EXPECT_EQ(english.aside("b"), " (b)");
+    EXPECT_EQ(Texts("ja").aside("b"), "（b）");
+    EXPECT_EQ(english.aside(""), "");
 }
 
 TEST(ReportTexts, TheKeysTableShowsKeysWithTheValuesOfTheirPlaces) {

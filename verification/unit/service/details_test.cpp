@@ -264,6 +264,10 @@ TEST(Details, OfTranslationAreTheAddressesOnTheWay) {
     EXPECT_EQ(jsonText(Dictionary::make(detailsOf(8, facts)), JSONStyle::compact),
               R"({"hops":["10.0.0.1",null],"judgedBy":"routerInside","ownAddresses":["10.0.0.7"],)"
               R"("routerAddress":"192.168.0.2"})");
+
+    evidence.gatewayExternal = address("100.64.5.6");
+    facts.translation = evidence;
+    EXPECT_EQ(detail(8, facts, "judgedBy"), R"("routerShared")");
 }
 
 TEST(Details, OfNameServersSayWhereTheyAreFrom) {
