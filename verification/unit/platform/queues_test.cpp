@@ -104,10 +104,10 @@ TEST(BackgroundQueue, RunsBlocksBesideEachOther) {
 }
 
 TEST(BackgroundQueue, ABlockThatWaitsDoesNotHoldUpADelayedOne) {
+    std::latch released(1);  // outlives the queue, whose thread may still look at it
     Activity activity;
     MainQueue main(activity);
     BackgroundQueue queue(activity);
-    std::latch released(1);
 
     queue.async([&] { released.wait(); });
     queue.after(1ms, [&] {

@@ -1,0 +1,1 @@
+// Carries the precompiled headers that all rooms share; has nothing of its own.
