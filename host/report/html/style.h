@@ -77,6 +77,7 @@ svg .lost { fill: none; stroke: var(--bad); stroke-width: 3; }
   svg.channels text { font-size: 24px; }
   svg.channels .name, svg.channels .between { display: none; }
   figure table { font-size: .82rem; }
+  figure td { min-width: 5rem; }
 }
 @media print {
   :root { color-scheme: light; --ground: #fff; --text: #000; --quiet: #444; --line: #999; --card: #fff; --own: #003d87;
