@@ -101,7 +101,13 @@ Store addresses(const Gathering& g) {
 
 Store gatewayEcho(const Gathering& g) {
     return fromLink(g, &Facts::gatewayEcho, [&](const Link& found) {
-        return gatherGatewayEcho(found, g.sources.gatewayEcho, g.until);
+        Known<Echo> echo = gatherGatewayEcho(found, g.sources.gatewayEcho, g.until);
+        const bool isSilent =
+            echo && std::ranges::none_of(echo->roundTrips, [](auto& each) { return each.has_value(); });
+        if (isSilent && answersAsNeighbour(found, echo->target, g.until))
+            g.sources.notes.once("the router " + echo->target +
+                                 " is there, but ignores echo requests (ping)");
+        return echo;
     });
 }
 

@@ -1,5 +1,6 @@
 #include "linux/gather.h"
 
+#include <linux/neighbour.h>
 #include <linux/rtnetlink.h>
 #include <net/if.h>
 #include <sys/ioctl.h>
@@ -9,6 +10,7 @@
 
 #include "linux/netlink_socket.h"
 #include "linux/route_messages.h"
+#include "service/ip_address.h"
 
 namespace wp {
 namespace {
@@ -149,6 +151,12 @@ Known<Addresses> gatherAddresses(const Link& link, const Until& until) {
     const auto dump = routeDump<ifaddrmsg>(RTM_GETADDR, "addresses", until);
     if (!dump) return dump.error();
     return readAddresses(*dump, link.interfaceIndex);
+}
+
+bool answersAsNeighbour(const Link& link, const std::string& address, const Until& until) {
+    const auto dump = routeDump<ndmsg>(RTM_GETNEIGH, "neighbours", until);
+    const auto wanted = IPAddress::fromText(address);
+    return dump && wanted && isReachable(*dump, link.interfaceIndex, wanted->bytes());
 }
 
 Known<Echo> gatherGatewayEcho(const Link& link, EchoSocket& socket, const Until& until) {

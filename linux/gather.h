@@ -23,6 +23,9 @@ Known<Regulation> gatherRegulation(const Link& link, const Until& until);
 Known<Addresses> gatherAddresses(const Link& link, const Until& until);
 Known<Echo> gatherGatewayEcho(const Link& link, EchoSocket& socket, const Until& until);
 
+/// Whether the kernel has lately heard from this address on the link, as from a router that ignores echo requests.
+bool answersAsNeighbour(const Link& link, const std::string& address, const Until& until);
+
 /// What the radio counted on each channel within one second.
 Known<Airtime> gatherAirtime(const Link& link, const Until& until);
 /// The channels that the radio and the regulatory domain allow.

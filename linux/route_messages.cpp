@@ -2,6 +2,7 @@
 
 #include <arpa/inet.h>
 #include <linux/if_addr.h>
+#include <linux/neighbour.h>
 #include <linux/rtnetlink.h>
 
 #include <algorithm>
@@ -128,6 +129,18 @@ bool leadsElsewhere(Bytes buffer, std::uint32_t interfaceIndex) {
         const auto out = attributes.number<std::uint32_t>(RTA_OIF);
         // A route with several next hops leads over several interfaces as a rule.
         found |= out ? *out != interfaceIndex : attributes.find(RTA_MULTIPATH).has_value();
+    });
+    return found;
+}
+
+bool isReachable(Bytes buffer, std::uint32_t interfaceIndex, Bytes address) {
+    bool found = false;
+    forEachContent(buffer, [&](const NetlinkMessage& message) {
+        const std::optional<ndmsg> header = headerOf<ndmsg>(message);
+        if (message.type != RTM_NEWNEIGH || !header) return;
+        if (header->ndm_ifindex != static_cast<int>(interfaceIndex)) return;
+        const auto of = message.attributesAfter(NLMSG_ALIGN(sizeof(ndmsg))).find(NDA_DST);
+        found |= of && std::ranges::equal(*of, address) && (header->ndm_state & NUD_REACHABLE) != 0;
     });
     return found;
 }

@@ -27,6 +27,9 @@ std::vector<Gateway> readGateways(Bytes buffer, std::uint32_t interfaceIndex);
 /// Whether a default route, of whatever table, leads over another interface: a cable's, or a tunnel's.
 bool leadsElsewhere(Bytes buffer, std::uint32_t interfaceIndex);
 
+/// Whether the kernel has lately heard from the neighbour of this address on the interface, though it may ignore pings.
+bool isReachable(Bytes buffer, std::uint32_t interfaceIndex, Bytes address);
+
 /// "10.0.0.1", "fe80::1". *Any* thread.
 std::string textOf(Address::Family family, Bytes address);
 

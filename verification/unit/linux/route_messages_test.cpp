@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 #include <linux/if_addr.h>
+#include <linux/neighbour.h>
 #include <linux/rtnetlink.h>
 #include <sys/socket.h>
 
@@ -73,6 +74,28 @@ TEST(RouteMessages, CallAnIPv6AddressUsableThatIsNeitherInDoubtNorDeprecated) {
     EXPECT_FALSE(usable(IFA_F_DEPRECATED));
     EXPECT_FALSE(usable(IFA_F_TENTATIVE));
     EXPECT_FALSE(usable(IFA_F_DADFAILED));
+}
+
+/// The kernel's message on the neighbour 10.0.0.1 of interface 3.
+std::vector<std::uint8_t> neighbourMessage(std::uint16_t state) {
+    const std::uint8_t address[] = {10, 0, 0, 1};
+    NetlinkRequest message(RTM_NEWNEIGH, 0);
+    message.header<ndmsg>() = {AF_INET, 0, 0, 3, state, 0, 0};
+    message.put(NDA_DST, address);
+    const auto* bytes = reinterpret_cast<const std::uint8_t*>(&message.message());
+    return {bytes, bytes + message.message().nlmsg_len};
+}
+
+TEST(RouteMessages, TellANeighbourThatWasHeardOf) {
+    const std::uint8_t address[] = {10, 0, 0, 1}, other[] = {10, 0, 0, 2};
+    const auto reachable = neighbourMessage(NUD_REACHABLE);
+
+    EXPECT_TRUE(isReachable(reachable, 3, address));
+    EXPECT_FALSE(isReachable(reachable, 4, address));
+    EXPECT_FALSE(isReachable(reachable, 3, other));
+    EXPECT_FALSE(isReachable(neighbourMessage(NUD_FAILED), 3, address));
+    for (std::size_t size = 0; size < reachable.size(); ++size)
+        EXPECT_FALSE(isReachable(Bytes(reachable).first(size), 3, address));
 }
 
 TEST(RouteMessages, TellTheGateway) {
