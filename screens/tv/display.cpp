@@ -50,7 +50,8 @@ bool isAboutTheScene(const QMessageLogContext& context, const QString& text) {
 
 void takeMessage(QtMsgType type, const QMessageLogContext& context, const QString& text) {
     std::string line = text.section(QLatin1Char('\n'), 0, 0).toStdString();
-    if (isAboutThePlatform(context, text) && type != QtDebugMsg && type != QtInfoMsg && firstComplaint.empty())
+    if (isAboutThePlatform(context, text) && type != QtDebugMsg && type != QtInfoMsg &&
+        firstComplaint.empty())
         firstComplaint = line;
     if (endsTheProcess(type, text)) {
         bool isFatal = type == QtFatalMsg && !firstComplaint.empty();

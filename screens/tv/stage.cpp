@@ -149,6 +149,18 @@ void Stage::tellFocus(QQuickItem* item) {
     QAccessible::updateAccessibility(&event);
 }
 
+void Stage::tellUse(QQuickItem* item) {
+    QAccessible::State changed;
+    changed.disabled = true;
+    QAccessibleStateChangeEvent event(item, changed);
+    QAccessible::updateAccessibility(&event);
+}
+
+void Stage::tellValue(QQuickItem* bar, int value) {
+    QAccessibleValueChangeEvent event(bar, value);
+    QAccessible::updateAccessibility(&event);
+}
+
 void Stage::takeTable(const ui::Screen& screen) {
     const ui::SettingsTableView* table = screen.table();
     if (!table) {

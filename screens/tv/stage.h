@@ -44,6 +44,10 @@ class Stage final : public QObject {
     void takeOver(ui::Screen& screen, const QString& composed);
     /// Tells a screen reader that this part of the scene has the focus now; the toolkit's own focus never moves.
     Q_INVOKABLE static void tellFocus(QQuickItem* item);
+    /// Tells a screen reader that the select key works on it now, or does no longer.
+    Q_INVOKABLE static void tellUse(QQuickItem* item);
+    /// Tells a screen reader that the bar has another value.
+    Q_INVOKABLE static void tellValue(QQuickItem* bar, int value);
     void takeKeyboard(QVariantList keys) { set(keyboard_, std::move(keys), &Stage::keyboardChanged); }
 
   signals:

@@ -10,6 +10,7 @@
 
 #include "screens/tv/frame_trace.h"
 #include "screens/tv/keyboard_look.h"
+#include "screens/tv/reading.h"
 #include "screens/tv/stage.h"
 #include "screens/tv/text_measurer.h"
 #include "screens/tv/typist.h"
@@ -138,7 +139,10 @@ class TvScreen::Loop : private ui::ScreenObserver {
         };
         input.close = [this] { screen_.press(ui::Key::back); };
         input.takesText = [this] { return typist_.isInField(); };
-        input.cursor = [] { return QRectF(); };
+        input.cursor = [this] {
+            auto* cursor = window_.rootObject()->findChild<QQuickItem*>(QStringLiteral("cursor"));
+            return cursor->mapRectToScene(cursor->boundingRect());
+        };
         return input;
     }
 
@@ -188,6 +192,7 @@ TvScreen::Opened TvScreen::open(ui::Screen& screen, MainQueue& queue, Texts text
     Display::Opened display = Display::open(std::move(messages));
     if (auto* why = std::get_if<std::string>(&display)) return *why;
     loadFonts();
+    installReading();
     auto loop = std::make_unique<Loop>(std::move(std::get<std::unique_ptr<Display>>(display)), screen, queue,
                                        std::move(texts), std::move(note));
     if (auto why = loop->show()) return *why;

@@ -23,9 +23,14 @@ class Window::InputMethodItem final : public QQuickItem {
             setFlag(ItemAcceptsInputMethod, takesText);
             if (!takesText) input_.compose({});
         }
-        // Under Wayland without a seat nothing has the focus, and the toolkit's input method crashes when it is asked.
-        if (QGuiApplication::focusObject() != this) return;
-        QGuiApplication::inputMethod()->update(Qt::ImQueryInput | Qt::ImEnabled);
+        updateInputMethod(Qt::ImQueryInput | Qt::ImEnabled);
+    }
+
+    /// The scene puts the cursor into its place while it is painted.
+    void framePainted() {
+        if (!input_.takesText() || cursor_ == input_.cursor()) return;
+        cursor_ = input_.cursor();
+        updateInputMethod(Qt::ImCursorRectangle);
     }
 
   protected:
@@ -50,13 +55,20 @@ class Window::InputMethodItem final : public QQuickItem {
     }
 
   private:
+    void updateInputMethod(Qt::InputMethodQueries queries) {
+        // Under Wayland without a seat nothing has the focus, and the toolkit's input method crashes when it is asked.
+        if (QGuiApplication::focusObject() == this) QGuiApplication::inputMethod()->update(queries);
+    }
+
     const Input& input_;
+    QRectF cursor_;
 };
 
 Window::Window(Input input)
     : input_(std::move(input)), inputMethod_(new InputMethodItem(contentItem(), input_)) {
     setResizeMode(QQuickView::SizeRootObjectToView);
     setColor(Qt::white);
+    connect(this, &QQuickWindow::frameSwapped, this, [this] { inputMethod_->framePainted(); });
 }
 
 void Window::fieldChanged() {

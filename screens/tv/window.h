@@ -16,7 +16,7 @@ struct Input {
     std::function<void()> close;
     /// Whether typed text has somewhere to go.
     std::function<bool()> takesText;
-    /// The place of the cursor, for an input method's own window.
+    /// The place of the cursor in the window, for an input method's own window beside it.
     std::function<QRectF()> cursor;
 };
 

@@ -7,6 +7,10 @@ Item {
     readonly property real u: stage.unit
     required property var look
 
+    // Told to screen readers, by this name.
+    readonly property bool isUsable: look ? look.isEnabled : false
+    onIsUsableChanged: stage.tellUse(button)
+
     readonly property real wantedFocus: look && look.isFocused ? 1 : 0
     readonly property bool isMoving: focusLook.opacity !== wantedFocus
 
@@ -55,7 +59,5 @@ Item {
     Accessible.ignored: !stage.alert.isShown
     Accessible.name: look ? look.title : ""
     Accessible.focusable: true
-    // What the select key works on; the toolkit passes no state for disabled ones.
-    Accessible.selectable: look ? look.isEnabled : false
     Accessible.focused: look ? look.isFocused : false
 }

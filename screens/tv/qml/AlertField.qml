@@ -57,6 +57,7 @@ Rectangle {
             color: "#767c87"
         }
         Rectangle {
+            objectName: "cursor"
             x: typed.x + field.u * field.look.cursorX
             y: 16 * field.u
             width: 4 * field.u

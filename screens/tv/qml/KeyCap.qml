@@ -8,6 +8,10 @@ Item {
     readonly property real u: stage.unit
     required property var look
 
+    // Told to screen readers, by this name.
+    readonly property bool isUsable: look ? look.isEnabled : false
+    onIsUsableChanged: stage.tellUse(cap)
+
     readonly property real wantedFocus: look && look.isFocused ? 1 : 0
     readonly property bool isMoving: focusLook.opacity !== wantedFocus
 
@@ -53,7 +57,5 @@ Item {
     Accessible.ignored: !stage.alert.isShown
     Accessible.name: look ? look.name : ""
     Accessible.focusable: true
-    // What the select key works on; the toolkit passes no state for disabled ones.
-    Accessible.selectable: look ? look.isEnabled : false
     Accessible.focused: wantedFocus === 1
 }

@@ -7,6 +7,10 @@ Rectangle {
     required property var stage
     readonly property real u: stage.unit
 
+    // Told to screen readers, by this name.
+    readonly property int percentage: Math.round(100 * look.fraction)
+    onPercentageChanged: stage.tellValue(bar, percentage)
+
     readonly property bool isMoving: opacity !== (look.isShown ? 1 : 0) || fill.width !== fill.wanted
 
     x: u * look.frame.x
@@ -41,7 +45,5 @@ Rectangle {
 
     Accessible.role: Accessible.ProgressBar
     Accessible.name: stage.status.text
-    // The toolkit passes on no value of a bar.
-    Accessible.description: Math.round(100 * look.fraction) + " %"
     Accessible.ignored: !look.isShown
 }

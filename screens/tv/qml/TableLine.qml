@@ -18,6 +18,10 @@ Item {
     required property bool isNew
     required property bool isLeaving
 
+    // Whether the select key works on it now: told to screen readers, by this name.
+    readonly property bool isUsable: isHeader || isEnabled && !stage.table.isMuted
+    onIsUsableChanged: stage.tellUse(line)
+
     property bool isThere: !isNew
     readonly property real wantedOpacity: isLeaving || !isThere ? 0 : 1
     readonly property bool isMoving: opacity !== wantedOpacity || y !== u * lineTop || focusLook.opacity !== focusLook.wanted
@@ -96,6 +100,5 @@ Item {
     Accessible.name: text
     Accessible.focusable: !isHeader
     Accessible.focused: isFocused
-    Accessible.selectable: !isHeader && isEnabled && !stage.table.isMuted
     Accessible.ignored: isLeaving
 }

@@ -3,7 +3,9 @@
 
 #include <gtest/gtest.h>
 
+#include <QAccessible>
 #include <QGuiApplication>
+#include <QInputMethodQueryEvent>
 #include <QKeyEvent>
 #include <QWindow>
 #include <cstdlib>
@@ -86,6 +88,43 @@ class Pictures : public testing::Test {
     ListRun run;
     std::unique_ptr<TvScreen> tv;
 };
+
+/// What a screen reader is told of the rows below an element: name and state.
+std::vector<std::string> rowsRead(QAccessibleInterface& element) {
+    std::vector<std::string> rows;
+    for (int index = 0; index < element.childCount(); ++index) {
+        QAccessibleInterface& child = *element.child(index);
+        QAccessible::State state = child.state();
+        std::string words = std::string(state.disabled ? ", disabled" : "") +
+                            (state.focusable ? ", focusable" : "") + (state.focused ? ", focused" : "");
+        if (child.role() == QAccessible::ListItem)
+            rows.push_back(child.text(QAccessible::Name).toStdString() + words);
+        for (std::string& row : rowsRead(child)) rows.push_back(std::move(row));
+    }
+    return rows;
+}
+
+// The first test: with its first application the toolkit forgets for good how a scene is read.
+TEST_F(Pictures, RowsAreReadAsDisabledAndFocusableWhileARescanRuns) {
+    open();
+    showList({{"Rowan", "1"}});
+    QAccessibleInterface* window =
+        QAccessible::queryAccessibleInterface(QGuiApplication::topLevelWindows().front());
+    ASSERT_NE(window, nullptr);
+    auto read = [&] {
+        tv->runUntil([] { return true; });
+        return rowsRead(*window);
+    };
+    EXPECT_EQ(read(), (std::vector<std::string>{"Northlight, focusable, focused", "Rowan, focusable",
+                                                "Other…, focusable", "Search Again, focusable"}));
+
+    run.choose("Search Again");
+    run.device.queues.runMain();
+
+    EXPECT_EQ(read(), (std::vector<std::string>{"Northlight, disabled, focusable",
+                                                "Rowan, disabled, focusable", "Other…, disabled, focusable",
+                                                "Search Again, disabled, focusable, focused"}));
+}
 
 TEST_F(Pictures, ListBeforeTheFirstScan) {
     open();
@@ -249,6 +288,29 @@ TEST_F(Pictures, KeysThatReachTheWindowWorkTheScreen) {
     EXPECT_NE(run.device.screen.alert(), nullptr);
     press(Qt::Key_Back);
     EXPECT_EQ(run.device.screen.alert(), nullptr);
+}
+
+TEST_F(Pictures, AnInputMethodIsToldWhereTheCursorIsPainted) {
+    open();
+    showList(neighbourhood(4));
+    run.choose("Other…");
+    run.device.screen.typeText("il");
+    std::string file = (kTaken / "cursor.png").string();
+    ASSERT_EQ(tv->savePicture(file), std::nullopt);
+
+    QInputMethodQueryEvent query(Qt::ImCursorRectangle);
+    QCoreApplication::sendEvent(QGuiApplication::focusObject(), &query);
+
+    QRectF cursor = query.value(Qt::ImCursorRectangle).toRectF();
+    QImage picture(QString::fromStdString(file));
+    QColor blue(0x1b, 0x5f, 0xc1);
+    auto colorAt = [&](double x, double y) {
+        return picture.pixelColor(static_cast<int>(x), static_cast<int>(y));
+    };
+    EXPECT_EQ(colorAt(cursor.center().x(), cursor.top() + 2), blue);
+    EXPECT_EQ(colorAt(cursor.center().x(), cursor.bottom() - 2), blue);
+    EXPECT_NE(colorAt(cursor.right() + 2, cursor.center().y()), blue);
+    EXPECT_NE(colorAt(cursor.center().x(), cursor.bottom() + 2), blue);
 }
 
 TEST_F(Pictures, InFullSize) {
