@@ -37,10 +37,11 @@ test:
 	@verification/run_tests
 
 lab:
-	@verification/install_packages build test lab
+	@verification/install_packages build test tv lab
 	@$(MAKE) -s build
+	@cmake --build build -j $(JOBS) --target wifi-profile-screen-tv
 	@$(LAB)/setup --uml
-	@$(LAB)/run-scenarios
+	@$(LAB)/run-scenarios; status=$$?; $(LAB)/run-on-console 720p && exit $$status
 
 bench:
 	@verification/install_packages build test tv

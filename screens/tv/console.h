@@ -1,5 +1,8 @@
 #pragma once
 
+#include <memory>
+#include <string>
+
 namespace wp::tv {
 
 /// Keeps the virtual console that the toolkit draws over from staying mute and dark however the process ends:
@@ -7,15 +10,22 @@ namespace wp::tv {
 /// most one exists. *Main*.
 class Console {
   public:
-    /// Remembers the console of standard input, before the toolkit takes it; nothing where that is none. A
-    /// process of its own watches over this one, so that the console comes back after SIGKILL too.
-    Console();
+    /// Whether this platform of the toolkit draws straight on the device, and so over a console.
+    static bool isDrawnOverBy(const std::string& platform);
+    /// Takes the console before the toolkit does: that of standard input, else the one in the foreground, whose
+    /// shell must not hear what the viewer types. A process of its own watches over this one, so that the
+    /// console comes back after SIGKILL too. Nothing where there is no console that may be taken.
+    static std::unique_ptr<Console> take();
+    /// Gives it back before it returns: whoever reads the console next finds it in order.
     ~Console();
     Console(const Console&) = delete;
     Console& operator=(const Console&) = delete;
 
   private:
-    int lifeline_ = -1;
+    Console(int lifeline, int watcher) : lifeline_(lifeline), watcher_(watcher) {}
+
+    int lifeline_;
+    int watcher_;
 };
 
 }  // namespace wp::tv

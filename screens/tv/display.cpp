@@ -10,6 +10,8 @@
 #include <clocale>
 #include <filesystem>
 
+#include "screens/tv/input_devices.h"
+
 namespace wp::tv {
 namespace {
 
@@ -129,6 +131,11 @@ Display::Opened Display::open(Messages given) {
     if (!wanted.empty() && !display->windowSize_)
         return std::string(kSizeVariable) + ": \"" + wanted + "\" is no size; give one like 1280x720";
     if (!display->windowSize_ && hasWindowSize(*platform)) display->windowSize_ = QSize(kWidth, kHeight);
+    if (Console::isDrawnOverBy(*platform)) {
+        display->console_ = Console::take();
+        nameDevicesToToolkit();
+        if (readsDevicesItself(*platform)) display->devicesThatDropKeys_ = inputDevices();
+    }
     display->makeApplication();
     return display;
 }

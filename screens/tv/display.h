@@ -8,6 +8,7 @@
 #include <string>
 #include <string_view>
 #include <variant>
+#include <vector>
 
 #include "screens/tv/console.h"
 
@@ -53,6 +54,8 @@ class Display {
 
     /// The window's size in dots; nothing: the whole screen.
     std::optional<QSize> windowSize() const { return windowSize_; }
+    /// The input devices to watch for keys that the toolkit drops; none where it reads them through another.
+    const std::vector<std::string>& devicesThatDropKeys() const { return devicesThatDropKeys_; }
     /// False where the viewer's desktop asks for stillness.
     bool hasMotion() const;
 
@@ -61,9 +64,10 @@ class Display {
     void makeApplication();
 
     /// Outlives the application, which has the console meanwhile.
-    Console console_;
+    std::unique_ptr<Console> console_;
     std::unique_ptr<QGuiApplication> application_;
     std::optional<QSize> windowSize_;
+    std::vector<std::string> devicesThatDropKeys_;
 };
 
 }  // namespace wp::tv

@@ -9,6 +9,7 @@
 #include <algorithm>
 
 #include "screens/tv/frame_trace.h"
+#include "screens/tv/input_devices.h"
 #include "screens/tv/keyboard_look.h"
 #include "screens/tv/reading.h"
 #include "screens/tv/stage.h"
@@ -125,13 +126,15 @@ class TvScreen::Loop : private ui::ScreenObserver {
         stage_.apply(table, changes);
     }
 
+    void press(ui::Key key) {
+        typist_.press(key);
+        // Shift and page are keys of the keyboard alone.
+        isUpToDate_ = false;
+    }
+
     Input inputs() {
         Input input;
-        input.press = [this](ui::Key key) {
-            typist_.press(key);
-            // Shift and page are keys of the keyboard alone.
-            isUpToDate_ = false;
-        };
+        input.press = [this](ui::Key key) { press(key); };
         input.type = [this](const QString& text) { typist_.type(text.toStdString()); };
         input.compose = [this](const QString& text) {
             isUpToDate_ = isUpToDate_ && composed_ == text;
@@ -184,6 +187,7 @@ class TvScreen::Loop : private ui::ScreenObserver {
     std::shared_ptr<Wake> wake_ = std::make_shared<Wake>();
     QSocketNotifier notifier_;
     QTimer timer_;
+    DroppedKeys droppedKeys_{display_->devicesThatDropKeys(), [this](ui::Key key) { press(key); }};
 };
 
 TvScreen::Opened TvScreen::open(ui::Screen& screen, MainQueue& queue, Texts texts,
