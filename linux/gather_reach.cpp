@@ -11,6 +11,7 @@
 #include "linux/probe/ssdp_probe.h"
 #include "linux/probe/translation_probes.h"
 #include "linux/probe/web_client.h"
+#include "linux/probe/web_place.h"
 
 namespace wp {
 namespace {

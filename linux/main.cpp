@@ -1,6 +1,7 @@
 #include <malloc.h>
 #include <sys/socket.h>
 
+#include <csignal>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -93,6 +94,8 @@ bool isSocket(int descriptor) {
 int main(int count, char** arguments) {
     // Some twenty threads come and go, and each would begin a heap of its own.
     mallopt(M_ARENA_MAX, 1);
+    // What writes to a connection that its other end has left is told so.
+    std::signal(SIGPIPE, SIG_IGN);
     const std::variant<Options, int> read = readOptions(count, arguments);
     if (const int* status = std::get_if<int>(&read)) return *status;
     const Options& options = std::get<Options>(read);

@@ -10,7 +10,7 @@
 #include <memory>
 #include <span>
 
-#include "linux/probe/udp_socket.h"
+#include "linux/probe/ip_socket.h"
 #include "linux/wait_any.h"
 
 namespace wp {

@@ -2,13 +2,12 @@
 
 #include <algorithm>
 
+#include "linux/probe/web_place.h"
 #include "linux/probe/xml_text.h"
 #include "service/plain_text.h"
 
 namespace wp {
 namespace {
-
-constexpr std::size_t kLongestUrl = 512;
 
 bool equalWithoutCase(std::string_view a, std::string_view b) {
     const auto lower = [](char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c + 32) : c; };
@@ -22,11 +21,6 @@ std::string_view trimmed(std::string_view text) {
     return text.substr(start, text.find_last_not_of(" \t\r") - start + 1);
 }
 
-bool isPlainUrlText(std::string_view url) {
-    return !url.empty() && url.size() <= kLongestUrl &&
-           std::all_of(url.begin(), url.end(), [](char c) { return c > ' ' && c < 0x7F; });
-}
-
 /// The type goes back to the router in a header: only what a type is made of may be in it.
 bool knowsExternalAddress(const std::string& serviceType) {
     const bool plain = std::all_of(serviceType.begin(), serviceType.end(), [](char c) {
@@ -35,10 +29,6 @@ bool knowsExternalAddress(const std::string& serviceType) {
     });
     return plain && (serviceType.starts_with("urn:schemas-upnp-org:service:WANIPConnection:") ||
                      serviceType.starts_with("urn:schemas-upnp-org:service:WANPPPConnection:"));
-}
-
-bool startsWithoutCase(std::string_view text, std::string_view start) {
-    return equalWithoutCase(text.substr(0, start.size()), start);
 }
 
 }  // namespace
@@ -61,34 +51,9 @@ std::optional<std::string> locationFromSsdp(std::string_view message) {
         const std::size_t colon = line.find(':');
         if (colon == line.npos || !equalWithoutCase(trimmed(line.substr(0, colon)), "location")) continue;
         const std::string url(trimmed(line.substr(colon + 1)));
-        return httpPlace(url) ? std::optional(url) : std::nullopt;
+        const auto place = webPlace(url);
+        return place && !place->secure ? std::optional(url) : std::nullopt;
     }
-}
-
-std::optional<HttpPlace> httpPlace(std::string_view url) {
-    constexpr std::string_view kScheme = "http://";
-    if (!isPlainUrlText(url) || !startsWithoutCase(url, kScheme)) return std::nullopt;
-    url.remove_prefix(kScheme.size());
-    const std::string_view authority = url.substr(0, url.find('/'));
-    const std::string_view path = url.substr(authority.size());
-    HttpPlace place{{}, "80", path.empty() ? "/" : std::string(path)};
-    std::string_view rest = authority;
-    if (rest.starts_with("[")) {
-        const std::size_t end = rest.find(']');
-        if (end == rest.npos) return std::nullopt;
-        place.host = rest.substr(1, end - 1);
-        rest.remove_prefix(end + 1);
-    } else {
-        place.host = rest.substr(0, rest.find(':'));
-        rest.remove_prefix(place.host.size());
-    }
-    if (rest.starts_with(":")) place.port = rest.substr(1);
-    const bool portIsNumber = !place.port.empty() && place.port.size() <= 5 &&
-                              place.port.find_first_not_of("0123456789") == std::string::npos;
-    if (place.host.empty() || !portIsNumber || place.host.find('@') != std::string::npos ||
-        (!rest.empty() && rest[0] != ':'))
-        return std::nullopt;
-    return place;
 }
 
 DeviceDescription readDeviceDescription(std::string_view xml) {
@@ -113,16 +78,6 @@ DeviceDescription readDeviceDescription(std::string_view xml) {
         description.serviceType = serviceType;
     });
     return description;
-}
-
-std::string resolveReference(std::string_view base, std::string_view reference) {
-    if (httpPlace(reference)) return std::string(reference);
-    if (!httpPlace(base) || !isPlainUrlText(reference)) return {};
-    constexpr std::size_t kScheme = 7;
-    const std::size_t slash = base.find('/', kScheme);
-    const std::string host(base.substr(0, slash));
-    if (reference.starts_with("/")) return host + std::string(reference);
-    return host + "/" + std::string(reference);
 }
 
 std::string externalAddressQuestion(std::string_view serviceType) {

@@ -17,14 +17,6 @@ std::string ssdpSearch();
 /// or names anything but plain HTTP. *Any* thread.
 std::optional<std::string> locationFromSsdp(std::string_view message);
 
-/// The parts of "http://HOST[:PORT]/PATH"; nothing for any other form.
-struct HttpPlace {
-    std::string host;  ///< without the brackets of an IPv6 address
-    std::string port;  ///< decimal, "80" where none is named
-    std::string path;  ///< begins with "/"
-};
-std::optional<HttpPlace> httpPlace(std::string_view url);
-
 /// What a device's description says, as far as it is bounded, well-formed text. Entities that the document
 /// declares itself are never looked up. *Any* thread.
 struct DeviceDescription {
@@ -34,10 +26,6 @@ struct DeviceDescription {
     std::string urlBase;
 };
 DeviceDescription readDeviceDescription(std::string_view xml);
-
-/// The address that `reference`, found in the description at `base`, stands for: itself where it is whole,
-/// else a path on the host of `base`.
-std::string resolveReference(std::string_view base, std::string_view reference);
 
 /// The body of the question for the outer address.
 std::string externalAddressQuestion(std::string_view serviceType);

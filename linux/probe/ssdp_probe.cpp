@@ -1,8 +1,9 @@
 #include "linux/probe/ssdp_probe.h"
 
+#include "linux/probe/ip_socket.h"
 #include "linux/probe/ssdp.h"
-#include "linux/probe/udp_socket.h"
 #include "linux/probe/web_client.h"
+#include "linux/probe/web_place.h"
 
 namespace wp {
 namespace {
@@ -18,7 +19,7 @@ bool liesOn(const std::string& url, const IPAddress& router) {
 }
 
 Known<std::string> findDescription(const RouterPlace& router, const Until& until) {
-    const auto socket = udpSocket(router.searched, router.interfaceName);
+    const auto socket = ipSocket(SOCK_DGRAM, router.searched, router.interfaceName);
     if (!socket) return socket.error();
     const std::string search = ssdpSearch();
     std::string location;

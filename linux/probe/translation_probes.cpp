@@ -109,7 +109,7 @@ void sendAll(const Descriptor& socket, const IPAddress& target) {
 
 Known<IPAddress> askMappedAddress(const IPAddress& server, std::uint16_t port,
                                   const std::string& interfaceName, const Until& until) {
-    const auto socket = udpSocket(server, interfaceName);
+    const auto socket = ipSocket(SOCK_DGRAM, server, interfaceName);
     if (!socket) return socket.error();
     const auto transaction = randomBytes<12>();
     std::optional<IPAddress> mapped;
@@ -126,7 +126,7 @@ Known<IPAddress> askMappedAddress(const IPAddress& server, std::uint16_t port,
 
 Known<IPAddress> askExternalAddress(const IPAddress& router, std::uint16_t port, const IPAddress& own,
                                     const std::string& interfaceName, const Until& until) {
-    const auto socket = udpSocket(router, interfaceName);
+    const auto socket = ipSocket(SOCK_DGRAM, router, interfaceName);
     if (!socket) return socket.error();
     const SocketAddress target = SocketAddress::of(router, port);
     std::optional<PortMappingAnswer> answer;
@@ -147,7 +147,7 @@ Known<IPAddress> askExternalAddress(const IPAddress& router, std::uint16_t port,
 Known<std::vector<std::optional<IPAddress>>> listHops(const IPAddress& target,
                                                       const std::string& interfaceName, const Until& until) {
     if (!target.isIPv4()) return failure(Reason::unsupported, "hops are listed for IPv4 only");
-    const auto socket = udpSocket(target, interfaceName);
+    const auto socket = ipSocket(SOCK_DGRAM, target, interfaceName);
     if (!socket) return socket.error();
     const int on = 1;
     ::setsockopt(socket->number(), SOL_IP, IP_RECVERR, &on, sizeof on);

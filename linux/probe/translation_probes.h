@@ -4,7 +4,7 @@
 #include <string>
 #include <vector>
 
-#include "linux/probe/udp_socket.h"
+#include "linux/probe/ip_socket.h"
 #include "service/double_translation.h"
 
 namespace wp {

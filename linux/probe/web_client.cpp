@@ -1,255 +1,224 @@
 #include "linux/probe/web_client.h"
 
-#include <curl/curl.h>
-
 #include <algorithm>
+#include <array>
 #include <ctime>
 #include <memory>
 
+#include "linux/probe/connect_race.h"
+#include "linux/probe/http_answer.h"
+#include "linux/probe/web_place.h"
+#include "linux/probe/web_stream.h"
 #include "linux/wait_any.h"
 #include "service/plain_text.h"
 
 namespace wp {
 namespace {
 
-struct LibraryUser {
-    LibraryUser() { curl_global_init(CURL_GLOBAL_DEFAULT); }
-};
-
-struct Release {
-    void operator()(CURL* easy) const { curl_easy_cleanup(easy); }
-    void operator()(curl_slist* list) const { curl_slist_free_all(list); }
-    void operator()(CURLU* url) const { curl_url_cleanup(url); }
-};
-struct ReleaseMulti {
-    void operator()(CURLM* multi) const { curl_multi_cleanup(multi); }
-};
-using Easy = std::unique_ptr<CURL, Release>;
-using Multi = std::unique_ptr<CURLM, ReleaseMulti>;
-using List = std::unique_ptr<curl_slist, Release>;
-
-struct Part {
-    CURLUPart part;
-    unsigned flags = 0;
-};
-
-std::string partOf(const std::string& url, Part wanted) {
-    const std::unique_ptr<CURLU, Release> parsed(curl_url());
-    char* text = nullptr;
-    if (!parsed || curl_url_set(parsed.get(), CURLUPART_URL, url.c_str(), 0) != CURLUE_OK) return {};
-    if (curl_url_get(parsed.get(), wanted.part, &text, wanted.flags) != CURLUE_OK) return {};
-    const std::unique_ptr<char, decltype(&curl_free)> owner(text, curl_free);
-    return text;
+double millisecondsBetween(Clock::time_point from, Clock::time_point to) {
+    return std::chrono::duration<double, std::milli>(to - from).count();
 }
 
-/// OpenSSL's numbers of what is wrong with a certificate. The library checks the host's name first, and leaves the
-/// number as it was before it looked at anything else.
-CertificateFault faultOfCode(long code) {
-    switch (code) {
-        case 0:
-        case 1:
-        case 62:
-            return CertificateFault::wrongHost;
-        case 9:
-            return CertificateFault::notYetValid;
-        case 10:
-            return CertificateFault::expired;
-        case 18:
-        case 19:
-            return CertificateFault::selfSigned;
-        case 2:
-        case 20:
-        case 21:
-            return CertificateFault::unknownIssuer;
-        case 23:
-            return CertificateFault::revoked;
-        default:
-            return CertificateFault::other;
-    }
+/// The request as it goes over the wire. A server that closes the connection leaves no doubt where its answer ends.
+std::string textOf(const WebRequest& request, const WebPlace& place) {
+    std::string text = (request.post ? "POST " : "GET ") + place.path +
+                       " HTTP/1.1\r\nHost: " + place.authority() +
+                       "\r\nUser-Agent: wifi-profile\r\nConnection: close\r\n";
+    const auto isAccept = [](const std::string& each) { return each.starts_with("Accept:"); };
+    if (std::ranges::none_of(request.headers, isAccept)) text += "Accept: */*\r\n";
+    for (const std::string& header : request.headers) text += header + "\r\n";
+    if (request.post) text += "Content-Length: " + std::to_string(request.post->size()) + "\r\n";
+    return text + "\r\n" + request.post.value_or("");
+}
+
+/// The addresses that are tried: what the URL holds itself, else what came with the request. No name is looked up
+/// here, since that would go over any interface.
+std::vector<IPAddress> addressesOf(const WebRequest& request, const WebPlace& place) {
+    if (const auto address = IPAddress::fromText(place.host)) return {*address};
+    return request.addresses;
 }
 
 /// One request under way.
-class Transfer {
+class Exchange {
   public:
-    explicit Transfer(const WebRequest& request) : request_(request), easy_(curl_easy_init()) {
-        set(CURLOPT_URL, request.url.c_str());
-        set(CURLOPT_PROTOCOLS_STR, "http,https");
-        set(CURLOPT_NOPROXY, "*");
-        set(CURLOPT_NOSIGNAL, 1L);
-        set(CURLOPT_FRESH_CONNECT, 1L);
-        set(CURLOPT_FORBID_REUSE, 1L);
-        set(CURLOPT_HAPPY_EYEBALLS_TIMEOUT_MS, 250L);  // RFC 8305
-        set(CURLOPT_HTTP_VERSION, static_cast<long>(CURL_HTTP_VERSION_1_1));
-        set(CURLOPT_USERAGENT, "wifi-profile");
-        setAuthorities();
-        if (!request.interfaceName.empty()) set(CURLOPT_INTERFACE, ("if!" + request.interfaceName).c_str());
-        if (request.connectOnly) set(CURLOPT_CONNECT_ONLY, 1L);
-        if (request.post) {
-            set(CURLOPT_POSTFIELDSIZE, static_cast<long>(request.post->size()));
-            set(CURLOPT_COPYPOSTFIELDS, request.post->c_str());
+    Exchange(const WebRequest& request, const WebPlace& place)
+        : request_(request),
+          place_(place),
+          text_(textOf(request, place)),
+          unsent_(text_),
+          race_(addressesOf(request, place), place.port, request.interfaceName),
+          read_(request.longestBody),
+          began_(Clock::now()) {}
+    Exchange(const Exchange&) = delete;
+
+    /// Goes on as far as possible without waiting.
+    void advance() {
+        while (step_ != Step::ended && turn()) {
         }
-        for (const std::string& header : request.headers) append(headers_, header);
-        set(CURLOPT_HTTPHEADER, headers_.get());
-        setAddresses();
-        set(CURLOPT_WRITEDATA, this);
-        curl_easy_setopt(easy_.get(), CURLOPT_WRITEFUNCTION, &Transfer::take);
     }
-    Transfer(const Transfer&) = delete;
+    bool ended() const { return step_ == Step::ended; }
+    const WebAnswer& answer() const { return answer_; }
 
-    CURL* handle() const { return easy_.get(); }
-
-    WebAnswer answer(CURLcode code) const {
-        WebAnswer answer;
-        long status = 0;
-        curl_off_t microseconds = 0;
-        curl_easy_getinfo(easy_.get(), CURLINFO_RESPONSE_CODE, &status);
-        curl_easy_getinfo(easy_.get(), CURLINFO_TOTAL_TIME_T, &microseconds);
-        answer.status = static_cast<int>(status);
-        answer.body = body_;
-        answer.location = info(CURLINFO_REDIRECT_URL);
-        answer.contentType = info(CURLINFO_CONTENT_TYPE);
-        answer.server = IPAddress::fromText(info(CURLINFO_PRIMARY_IP));
-        answer.took = std::chrono::milliseconds(microseconds / 1000);
-        // A body that is too long, or breaks off, comes after an answer all the same.
-        const bool answered = code == CURLE_OK || (status != 0 && code != CURLE_PEER_FAILED_VERIFICATION);
-        answer.end = answered ? WebAnswer::End::answered : WebAnswer::End::failed;
-        if (code == CURLE_PEER_FAILED_VERIFICATION) {
-            answer.end = WebAnswer::End::badCertificate;
-            answer.fault = fault();
-        }
-        answer.steps = steps(code == CURLE_OK);
-        answer.clockOffset = clockOffset();
-        if (!answered) answer.why = curl_easy_strerror(code);
-        return answer;
+    /// What to wait for before it is worth advancing again.
+    void addWaits(std::vector<pollfd>& waits, Clock::time_point& wake) const {
+        if (step_ == Step::connecting)
+            race_.addWaits(waits, wake);
+        else if (stream_)
+            waits.push_back({stream_->descriptor(), events_, 0});
     }
 
   private:
-    template <class T>
-    void set(CURLoption option, T value) {
-        curl_easy_setopt(easy_.get(), option, value);
-    }
+    enum class Step { connecting, securing, sending, receiving, ended };
 
-    static void append(List& list, const std::string& text) {
-        curl_slist* longer = curl_slist_append(list.get(), text.c_str());
-        if (longer == nullptr) return;
-        (void)list.release();
-        list.reset(longer);
-    }
-
-    /// The folder of the system's certificates lets the few that are needed be read, the file all of them.
-    void setAuthorities() {
-        if (request_.authorities.empty()) {
-            set(CURLOPT_CAPATH, "/etc/ssl/certs");
-            curl_easy_setopt(easy_.get(), CURLOPT_CAINFO, nullptr);
-        } else {
-            set(CURLOPT_CAINFO, request_.authorities.c_str());
-            curl_easy_setopt(easy_.get(), CURLOPT_CAPATH, nullptr);
+    /// One turn of the present step; whether the next is worth trying at once.
+    bool turn() {
+        switch (step_) {
+            case Step::connecting:
+                return connect();
+            case Step::securing:
+                return secure();
+            case Step::sending:
+                return send();
+            case Step::receiving:
+                return receive();
+            case Step::ended:
+                break;
         }
+        return false;
     }
 
-    void setAddresses() {
-        if (request_.addresses.empty()) return;
-        std::string entry =
-            hostOf(request_.url) + ":" + partOf(request_.url, {CURLUPART_PORT, CURLU_DEFAULT_PORT});
-        char separator = ':';
-        for (const IPAddress& address : request_.addresses) {
-            entry += separator + (address.isIPv4() ? address.text() : "[" + address.text() + "]");
-            separator = ',';
+    bool connect() {
+        race_.advance(Clock::now());
+        if (race_.failed()) return fail(race_.why());
+        if (!race_.connected()) return false;
+        stream_ = std::make_unique<WebStream>(race_.take());
+        answer_.server = race_.address();
+        reached_ = Clock::now();
+        answer_.steps.connect = millisecondsBetween(began_, reached_);
+        step_ = Step::securing;
+        return true;
+    }
+
+    bool secure() {
+        if (place_.secure) {
+            const StreamStep step = stream_->secure(place_.host, request_.authorities);
+            if (step != StreamStep::done) return waits(step);
+            answer_.steps.secure = millisecondsBetween(reached_, Clock::now());
         }
-        append(addresses_, entry);
-        set(CURLOPT_RESOLVE, addresses_.get());
+        if (request_.connectOnly) return end(WebAnswer::End::answered);
+        asked_ = Clock::now();
+        step_ = Step::sending;
+        return true;
     }
 
-    std::string info(CURLINFO which) const {
-        const char* text = nullptr;
-        curl_easy_getinfo(easy_.get(), which, &text);
-        return text != nullptr ? plainText(text, 2048) : std::string();
+    bool send() {
+        const StreamStep step = stream_->write(unsent_);
+        // A server may answer, and close, before it has read all.
+        if (step == StreamStep::failed)
+            unsent_ = {};
+        else if (step != StreamStep::done)
+            return waits(step);
+        if (unsent_.empty()) step_ = Step::receiving;
+        return true;
     }
 
-    /// The moment of a step in ms since the beginning; 0 where it was not reached.
-    double moment(CURLINFO which) const {
-        curl_off_t microseconds = 0;
-        curl_easy_getinfo(easy_.get(), which, &microseconds);
-        return static_cast<double>(microseconds) / 1000.0;
+    bool receive() {
+        std::array<char, 4096> buffer;
+        std::size_t size = 0;
+        const StreamStep step = stream_->read(buffer, size);
+        if (step == StreamStep::needsRead || step == StreamStep::needsWrite) return waits(step);
+        if (step == StreamStep::done && !answer_.steps.firstByte)
+            answer_.steps.firstByte = millisecondsBetween(asked_, Clock::now());
+        if (step == StreamStep::done)
+            read_.take({buffer.data(), size});
+        else
+            read_.close();
+        return read_.ended() ? finish(step) : true;
     }
 
-    ContactSteps steps(bool complete) const {
-        const double connected = moment(CURLINFO_CONNECT_TIME_T),
-                     secured = moment(CURLINFO_APPCONNECT_TIME_T),
-                     asked = moment(CURLINFO_PRETRANSFER_TIME_T),
-                     answered = moment(CURLINFO_STARTTRANSFER_TIME_T);
-        ContactSteps steps;
-        if (connected > 0) steps.connect = connected - moment(CURLINFO_NAMELOOKUP_TIME_T);
-        if (secured > connected) steps.secure = secured - connected;
-        if (complete && !request_.connectOnly && answered > asked) steps.firstByte = answered - asked;
-        return steps;
+    /// A body that is too long, or breaks off, comes after an answer all the same.
+    bool finish(StreamStep last) {
+        if (!read_.hasHead()) {
+            if (last == StreamStep::failed) return fail(stream_->why());
+            return fail(last == StreamStep::closed ? "the connection was closed before an answer"
+                                                   : "the answer is none of HTTP/1");
+        }
+        answer_.status = read_.status();
+        answer_.body = read_.body();
+        const bool redirects = answer_.status >= 300 && answer_.status <= 399;
+        const std::string_view location = read_.header("Location");
+        if (redirects && !location.empty())
+            answer_.location = plainText(resolveReference(request_.url, location), kLongestUrl);
+        if (const auto date = httpDate(read_.header("Date")))
+            answer_.clockOffset = std::int64_t{std::time(nullptr)} - *date;
+        return end(WebAnswer::End::answered);
     }
 
-    CertificateFault fault() const {
-        long code = 0;
-        curl_easy_getinfo(easy_.get(), CURLINFO_SSL_VERIFYRESULT, &code);
-        return faultOfCode(code);
+    /// What a step on the stream that is not `done` leads to.
+    bool waits(StreamStep step) {
+        events_ = step == StreamStep::needsWrite ? POLLOUT : POLLIN;
+        if (step == StreamStep::needsRead || step == StreamStep::needsWrite) return false;
+        if (step == StreamStep::closed) return fail("the connection was closed");
+        answer_.fault = stream_->fault();
+        if (answer_.fault == CertificateFault::none) return fail(stream_->why());
+        answer_.why = stream_->why();
+        return end(WebAnswer::End::badCertificate);
     }
 
-    std::optional<std::int64_t> clockOffset() const {
-        curl_header* date = nullptr;
-        if (curl_easy_header(easy_.get(), "Date", 0, CURLH_HEADER, -1, &date) != CURLHE_OK)
-            return std::nullopt;
-        const std::time_t server = curl_getdate(date->value, nullptr);
-        if (server == -1) return std::nullopt;
-        return std::int64_t{std::time(nullptr)} - std::int64_t{server};
+    bool fail(const std::string& why) {
+        answer_.why = why;
+        return end(WebAnswer::End::failed);
     }
 
-    static std::size_t take(char* data, std::size_t, std::size_t size, void* self) {
-        auto& transfer = *static_cast<Transfer*>(self);
-        const std::size_t room = transfer.request_.longestBody - transfer.body_.size();
-        transfer.body_.append(data, std::min(size, room));
-        return size > room ? 0 : size;
+    bool end(WebAnswer::End how) {
+        answer_.end = how;
+        stream_.reset();
+        step_ = Step::ended;
+        return false;
     }
 
     const WebRequest& request_;
-    Easy easy_;
-    List headers_;
-    List addresses_;
-    std::string body_;
+    const WebPlace place_;
+    const std::string text_;
+    std::string_view unsent_;
+    ConnectRace race_;
+    std::unique_ptr<WebStream> stream_;
+    HttpAnswer read_;
+    WebAnswer answer_;
+    Step step_ = Step::connecting;
+    short events_ = POLLIN;
+    Clock::time_point began_, reached_{}, asked_{};
 };
 
-using Transfers = std::vector<std::unique_ptr<Transfer>>;
+using Exchanges = std::vector<std::unique_ptr<Exchange>>;
 using Answers = std::vector<std::optional<WebAnswer>>;
 
-/// Takes what is finished out of the group; whether anything was.
-bool collect(CURLM* multi, const Transfers& transfers, Answers& answers) {
-    int waiting = 0;
+/// Advances all and takes in what has ended; whether anything has.
+bool collect(const Exchanges& exchanges, Answers& answers) {
     bool any = false;
-    while (const CURLMsg* message = curl_multi_info_read(multi, &waiting)) {
-        if (message->msg != CURLMSG_DONE) continue;
-        for (std::size_t i = 0; i < transfers.size(); ++i) {
-            if (transfers[i]->handle() != message->easy_handle || answers[i]) continue;
-            answers[i] = transfers[i]->answer(message->data.result);
-            any = true;
-        }
+    for (std::size_t i = 0; i < exchanges.size(); ++i) {
+        if (answers[i]) continue;
+        exchanges[i]->advance();
+        if (!exchanges[i]->ended()) continue;
+        answers[i] = exchanges[i]->answer();
+        any = true;
     }
     return any;
 }
 
-bool complete(const Answers& answers) {
-    return std::all_of(answers.begin(), answers.end(), [](const auto& each) { return each.has_value(); });
-}
-
-/// Turns the group until all are answered, what there is suffices, or time is over.
-Wait turnAll(CURLM* multi, const Transfers& transfers, Answers& answers, const Until& until,
-             const Conclusive& conclusive) {
+/// Turns all until they are answered, what there is suffices, or time is over.
+Wait turnAll(const Exchanges& exchanges, Answers& answers, const Until& until, const Conclusive& conclusive) {
     while (true) {
-        int running = 0;
-        if (curl_multi_perform(multi, &running) != CURLM_OK) return Wait::timeout;
-        if (collect(multi, transfers, answers) && conclusive && conclusive(answers)) return Wait::ready;
-        if (complete(answers)) return Wait::ready;
-        if (until.stop->raised()) return Wait::stopped;
-        const auto left = timeLeft(until);
-        if (left.count() == 0) return Wait::timeout;
-        curl_waitfd stop{until.stop->descriptor(), CURL_WAIT_POLLIN, 0};
-        curl_multi_poll(multi, &stop, 1, static_cast<int>(std::min<std::int64_t>(left.count(), 1000)),
-                        nullptr);
+        if (collect(exchanges, answers) && conclusive && conclusive(answers)) return Wait::ready;
+        if (std::ranges::all_of(answers, [](const auto& each) { return each.has_value(); }))
+            return Wait::ready;
+        Until next = until;
+        std::vector<pollfd> waits;
+        for (std::size_t i = 0; i < exchanges.size(); ++i)
+            if (!answers[i]) exchanges[i]->addWaits(waits, next.deadline);
+        const Wait wait = waitAny(waits, next);
+        if (wait == Wait::stopped) return wait;
+        if (wait == Wait::timeout && Clock::now() >= until.deadline) return wait;
     }
 }
 
@@ -259,36 +228,22 @@ WebAnswer failed(const char* why) {
     return answer;
 }
 
-/// The library would look a name up by itself, over any interface, and could not be stopped while it does.
-bool needsName(const WebRequest& request) {
-    return request.addresses.empty() && !IPAddress::fromText(hostOf(request.url));
-}
-
 }  // namespace
-
-std::string hostOf(const std::string& url) {
-    const std::string scheme = partOf(url, {CURLUPART_SCHEME});
-    if (scheme != "http" && scheme != "https") return {};
-    std::string host = partOf(url, {CURLUPART_HOST});
-    if (host.starts_with("[") && host.ends_with("]")) host = host.substr(1, host.size() - 2);
-    return host;
-}
 
 Known<std::vector<WebAnswer>> runWebRequests(const std::vector<WebRequest>& requests, const Until& until,
                                              const Conclusive& conclusive) {
-    static const LibraryUser user;
-    const Multi multi(curl_multi_init());
-    Transfers transfers;
-    Answers answers(requests.size());
+    Exchanges exchanges;
+    Answers answers;
     for (const WebRequest& request : requests) {
-        transfers.push_back(std::make_unique<Transfer>(request));
-        if (needsName(request))
-            answers[transfers.size() - 1] = failed("the name of its host has no address");
-        else
-            curl_multi_add_handle(multi.get(), transfers.back()->handle());
+        const auto place = webPlace(request.url);
+        exchanges.push_back(place ? std::make_unique<Exchange>(request, *place) : nullptr);
+        answers.push_back(std::nullopt);
+        if (!place)
+            answers.back() = failed("its URL is none of http or https");
+        else if (addressesOf(request, *place).empty())
+            answers.back() = failed("the name of its host has no address");
     }
-    const Wait wait = turnAll(multi.get(), transfers, answers, until, conclusive);
-    for (const auto& transfer : transfers) curl_multi_remove_handle(multi.get(), transfer->handle());
+    const Wait wait = turnAll(exchanges, answers, until, conclusive);
     if (wait == Wait::stopped) return waitFailure(wait, "the web");
     std::vector<WebAnswer> all;
     for (auto& answer : answers) {

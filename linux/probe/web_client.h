@@ -29,11 +29,9 @@ struct WebAnswer {
     End end = End::failed;
     std::string why;
     int status = 0;
-    std::string body;  ///< up to the request's bound
-    std::string location;
-    std::string contentType;
+    std::string body;      ///< up to the request's bound
+    std::string location;  ///< where a redirect leads, as a whole URL
     std::optional<IPAddress> server;
-    std::chrono::milliseconds took{0};
     ContactSteps steps;
     CertificateFault fault = CertificateFault::none;
     std::optional<std::int64_t> clockOffset;  ///< s by which this device is ahead of the answer's "Date"
@@ -46,8 +44,5 @@ using Conclusive = std::function<bool(const std::vector<std::optional<WebAnswer>
 /// stopped. *Any* thread.
 Known<std::vector<WebAnswer>> runWebRequests(const std::vector<WebRequest>& requests, const Until& until,
                                              const Conclusive& conclusive = nullptr);
-
-/// The host of a URL with the scheme http or https, without brackets; empty for any other form.
-std::string hostOf(const std::string& url);
 
 }  // namespace wp

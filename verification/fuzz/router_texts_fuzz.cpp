@@ -1,6 +1,7 @@
 #include <cstdlib>
 
 #include "linux/probe/ssdp.h"
+#include "linux/probe/web_place.h"
 #include "linux/probe/xml_text.h"
 
 using namespace wp;

@@ -132,19 +132,6 @@ TEST(Ssdp, FindsWhereTheDescriptionIs) {
     EXPECT_EQ(locationFromSsdp("HTTP/1.1 200 OK"), std::nullopt);
 }
 
-TEST(Ssdp, TakesAnAddressApart) {
-    const auto place = httpPlace("http://[fe80::1]:49152/a/b.xml");
-    ASSERT_TRUE(place);
-    EXPECT_EQ(place->host, "fe80::1");
-    EXPECT_EQ(place->port, "49152");
-    EXPECT_EQ(place->path, "/a/b.xml");
-    EXPECT_EQ(httpPlace("HTTP://router")->path, "/");
-    for (const char* url :
-         {"http://", "http://:80/", "http://a:b/", "http://a:123456/", "http://u@a/", "https://a/",
-          "http://a b/", "http://[fe80::1/", "http://[::1]x/", "http://a\r\nb/", ""})
-        EXPECT_FALSE(httpPlace(url)) << url;
-}
-
 constexpr const char* kDescription = R"(<?xml version="1.0"?>
 <root xmlns="urn:schemas-upnp-org:device-1-0"><!-- a router -->
  <device>
@@ -191,14 +178,6 @@ TEST(DeviceDescription, AServiceTypeThatWouldBreakAHeaderIsNotTaken) {
         "<r><service><serviceType>urn:schemas-upnp-org:service:WANIPConnection:1\r\nX: y</serviceType>"
         "<controlURL>/c</controlURL></service></r>");
     EXPECT_EQ(read.controlUrl, "");
-}
-
-TEST(DeviceDescription, ReferencesStayOnTheSameHostUnlessTheyAreWhole) {
-    EXPECT_EQ(resolveReference("http://r:5000/d/x.xml", "/ctl"), "http://r:5000/ctl");
-    EXPECT_EQ(resolveReference("http://r:5000", "ctl"), "http://r:5000/ctl");
-    EXPECT_EQ(resolveReference("http://r/", "http://other/ctl"), "http://other/ctl");
-    EXPECT_EQ(resolveReference("http://r/", "a b"), "");
-    EXPECT_EQ(resolveReference("nothing", "/ctl"), "");
 }
 
 TEST(Soap, ReadsTheOuterAddress) {

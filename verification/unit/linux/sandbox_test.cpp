@@ -85,19 +85,6 @@ TEST(Sandbox, OpensFilesForReadingOnly) {
     EXPECT_EXIT(inSandbox(refusesAll), ::testing::ExitedWithCode(0), "");
 }
 
-TEST(Sandbox, SurvivesALibraryThatIsAskedToKeepALog) {
-    const auto asks = [] {
-        WebRequest request;
-        request.url = "https://127.0.0.1:1/";
-        return bool(runWebRequests({request}, patience()));
-    };
-    const auto asksWithLog = [&] {
-        ::setenv("SSLKEYLOGFILE", "/tmp/wp-sandbox-keys", 1);
-        inSandbox(asks);
-    };
-    EXPECT_EXIT(asksWithLog(), ::testing::ExitedWithCode(0), "");
-}
-
 TEST(Sandbox, LeavesRoomForEveryKindOfMeasuring) {
     const auto measures = [] {
         WebRequest request;

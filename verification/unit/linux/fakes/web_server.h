@@ -1,10 +1,13 @@
 #pragma once
 
 #include <gtest/gtest.h>
+#include <openssl/pem.h>
+#include <openssl/x509.h>
 #include <stdlib.h>
 
 #include <filesystem>
 #include <memory>
+#include <optional>
 #include <sstream>
 #include <string>
 
@@ -15,7 +18,12 @@ namespace wp {
 /// The web server of web_server.py on loopback, with a certificate of its own for "host.example" and 127.0.0.1.
 class WebServer {
   public:
-    WebServer() {
+    /// When the certificate begins and ends to hold, in s from now.
+    struct Validity {
+        long from, to;
+    };
+
+    explicit WebServer(std::optional<Validity> validity = std::nullopt) {
         std::string pattern = ::testing::TempDir() + "/wpXXXXXX";
         folder_ = mkdtemp(pattern.data());
         const std::string make =
@@ -24,6 +32,7 @@ class WebServer {
             "-addext subjectAltName=DNS:host.example,IP:127.0.0.1 -keyout " +
             folder_ + "/key.pem -out " + certificate() + " 2>/dev/null";
         EXPECT_EQ(std::system(make.c_str()), 0);
+        if (validity) renew(*validity);
         server_ = std::make_unique<ChildProcess>(
             std::vector<std::string>{"python3", WP_SOURCE_DIR "/verification/unit/linux/fakes/web_server.py",
                                      certificate(), folder_ + "/key.pem"});
@@ -42,6 +51,25 @@ class WebServer {
     }
 
   private:
+    /// Signs the certificate once more, for another time.
+    void renew(const Validity& validity) const {
+        const std::string key = folder_ + "/key.pem";
+        BIO* const keyFile = BIO_new_file(key.c_str(), "r");
+        BIO* file = BIO_new_file(certificate().c_str(), "r");
+        EVP_PKEY* const signer = PEM_read_bio_PrivateKey(keyFile, nullptr, nullptr, nullptr);
+        X509* const signed_ = PEM_read_bio_X509(file, nullptr, nullptr, nullptr);
+        BIO_free(file);
+        X509_gmtime_adj(X509_getm_notBefore(signed_), validity.from);
+        X509_gmtime_adj(X509_getm_notAfter(signed_), validity.to);
+        EXPECT_NE(X509_sign(signed_, signer, EVP_sha256()), 0);
+        file = BIO_new_file(certificate().c_str(), "w");
+        EXPECT_EQ(PEM_write_bio_X509(file, signed_), 1);
+        BIO_free(file);
+        BIO_free(keyFile);
+        X509_free(signed_);
+        EVP_PKEY_free(signer);
+    }
+
     std::string folder_, plainPort_, securePort_;
     std::unique_ptr<ChildProcess> server_;
 };

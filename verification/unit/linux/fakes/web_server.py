@@ -43,6 +43,19 @@ class Handler(http.server.BaseHTTPRequestHandler):
             self.answer(200)
         elif path == "/page":
             self.answer(200, b"<html>please log in</html>")
+        elif path == "/chunks":
+            self.send_response(200)
+            self.send_header("Transfer-Encoding", "chunked")
+            self.end_headers()
+            self.wfile.write(b"6;x=y\r\n<html>\r\n14\r\nplease log in</html>\r\n0\r\nTrailer: x\r\n\r\n")
+        elif path == "/until-closed":
+            self.send_response(200)
+            self.end_headers()
+            self.wfile.write(b"<html>please log in</html>")
+            self.close_connection = True
+        elif path == "/other-protocol":
+            self.wfile.write(b"220 mail.example ESMTP\r\n")
+            self.close_connection = True
         elif path == "/redirect":
             self.answer(302, Location="/login")
         elif path == "/nowhere":

@@ -1,4 +1,4 @@
-#include "linux/probe/udp_socket.h"
+#include "linux/probe/ip_socket.h"
 
 #include <netinet/in.h>
 
@@ -61,9 +61,9 @@ std::uint16_t SocketAddress::port() const {
     return ntohs(reinterpret_cast<const sockaddr_in6*>(&storage)->sin6_port);
 }
 
-Known<Descriptor> udpSocket(const IPAddress& address, const std::string& interfaceName) {
+Known<Descriptor> ipSocket(int type, const IPAddress& address, const std::string& interfaceName) {
     const int family = address.isIPv4() ? AF_INET : AF_INET6;
-    Descriptor socket(::socket(family, SOCK_DGRAM | SOCK_CLOEXEC | SOCK_NONBLOCK, 0));
+    Descriptor socket(::socket(family, type | SOCK_CLOEXEC | SOCK_NONBLOCK, 0));
     if (!socket)
         return failure(Reason::unsupported, std::string("no socket of this family: ") + std::strerror(errno));
     const auto size = static_cast<socklen_t>(interfaceName.size());

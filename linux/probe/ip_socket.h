@@ -25,9 +25,10 @@ struct SocketAddress {
     const sockaddr* raw() const { return reinterpret_cast<const sockaddr*>(&storage); }
 };
 
-/// A datagram socket of the family of `address`, bound to the interface where one is named. Being refused the
-/// interface is `notPermitted`.
-Known<Descriptor> udpSocket(const IPAddress& address, const std::string& interfaceName);
+/// A socket of the family of `address` that never blocks, bound to the interface where one is named. Being refused
+/// the interface is `notPermitted`.
+/// \param type SOCK_DGRAM or SOCK_STREAM
+Known<Descriptor> ipSocket(int type, const IPAddress& address, const std::string& interfaceName);
 
 /// Looks at one answer and where it came from; true ends the exchange.
 using AcceptDatagram = std::function<bool(Bytes message, const IPAddress& sender)>;

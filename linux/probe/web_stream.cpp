@@ -1,0 +1,171 @@
+#include "linux/probe/web_stream.h"
+
+#include <openssl/err.h>
+#include <openssl/ssl.h>
+#include <openssl/x509v3.h>
+#include <sys/socket.h>
+
+#include <algorithm>
+#include <cerrno>
+#include <cstring>
+
+#include "service/ip_address.h"
+
+namespace wp {
+namespace {
+
+/// The folder lets the few authorities that are needed be read, a file would all be read.
+constexpr const char* kSystemsAuthorities = "/etc/ssl/certs";
+
+struct Release {
+    void operator()(SSL_CTX* context) const { SSL_CTX_free(context); }
+    void operator()(SSL* connection) const { SSL_free(connection); }
+};
+
+CertificateFault faultOfCode(long code) {
+    switch (code) {
+        case X509_V_OK:
+            return CertificateFault::none;
+        case X509_V_ERR_HOSTNAME_MISMATCH:
+        case X509_V_ERR_IP_ADDRESS_MISMATCH:
+            return CertificateFault::wrongHost;
+        case X509_V_ERR_CERT_NOT_YET_VALID:
+            return CertificateFault::notYetValid;
+        case X509_V_ERR_CERT_HAS_EXPIRED:
+            return CertificateFault::expired;
+        case X509_V_ERR_DEPTH_ZERO_SELF_SIGNED_CERT:
+        case X509_V_ERR_SELF_SIGNED_CERT_IN_CHAIN:
+            return CertificateFault::selfSigned;
+        case X509_V_ERR_UNABLE_TO_GET_ISSUER_CERT:
+        case X509_V_ERR_UNABLE_TO_GET_ISSUER_CERT_LOCALLY:
+        case X509_V_ERR_UNABLE_TO_VERIFY_LEAF_SIGNATURE:
+            return CertificateFault::unknownIssuer;
+        case X509_V_ERR_CERT_REVOKED:
+            return CertificateFault::revoked;
+        default:
+            return CertificateFault::other;
+    }
+}
+
+std::string lastReason() {
+    const char* const reason = ERR_reason_error_string(ERR_peek_last_error());
+    return reason != nullptr ? reason : "no reason given";
+}
+
+/// Who is trusted; false where the file cannot be read.
+bool setAuthorities(SSL_CTX* context, const std::string& file) {
+    return file.empty() ? SSL_CTX_load_verify_dir(context, kSystemsAuthorities) == 1
+                        : SSL_CTX_load_verify_file(context, file.c_str()) == 1;
+}
+
+/// Whom the certificate must be for.
+bool setHost(SSL* connection, const std::string& host) {
+    if (IPAddress::fromText(host))
+        return X509_VERIFY_PARAM_set1_ip_asc(SSL_get0_param(connection), host.c_str()) == 1;
+    // The macro for the second call casts in C's way.
+    return SSL_set1_host(connection, host.c_str()) == 1 &&
+           SSL_ctrl(connection, SSL_CTRL_SET_TLSEXT_HOSTNAME, TLSEXT_NAMETYPE_host_name,
+                    const_cast<char*>(host.c_str())) == 1;
+}
+
+}  // namespace
+
+struct WebStream::Secure {
+    std::unique_ptr<SSL_CTX, Release> context;
+    std::unique_ptr<SSL, Release> connection;
+
+    /// Nothing where all is ready for the first step, else what is missing.
+    std::string prepare(int descriptor, const std::string& host, const std::string& authorities) {
+        context.reset(SSL_CTX_new(TLS_client_method()));
+        if (!context || SSL_CTX_set_min_proto_version(context.get(), TLS1_2_VERSION) != 1)
+            return lastReason();
+        if (!setAuthorities(context.get(), authorities))
+            return "certificates of authorities: " + lastReason();
+        SSL_CTX_set_verify(context.get(), SSL_VERIFY_PEER, nullptr);
+        // An authority that the configuration names need not be the last of its chain.
+        X509_VERIFY_PARAM_set_flags(SSL_CTX_get0_param(context.get()), X509_V_FLAG_PARTIAL_CHAIN);
+        // Many servers end a connection without a word; a body that breaks off is seen by its own length.
+        SSL_CTX_set_options(context.get(), SSL_OP_IGNORE_UNEXPECTED_EOF);
+        connection.reset(SSL_new(context.get()));
+        if (!connection || !setHost(connection.get(), host) || SSL_set_fd(connection.get(), descriptor) != 1)
+            return lastReason();
+        SSL_set_connect_state(connection.get());
+        return {};
+    }
+};
+
+WebStream::WebStream(Descriptor connection) : connection_(std::move(connection)) {}
+
+WebStream::~WebStream() = default;
+
+StreamStep WebStream::secure(const std::string& host, const std::string& authorities) {
+    ERR_clear_error();
+    if (!secure_) {
+        secure_ = std::make_unique<Secure>();
+        why_ = secure_->prepare(connection_.number(), host, authorities);
+        if (!why_.empty()) return StreamStep::failed;
+    }
+    const StreamStep step = outcomeOf(SSL_do_handshake(secure_->connection.get()));
+    const long verified = SSL_get_verify_result(secure_->connection.get());
+    if (step == StreamStep::failed && verified != X509_V_OK) {
+        fault_ = faultOfCode(verified);
+        why_ = std::string("the certificate does not hold: ") + X509_verify_cert_error_string(verified);
+    }
+    return step;
+}
+
+StreamStep WebStream::write(std::string_view& bytes) {
+    if (secure_) {
+        ERR_clear_error();
+        std::size_t written = 0;
+        const int result = SSL_write_ex(secure_->connection.get(), bytes.data(), bytes.size(), &written);
+        bytes.remove_prefix(written);
+        return outcomeOf(result);
+    }
+    const ssize_t written = ::send(connection_.number(), bytes.data(), bytes.size(), MSG_NOSIGNAL);
+    if (written < 0) return errno == EAGAIN ? StreamStep::needsWrite : outcomeOfSystem();
+    bytes.remove_prefix(static_cast<std::size_t>(written));
+    return StreamStep::done;
+}
+
+StreamStep WebStream::read(std::span<char> buffer, std::size_t& size) {
+    size = 0;
+    if (secure_) {
+        ERR_clear_error();
+        return outcomeOf(SSL_read_ex(secure_->connection.get(), buffer.data(), buffer.size(), &size));
+    }
+    const ssize_t received = ::recv(connection_.number(), buffer.data(), buffer.size(), 0);
+    if (received == 0) return StreamStep::closed;
+    if (received < 0) return errno == EAGAIN ? StreamStep::needsRead : outcomeOfSystem();
+    size = static_cast<std::size_t>(received);
+    return StreamStep::done;
+}
+
+StreamStep WebStream::outcomeOfSystem() {
+    if (errno == EINTR) return StreamStep::needsRead;
+    why_ = std::strerror(errno);
+    return StreamStep::failed;
+}
+
+/// The library's word on a step that it has just taken.
+StreamStep WebStream::outcomeOf(int result) {
+    const int systems = errno;
+    switch (SSL_get_error(secure_->connection.get(), result)) {
+        case SSL_ERROR_NONE:
+            return StreamStep::done;
+        case SSL_ERROR_WANT_READ:
+            return StreamStep::needsRead;
+        case SSL_ERROR_WANT_WRITE:
+            return StreamStep::needsWrite;
+        case SSL_ERROR_ZERO_RETURN:
+            return StreamStep::closed;
+        case SSL_ERROR_SYSCALL:
+            why_ = systems != 0 ? std::strerror(systems) : "the connection was closed";
+            return StreamStep::failed;
+        default:
+            why_ = lastReason();
+            return StreamStep::failed;
+    }
+}
+
+}  // namespace wp
