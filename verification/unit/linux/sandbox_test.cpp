@@ -3,10 +3,13 @@
 #include <fcntl.h>
 #include <gtest/gtest.h>
 #include <signal.h>
+#include <sys/ioctl.h>
 #include <sys/mman.h>
 #include <sys/mount.h>
+#include <sys/prctl.h>
 #include <sys/ptrace.h>
 #include <sys/socket.h>
+#include <sys/syscall.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -58,10 +61,20 @@ const Forbidden kForbidden[] = {
     {"another user", [] { (void)::setuid(65534); }},
 };
 
-TEST(Sandbox, KillsWhoeverCallsWhatMeasuringDoesNotTake) {
+TEST(Sandbox, KillsWhoeverDoesWhatNobodyDoesByMistake) {
     for (const Forbidden& each : kForbidden)
         EXPECT_EXIT(inSandbox([&] { return each.call(), true; }), ::testing::KilledBySignal(SIGSYS), "")
             << each.name;
+}
+
+TEST(Sandbox, FailsCallsAndNumbersThatItDoesNotKnow) {
+    const auto fails = [](long result) { return result == -1 && errno == ENOSYS; };
+    const auto allFail = [&] {
+        return fails(::ioctl(0, TIOCGWINSZ, nullptr)) && fails(::prctl(PR_GET_TIMERSLACK, 0, 0, 0, 0)) &&
+               fails(::prctl(PR_SET_DUMPABLE, 1, 0, 0, 0)) && fails(::syscall(SYS_getpriority, 0, 0)) &&
+               fails(::syscall(100000)) && fails(::socket(AF_BLUETOOTH, SOCK_RAW, 0));
+    };
+    EXPECT_EXIT(inSandbox(allFail), ::testing::ExitedWithCode(0), "");
 }
 
 TEST(Sandbox, LetsNoMemoryHoldCode) {
