@@ -10,6 +10,7 @@
 #include <string_view>
 
 #include "linux/config.h"
+#include "linux/files/user_folder.h"
 #include "linux/privileges.h"
 #include "linux/sandbox.h"
 #include "linux/session.h"
@@ -42,12 +43,7 @@ struct Options {
 
 /// The configuration, or the line that says what is wrong with it.
 std::variant<wp::Config, std::string> readConfig(const std::string& named) {
-    const char* const folder = std::getenv("XDG_CONFIG_HOME");
-    const char* const home = std::getenv("HOME");
-    // An empty or relative folder counts as none.
-    const std::string user = folder != nullptr && *folder == '/' ? folder
-                             : home != nullptr                   ? std::string(home) + "/.config"
-                                                                 : "";
+    const std::string user = wp::userConfigFolder([](const char* name) { return std::getenv(name); });
     return wp::loadConfig(wp::configFiles(user), named);
 }
 

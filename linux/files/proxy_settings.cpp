@@ -5,11 +5,13 @@
 #include <string_view>
 
 #include "linux/files/key_value_file.h"
+#include "linux/files/user_folder.h"
 #include "service/bytes.h"
 
 namespace wp {
 namespace {
 
+constexpr std::size_t kLongestDatabase = 8U << 20;
 constexpr const char* kVariables[] = {"http_proxy", "https_proxy", "all_proxy",
                                       "HTTP_PROXY", "HTTPS_PROXY", "ALL_PROXY"};
 constexpr std::string_view kProxyMode = "/org/gnome/system/proxy/mode";
@@ -98,11 +100,9 @@ std::vector<std::string> findProxies(const std::function<const char*(const char*
         const auto more = proxyVariables(readAssignments(*text), "/etc/environment");
         places.insert(places.end(), more.begin(), more.end());
     }
-    const char* home = variable("HOME");
-    const char* configured = variable("XDG_CONFIG_HOME");
-    const std::string folder =
-        configured != nullptr ? configured : std::string(home ? home : "") + "/.config";
-    const auto database = readSmallFile(root + folder + "/dconf/user", std::size_t{8} << 20);
+    const std::string folder = userConfigFolder(variable);
+    const auto database =
+        folder.empty() ? std::nullopt : readSmallFile(root + folder + "/dconf/user", kLongestDatabase);
     const std::string mode = database ? proxyModeInSettingsDatabase(*database) : "";
     if (mode == "manual" || mode == "auto") places.push_back("desktop settings: " + mode);
     return places;

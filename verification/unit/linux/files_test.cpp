@@ -8,6 +8,7 @@
 #include "linux/files/leases.h"
 #include "linux/files/networkd.h"
 #include "linux/files/proxy_settings.h"
+#include "linux/files/user_folder.h"
 #include "service/bytes.h"
 
 namespace wp {
@@ -263,6 +264,23 @@ TEST_F(Root, ADesktopsProxyCountsUnlessItIsNone) {
     EXPECT_EQ(findProxies(variable, root_), (std::vector<std::string>{"desktop settings: auto"}));
     write("/home/u/.config/dconf/user", settingsDatabase("none"));
     EXPECT_EQ(findProxies(variable, root_), std::vector<std::string>());
+}
+
+TEST_F(Root, AUsersFolderThatIsEmptyOrRelativeCountsAsNone) {
+    const auto folder = [](const char* configured, const char* home) {
+        return userConfigFolder(
+            [=](const char* name) { return std::string_view(name) == "HOME" ? home : configured; });
+    };
+    EXPECT_EQ(folder("/x", "/home/u"), "/x");
+    EXPECT_EQ(folder("", "/home/u"), "/home/u/.config");
+    EXPECT_EQ(folder("here", "/home/u"), "/home/u/.config");
+    EXPECT_EQ(folder(nullptr, "/home/u"), "/home/u/.config");
+    EXPECT_EQ(folder(nullptr, ""), "");
+    EXPECT_EQ(folder(nullptr, nullptr), "");
+
+    const auto variable = [](const char* name) { return std::string_view(name) == "HOME" ? "/home/u" : ""; };
+    write("/home/u/.config/dconf/user", settingsDatabase("manual"));
+    EXPECT_EQ(findProxies(variable, root_), (std::vector<std::string>{"desktop settings: manual"}));
 }
 
 }  // namespace
