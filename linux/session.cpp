@@ -52,6 +52,12 @@ bool hasRadio() {
            std::filesystem::directory_iterator();
 }
 
+/// The reason of whoever was asked first, with the other's.
+Error refusedBoth(Error denied, const Error& byManager) {
+    denied.message += ", and " + byManager.message;
+    return denied;
+}
+
 }  // namespace
 
 Known<PhaseTopic> topicOf(const NumberedTest& test, const DictionaryPointer& configuration) {
@@ -220,9 +226,9 @@ void Session::handleSetPower(const WireRequest& request) {
         Known<Bus> bus = Bus::system();
         const Until until{stop, Clock::now() + kLookAround};
         const Known<bool> done = bus ? setNetworkManagerPower(*bus, request.power, until) : bus.error();
-        return [this, request, error = done ? std::nullopt : std::optional(denied)] {
-            answerSetPower(request, error);
-        };
+        std::optional<Error> left;
+        if (!done) left = bus ? refusedBoth(denied, done.error()) : denied;
+        return [this, request, left] { answerSetPower(request, left); };
     });
 }
 
