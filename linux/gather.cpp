@@ -47,9 +47,7 @@ Known<RadioInterface> chooseInterface(const std::vector<RadioInterface>& station
         return *named;
     }
     if (stations.empty()) return failure(Reason::noInterface, "no Wi-Fi interface");
-    const auto joined =
-        std::ranges::find_if(stations, [](auto& each) { return each.joinedName.has_value(); });
-    return joined == stations.end() ? stations.front() : *joined;
+    return stations.front();
 }
 
 /// All messages of one kind about addresses or routes.
@@ -75,8 +73,18 @@ Known<std::vector<RadioInterface>> gatherStationInterfaces(const Until& until) {
     Known<RadioSocket> radio = RadioSocket::open(until);
     if (!radio) return radio.error();
     Known<std::vector<RadioInterface>> interfaces = radio->interfaces(until);
-    if (interfaces) std::erase_if(*interfaces, [](const RadioInterface& each) { return !each.isStation(); });
+    if (!interfaces) return interfaces;
+    std::erase_if(*interfaces, [](const RadioInterface& each) { return !each.isStation(); });
+    putInUseFirst(*interfaces, isUp);
     return interfaces;
+}
+
+void putInUseFirst(std::vector<RadioInterface>& interfaces,
+                   const std::function<bool(const std::string& name)>& isInterfaceUp) {
+    const auto rank = [&](const RadioInterface& each) {
+        return each.joinedName ? 0 : isInterfaceUp(each.name) ? 1 : 2;
+    };
+    std::ranges::stable_sort(interfaces, {}, rank);
 }
 
 Known<Link> gatherLink(const std::optional<std::string>& wantedInterface, const Until& until) {

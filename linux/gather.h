@@ -1,5 +1,6 @@
 #pragma once
 
+#include <functional>
 #include <optional>
 #include <string>
 
@@ -31,7 +32,10 @@ Known<Airtime> gatherAirtime(const Link& link, const Until& until);
 /// The channels that the radio and the regulatory domain allow.
 Known<AllowedChannels> gatherAllowedChannels(const Link& link, const Until& until);
 
-/// All station interfaces of this machine.
+/// All station interfaces of this machine, those in use first.
 Known<std::vector<RadioInterface>> gatherStationInterfaces(const Until& until);
+/// Joined ones first, then those that are up, each in the kernel's order; the first is the one that is looked at.
+void putInUseFirst(std::vector<RadioInterface>& interfaces,
+                   const std::function<bool(const std::string& name)>& isInterfaceUp);
 
 }  // namespace wp

@@ -304,5 +304,27 @@ TEST_F(Driver, WithoutASwitchIsNoGuess) {
               "the driver mt7921e does not tell whether it shares airtime with Bluetooth (code 5)");
 }
 
+/// The names in the order of use, of interfaces named after what they are.
+std::string inOrderOfUse(const std::vector<std::string>& names) {
+    std::vector<RadioInterface> interfaces;
+    for (const std::string& name : names) {
+        RadioInterface interface;
+        interface.name = name;
+        if (name.starts_with("joined")) interface.joinedName = NetworkName();
+        interfaces.push_back(interface);
+    }
+    putInUseFirst(interfaces, [](const std::string& name) { return !name.starts_with("down"); });
+    std::string order;
+    for (const RadioInterface& each : interfaces) order += each.name + ' ';
+    return order;
+}
+
+TEST(Interfaces, ThoseInUseComeFirst) {
+    EXPECT_EQ(inOrderOfUse({"down0", "up1", "joined2"}), "joined2 up1 down0 ");
+    EXPECT_EQ(inOrderOfUse({"down0", "up1"}), "up1 down0 ");
+    EXPECT_EQ(inOrderOfUse({"down0", "down1", "up2", "up3"}), "up2 up3 down0 down1 ");
+    EXPECT_EQ(inOrderOfUse({}), "");
+}
+
 }  // namespace
 }  // namespace wp
