@@ -15,10 +15,14 @@ bool isStopped(const Error& error) {
 using Asked = std::optional<Known<AskedManager>>;
 
 Asked askedOf(const std::string& name, bool listens, const Known<bool>& accepted) {
-    if (accepted) return AskedManager{name, listens};
-    if (isStopped(accepted.error())) return accepted.error();
-    return failure(Reason::notPermitted, "no permission to scan (CAP_NET_ADMIN), and " + name +
-                                             " would not either: " + accepted.error().message);
+    if (accepted) return AskedManager{name, listens, std::nullopt};
+    const Error& error = accepted.error();
+    if (isStopped(error)) return error;
+    if (error.code == static_cast<int>(Reason::notPermitted))
+        return failure(Reason::notPermitted, "no permission to scan (CAP_NET_ADMIN), and " + name +
+                                                 " would not either: " + error.message);
+    return AskedManager{name, false,
+                        failure(Reason::unavailable, name + " would not scan now: " + error.message)};
 }
 
 Asked askNetworkManager(Bus& bus, const ManagerScanWish& wish, const Until& until) {

@@ -12,6 +12,8 @@ namespace wp {
 struct AskedManager {
     std::string name;
     bool listens = false;  ///< whether the scan stays on each channel and calls nobody
+    /// Why it would not scan now, which is mostly that it is scanning already; nothing where a scan is to come.
+    std::optional<Error> refusal;
 };
 
 /// A scan that is wanted of a connection manager.
@@ -22,7 +24,8 @@ struct ManagerScanWish {
 };
 
 /// Asks whatever manages the interface (NetworkManager, iwd or wpa_supplicant) for a scan. It answers at once, the
-/// scan comes later. Fails as `notPermitted`, with a text that says who is missing or refused. *Any* thread.
+/// scan comes later. Fails as `notPermitted`, with a text that says who is missing or whom the user may not ask.
+/// *Any* thread.
 Known<AskedManager> askManagerForScan(Known<Bus>& bus, const ManagerScanWish& wish, const Until& until);
 
 }  // namespace wp

@@ -15,6 +15,12 @@ constexpr int kListenAttempts = 3;
 constexpr int kStartAttempts = 4;
 // Managers put a scan off for some seconds when another one has just ended.
 constexpr std::chrono::seconds kManagersDelay{10};
+// A manager's scan calls: 30 to 110 ms on each of some 40 channels, more slowly while it is joined.
+constexpr std::chrono::seconds kLongestRunningScan{8};
+
+bool isCancelled(const Error& error) {
+    return error.code == static_cast<int>(Reason::cancelled);
+}
 
 bool hearsOthers(const std::vector<AccessPoint>& found) {
     return std::ranges::any_of(found, [](const AccessPoint& each) { return !each.joined; });
@@ -51,11 +57,7 @@ class ScanRun {
         const auto asked = askManagerForScan(bus, {wish_.interfaceName, wish_.named, listening}, until_);
         if (!asked) return asked.error();
         manager = *asked;
-        // What ends before a scan has started is one of before.
-        const Known<ScanEvent> start =
-            radio_.nextScanStart(wish_.interfaceIndex, until_.within(kManagersDelay));
-        if (!start) return start.error();
-        const Known<ScanEvent> end = radio_.nextScanEnd(wish_.interfaceIndex, until_);
+        const Known<ScanEvent> end = asked->refusal ? runningScansEnd(*asked->refusal) : nextScansEnd();
         if (!end) return end.error();
         if (end->kind == ScanEvent::Kind::aborted)
             return failure(Reason::timeout, "a scan by " + manager.name + " was aborted");
@@ -63,6 +65,20 @@ class ScanRun {
     }
 
   private:
+    /// What ends before a scan has started is one of before.
+    Known<ScanEvent> nextScansEnd() {
+        const Known<ScanEvent> start =
+            radio_.nextScanStart(wish_.interfaceIndex, until_.within(kManagersDelay));
+        return start ? radio_.nextScanEnd(wish_.interfaceIndex, until_) : start;
+    }
+
+    /// A manager that refuses is most likely scanning; where it is not, its refusal stands.
+    Known<ScanEvent> runningScansEnd(const Error& refusal) {
+        const Known<ScanEvent> end =
+            radio_.nextScanEnd(wish_.interfaceIndex, until_.within(kLongestRunningScan));
+        return end || isCancelled(end.error()) ? end : Known<ScanEvent>(refusal);
+    }
+
     ScanOrder fullOrder() const {
         ScanOrder order;
         if (wish_.named) order.names.push_back(*wish_.named);
@@ -200,8 +216,16 @@ Known<RadioSocket> openRadio(const Until& until) {
 
 }  // namespace
 
-bool Scanner::Remembered::serves(const ScanWish& wish) const {
-    return interfaceIndex == wish.interfaceIndex && report.completedAt >= wish.freshSince;
+void ScanMemory::keep(std::uint32_t interfaceIndex, const ScanReport& report) {
+    if (report.completedAt == 0) return;
+    interfaceIndex_ = interfaceIndex;
+    report_ = report;
+}
+
+const ScanReport* ScanMemory::serving(const ScanWish& wish) const {
+    const bool serves =
+        report_ && interfaceIndex_ == wish.interfaceIndex && report_->completedAt >= wish.freshSince;
+    return serves ? &*report_ : nullptr;
 }
 
 Known<ScanReport> Scanner::scanNow(RadioSocket& radio, const ScanWish& wish, const Until& until) {
@@ -210,7 +234,7 @@ Known<ScanReport> Scanner::scanNow(RadioSocket& radio, const ScanWish& wish, con
     if (report && report->completedAt == 0)
         notes_.once("scans were cut short: other networks are judged by what was heard until then");
     else if (report && !wish.named && wish.manner == ScanWish::Manner::listening)
-        listened_ = Remembered{wish.interfaceIndex, *report};
+        listened_.keep(wish.interfaceIndex, *report);
     return report;
 }
 
@@ -221,7 +245,7 @@ Known<ScanReport> Scanner::scanWithoutPermission(RadioSocket& radio, const ScanW
     const bool listening = wish.manner == ScanWish::Manner::listening && !wish.named;
     Known<ScanReport> report = ScanRun(radio, wish, until).runByManager(listening, manager);
     if (report) {
-        if (manager.listens) listened_ = Remembered{wish.interfaceIndex, *report};
+        if (manager.listens) listened_.keep(wish.interfaceIndex, *report);
         notes_.once("no permission to scan (CAP_NET_ADMIN): " + manager.name + " was asked to scan instead" +
                     (manager.listens ? "" : ", which does not count networks that hide"));
         return report;
@@ -235,20 +259,19 @@ Known<ScanReport> Scanner::scanWithoutPermission(RadioSocket& radio, const ScanW
 
 Known<std::vector<AccessPoint>> Scanner::scan(const ScanWish& wish, const Until& until) {
     const std::lock_guard lock(scanning_);
-    if (scanned_ && scanned_->serves(wish) && sees(scanned_->report.accessPoints, wish.named)) {
-        return scanned_->report.accessPoints;
-    }
+    const ScanReport* const kept = scanned_.serving(wish);
+    if (kept != nullptr && sees(kept->accessPoints, wish.named)) return kept->accessPoints;
     Known<RadioSocket> radio = openRadio(until);
     if (!radio) return radio.error();
     const Known<ScanReport> report = scanNow(*radio, wish, until);
     if (!report) return report.error();
-    scanned_ = Remembered{wish.interfaceIndex, *report};
+    scanned_.keep(wish.interfaceIndex, *report);
     return report->accessPoints;
 }
 
 Known<std::vector<AccessPoint>> Scanner::listen(const ScanWish& wish, const Until& until) {
     const std::lock_guard lock(scanning_);
-    if (listened_ && listened_->serves(wish)) return listened_->report.accessPoints;
+    if (const ScanReport* const kept = listened_.serving(wish)) return kept->accessPoints;
     Known<RadioSocket> radio = openRadio(until);
     if (!radio) return radio.error();
     const Known<ScanReport> report = ScanRun(*radio, wish, until).listen();
@@ -256,7 +279,7 @@ Known<std::vector<AccessPoint>> Scanner::listen(const ScanWish& wish, const Unti
         return failure(Reason::notPermitted,
                        "no permission to listen (CAP_NET_ADMIN), and no connection manager that could");
     if (!report) return report.error();
-    listened_ = Remembered{wish.interfaceIndex, *report};
+    listened_.keep(wish.interfaceIndex, *report);
     return report->accessPoints;
 }
 

@@ -30,6 +30,19 @@ struct ScanWish {
     std::optional<NetworkName> named;
 };
 
+/// The last scan of a kind. One thread at a time.
+class ScanMemory {
+  public:
+    /// A report without a scan takes the place of none.
+    void keep(std::uint32_t interfaceIndex, const ScanReport& report);
+    /// The scan, where it is of that interface and fresh enough; else null.
+    const ScanReport* serving(const ScanWish& wish) const;
+
+  private:
+    std::uint32_t interfaceIndex_ = 0;
+    std::optional<ScanReport> report_;
+};
+
 /// Scans, and remembers the last scan longer than the kernel does. Without the permission to scan it asks whatever
 /// manages the interface, and what that costs is told once. *Any* thread; one scan at a time.
 class Scanner {
@@ -45,19 +58,12 @@ class Scanner {
     Known<std::vector<AccessPoint>> listen(const ScanWish& wish, const Until& until);
 
   private:
-    struct Remembered {
-        std::uint32_t interfaceIndex = 0;
-        ScanReport report;
-        bool serves(const ScanWish& wish) const;
-    };
-
     Known<ScanReport> scanNow(RadioSocket& radio, const ScanWish& wish, const Until& until);
     Known<ScanReport> scanWithoutPermission(RadioSocket& radio, const ScanWish& wish, const Until& until);
 
     Notes& notes_;
     std::mutex scanning_;
-    std::optional<Remembered> scanned_;
-    std::optional<Remembered> listened_;
+    ScanMemory scanned_, listened_;
 };
 
 }  // namespace wp

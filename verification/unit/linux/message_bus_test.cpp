@@ -239,6 +239,7 @@ TEST_F(MessageBus, AScanIsAskedOfWhateverManagesTheInterface) {
     const auto asked = [&](const char* interface) {
         const auto manager = askManagerForScan(bus, {interface, std::nullopt, true}, patience());
         if (!manager) return manager.error().text();
+        if (manager->refusal) return manager->name + " refuses: " + manager->refusal->text();
         return manager->name + (manager->listens ? " listens" : "");
     };
     EXPECT_EQ(asked("wlan0"), "NetworkManager");
@@ -247,6 +248,13 @@ TEST_F(MessageBus, AScanIsAskedOfWhateverManagesTheInterface) {
     EXPECT_EQ(asked("wlan4"),
               "no permission to scan (CAP_NET_ADMIN), and NetworkManager would not either: "
               "org.freedesktop.NetworkManager answered: Not authorized (code 6)");
+    EXPECT_EQ(
+        asked("wlan8"),
+        "NetworkManager refuses: NetworkManager would not scan now: org.freedesktop.NetworkManager answered: "
+        "Scanning not allowed while already scanning (code 4)");
+    EXPECT_EQ(asked("wlan10"),
+              "iwd refuses: iwd would not scan now: net.connman.iwd answered: Operation already in progress "
+              "(code 4)");
     EXPECT_EQ(asked("wlan9"),
               "no permission to scan (CAP_NET_ADMIN), and no connection manager to ask for a scan (code 6)");
     bus = failure(Reason::unavailable, "there is no message bus");

@@ -5,6 +5,7 @@
 
 #include "linux/echo_message.h"
 #include "linux/power_switch.h"
+#include "linux/scanner.h"
 
 namespace wp {
 namespace {
@@ -94,6 +95,24 @@ TEST(SwitchEvent, TellsOtherRadiosFromWiFi) {
 
 TEST(SwitchEvent, IsNoneWhenItIsCut) {
     EXPECT_FALSE(readSwitchEvent(Packet(7)));
+}
+
+TEST(ScanMemory, KeepsAScanOverWhatWasHeardWithoutOne) {
+    ScanMemory memory;
+    ScanWish wish;
+    wish.interfaceIndex = 3;
+    wish.freshSince = 500;
+    EXPECT_EQ(memory.serving(wish), nullptr);
+    memory.keep(3, {{}, 1000});
+    memory.keep(3, {std::vector<AccessPoint>(2), 0});
+
+    ASSERT_NE(memory.serving(wish), nullptr);
+    EXPECT_EQ(memory.serving(wish)->completedAt, 1000);
+    wish.freshSince = 1001;
+    EXPECT_EQ(memory.serving(wish), nullptr);
+    wish = {};
+    wish.interfaceIndex = 4;
+    EXPECT_EQ(memory.serving(wish), nullptr);
 }
 
 }  // namespace

@@ -34,7 +34,7 @@ def network_manager():
                    "if args[0] == 'wlan7': raise dbus.exceptions.DBusException("
                    "'silent', name='org.freedesktop.DBus.Error.NoReply')\n"
                    "ret = dbus.ObjectPath('%s/Devices/' + {'wlan0': '1', 'wlan1': '2', 'wlan4': '4', 'wlan5': '5',"
-                   " 'wlan6': '6'}[args[0]])" % base)
+                   " 'wlan6': '6', 'wlan8': '8'}[args[0]])" % base)
     device = nm + ".Device"
     main.AddObject(base + "/Devices/1", device, {
         "Managed": True, "ActiveConnection": dbus.ObjectPath(base + "/ActiveConnection/1"),
@@ -54,6 +54,10 @@ def network_manager():
     main.AddObject(base + "/ActiveConnection/5", nm + ".Connection.Active",
                    {"Connection": dbus.ObjectPath(base + "/Settings/5")}, [])
     main.AddObject(base + "/Devices/6", device, {"Managed": True, "ActiveConnection": dbus.ObjectPath("/")}, [])
+    main.AddObject(base + "/Devices/8", device, {"Managed": True}, [])
+    dbusmock.get_object(base + "/Devices/8").AddMethod(
+        device + ".Wireless", "RequestScan", "a{sv}", "", "raise dbus.exceptions.DBusException("
+        "'Scanning not allowed while already scanning', name='org.freedesktop.NetworkManager.Device.NotAllowed')")
     main.AddObject(base + "/ActiveConnection/1", nm + ".Connection.Active",
                    {"Connection": dbus.ObjectPath(base + "/Settings/1")}, [])
     main.AddObject(base + "/DHCP4Config/1", nm + ".DHCP4Config", {"Options": dbus.Dictionary({
@@ -126,6 +130,10 @@ def iwd():
     main.AddObject("/net/connman/iwd/0/5", name + ".Device", {"Name": "wlan2"}, [])
     for device in ("3", "5"):
         dbusmock.get_object("/net/connman/iwd/0/" + device).AddMethod(name + ".Station", "Scan", "", "", "")
+    main.AddObject("/net/connman/iwd/0/10", name + ".Device", {"Name": "wlan10"}, [])
+    dbusmock.get_object("/net/connman/iwd/0/10").AddMethod(
+        name + ".Station", "Scan", "", "", "raise dbus.exceptions.DBusException("
+        "'Operation already in progress', name='net.connman.iwd.InProgress')")
     main.AddObject("/net/connman/iwd/a_psk", name + ".KnownNetwork", {
         "Name": "Home", "Type": "psk", "Hidden": False, "AutoConnect": True,
         "LastConnectedTime": "2023-11-14T22:13:20Z"}, [])
