@@ -115,12 +115,19 @@ void SettingsTableView::pressRow(IndexPath indexPath) {
 }
 
 double SettingsTableView::sectionTop(int section) const {
-    double top = contentInset_.top;
-    for (int number = 0; number < section; ++number) {
-        const Section& above = sections_[number];
-        top += above.headerHeight + above.footerHeight + kRowHeight * static_cast<double>(above.rows.size());
+    double height = 0;
+    for (int number = 0; number <= section && number < numberOfSections(); ++number) {
+        const Section& next = sections_[number];
+        if (height >= kHeaderHeight) height += gapAbove(next);
+        if (number == section) break;
+        height += next.headerHeight + next.footerHeight + kRowHeight * static_cast<double>(next.rows.size());
     }
-    return top;
+    return contentInset_.top + height;
+}
+
+double SettingsTableView::gapAbove(const Section& section) const {
+    bool isGroup = style_ == Style::grouped && !section.rows.empty();
+    return isGroup && section.headerHeight < 1 ? kGroupGap : 0;
 }
 
 double SettingsTableView::contentHeight() const {
@@ -157,8 +164,8 @@ void SettingsTableView::scrollToRow(IndexPath indexPath, ScrollPosition /*positi
     layoutIfNeeded();
     if (!hasRow(indexPath) || viewHeight() <= 0) return;
     Rect row = rectForRow(indexPath);
-    // With the first row of the list its section's title comes back into view.
-    double top = indexPath.row == 0 ? row.y - sections_[indexPath.section].headerHeight : row.y;
+    // The row above, or the section's title, is seen as well, so that nobody takes the row for the first.
+    double top = row.y - kHeaderHeight;
     double lowest = std::max(0.0, contentHeight() - viewHeight());
     double wanted = contentOffset_;
     if (row.bottom() + contentInset_.bottom > wanted + viewHeight())

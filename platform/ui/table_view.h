@@ -73,6 +73,8 @@ class SettingsTableView : public View {
     static constexpr double kRowHeight = 66;
     /// Automatic height of a header with a title.
     static constexpr double kHeaderHeight = 66;
+    /// In the grouped style: from the rows of one section to those of the next where no title stands between.
+    static constexpr double kGroupGap = 30;
 
     SettingsTableView(Rect frame, Style style) : View(frame), style_(style) {}
 
@@ -159,7 +161,8 @@ class SettingsTableView : public View {
     Rect rectForRow(IndexPath indexPath) const;
     Rect rectForHeader(int section) const;
     std::vector<IndexPath> indexPathsForVisibleRows() const;
-    /// Scrolls as little as it takes; nothing happens for a row that there is not.
+    /// Scrolls as little as it takes for the row to be seen with what is next to it; nothing happens for a row
+    /// that there is not.
     void scrollToRow(IndexPath indexPath, ScrollPosition position, Animated animated);
     void layoutSubviews() override;
     /// @}
@@ -190,6 +193,7 @@ class SettingsTableView : public View {
     std::optional<IndexPath> rowBefore(IndexPath indexPath) const;
     void showFocusedRow();
     double sectionTop(int section) const;
+    double gapAbove(const Section& section) const;
     double viewHeight() const { return frame().height; }
 
     Style style_;

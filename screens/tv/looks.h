@@ -62,6 +62,8 @@ struct TableLook {
     Q_PROPERTY(double opacity MEMBER opacity)
     Q_PROPERTY(double offset MEMBER offset)
     Q_PROPERTY(bool isMuted MEMBER isMuted)
+    Q_PROPERTY(bool hasMoreAbove MEMBER hasMoreAbove)
+    Q_PROPERTY(bool hasMoreBelow MEMBER hasMoreBelow)
   public:
     bool isShown = false;
     QRectF frame;
@@ -69,6 +71,8 @@ struct TableLook {
     double offset = 0;
     /// Arrows move the focus, but nothing can be chosen now.
     bool isMuted = false;
+    bool hasMoreAbove = false;  ///< rows outside the table's edges
+    bool hasMoreBelow = false;
     friend bool operator==(const TableLook&, const TableLook&) = default;
 };
 
@@ -84,6 +88,7 @@ struct AlertLook {
     Q_PROPERTY(QString placeholder MEMBER placeholder)
     Q_PROPERTY(int cursor MEMBER cursor)
     Q_PROPERTY(double cursorX MEMBER cursorX)
+    Q_PROPERTY(double textWidth MEMBER textWidth)
     Q_PROPERTY(QVariantList actions MEMBER actions)
   public:
     bool isShown = false;
@@ -93,8 +98,9 @@ struct AlertLook {
     bool isFieldFocused = false;
     QString text;  ///< of the field, with what an input method is composing
     QString placeholder;
-    int cursor = 0;        ///< in the text, UTF-16 units
-    double cursorX = 0;    ///< from the text's left edge
+    int cursor = 0;      ///< in the text, UTF-16 units
+    double cursorX = 0;  ///< from the text's left edge
+    double textWidth = 0;
     QVariantList actions;  ///< of `ActionLook`
     friend bool operator==(const AlertLook&, const AlertLook&) = default;
 };

@@ -100,6 +100,7 @@ AlertLook lookOf(const ui::AlertController& alert, const QString& composed) {
     look.text = before + displayed(text.substr(field.cursor()));
     look.cursor = static_cast<int>(before.size());
     look.cursorX = cursorPosition(look.text, look.cursor, kFieldFont);
+    look.textWidth = cursorPosition(look.text, static_cast<int>(look.text.size()), kFieldFont);
     look.placeholder = displayed(field.placeholder());
     return look;
 }
@@ -125,7 +126,7 @@ void Stage::apply(const ui::SettingsTableView& table, const ui::TableChanges& ba
 }
 
 void Stage::givePictureSize(ui::Screen& screen) {
-    constexpr ui::Size kSize{380, 380};
+    constexpr ui::Size kSize{520, 520};
     if (auto* image = screen.viewAs<ui::ImageView>(ui::identifiers::image)) image->setImageSize(kSize);
 }
 
@@ -161,6 +162,10 @@ void Stage::tellValue(QQuickItem* bar, int value) {
     QAccessible::updateAccessibility(&event);
 }
 
+double Stage::balancedWidth(const QString& text, int fontSize, double width) {
+    return tv::balancedWidth(TextMeasurer(), text, ui::Font::system(fontSize), width);
+}
+
 void Stage::takeTable(const ui::Screen& screen) {
     const ui::SettingsTableView* table = screen.table();
     if (!table) {
@@ -181,6 +186,9 @@ void Stage::takeTable(const ui::Screen& screen) {
     look.opacity = table->alpha();
     look.offset = table->contentOffset();
     look.isMuted = !table->allowsSelection();
+    look.hasMoreAbove = table->contentOffset() > 0;
+    look.hasMoreBelow = table->contentHeight() - table->contentInset().bottom >
+                        table->contentOffset() + table->frame().height;
     set(table_, look, &Stage::tableChanged);
 }
 

@@ -48,6 +48,8 @@ class Stage final : public QObject {
     Q_INVOKABLE static void tellUse(QQuickItem* item);
     /// Tells a screen reader that the bar has another value.
     Q_INVOKABLE static void tellValue(QQuickItem* bar, int value);
+    /// For a text in the middle of a width: how much of it to use, so that no word is left alone on the last line.
+    Q_INVOKABLE static double balancedWidth(const QString& text, int fontSize, double width);
     void takeKeyboard(QVariantList keys) { set(keyboard_, std::move(keys), &Stage::keyboardChanged); }
 
   signals:

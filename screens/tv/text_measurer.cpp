@@ -16,9 +16,11 @@ QString shownText(std::string_view text) {
     return shown.replace(QLatin1Char('\n'), QChar::LineSeparator);
 }
 
-QTextOption wrapping() {
+/// The scene lays texts out by the face's design metrics, so that they come out alike at every unit.
+QTextOption optionOf(QTextOption::WrapMode wrapping) {
     QTextOption option;
-    option.setWrapMode(QTextOption::WrapAtWordBoundaryOrAnywhere);
+    option.setWrapMode(wrapping);
+    option.setUseDesignMetrics(true);
     return option;
 }
 
@@ -40,7 +42,7 @@ ui::TextSize TextMeasurer::measure(std::string_view text, const ui::Font& font, 
                                    int maxLines) const {
     if (text.empty()) return {};
     QTextLayout layout(shownText(text), fontOf(font));
-    layout.setTextOption(wrapping());
+    layout.setTextOption(optionOf(QTextOption::WrapAtWordBoundaryOrAnywhere));
     ui::TextSize measured;
     int lines = 0;
     layout.beginLayout();
@@ -60,8 +62,29 @@ ui::TextSize TextMeasurer::measure(std::string_view text, const ui::Font& font, 
     return measured;
 }
 
+double balancedWidth(const ui::TextMeasurer& measurer, const QString& text, const ui::Font& font,
+                     double width) {
+    auto measure = [&](const QString& part, double limit) {
+        return measurer.measure(part.toStdString(), font, limit, 0);
+    };
+    auto linesAt = [&](double limit) { return measure(text, limit).lines; };
+    int lines = linesAt(width);
+    if (lines < 2) return width;
+    double narrow = width / lines;
+    for (const QString& word : text.split(QLatin1Char(' ')))
+        narrow = std::max(narrow, measure(word, 0).size.width);
+    double wide = width;
+    while (wide - narrow > 4) {
+        double middle = (narrow + wide) / 2;
+        (linesAt(middle) > lines ? narrow : wide) = middle;
+    }
+    // Sizes are rounded to dots when a coarse screen draws them.
+    return std::min(width, 1.03 * wide);
+}
+
 double cursorPosition(const QString& text, int position, const ui::Font& font) {
     QTextLayout layout(text, fontOf(font));
+    layout.setTextOption(optionOf(QTextOption::NoWrap));
     layout.beginLayout();
     QTextLine line = layout.createLine();
     if (line.isValid()) line.setLineWidth(kNoLimit);

@@ -22,6 +22,11 @@ class TextMeasurer final : public ui::TextMeasurer {
                          int maxLines) const override;
 };
 
+/// The narrowest width, in points, at which the text takes no more lines than at the given one and no word of it is
+/// broken: its lines come out about as long as each other, and none is left with a word alone.
+double balancedWidth(const ui::TextMeasurer& measurer, const QString& text, const ui::Font& font,
+                     double width);
+
 /// Where the cursor stands in a line of text, in points from its left edge. The position is in UTF-16 units.
 double cursorPosition(const QString& text, int position, const ui::Font& font);
 

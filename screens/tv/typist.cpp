@@ -19,7 +19,16 @@ void Typist::type(std::string_view text) {
 void Typist::press(ui::Key key) {
     if (isInField()) return pressInField(key);
     screen_.press(key);
-    if (key == ui::Key::up && isInField() && !typesByHand_) keyboard_.enterFromBelow();
+    if (key != ui::Key::up || !hasField()) return;
+    // Under a keyboard the actions stand side by side: up leads out of their row.
+    for (std::size_t left = screen_.alert()->actions().size(); left > 1 && !isInField(); --left)
+        screen_.press(key);
+    if (isInField() && !typesByHand_) keyboard_.enterFromBelow();
+}
+
+bool Typist::hasField() const {
+    auto alert = screen_.alert();
+    return alert && !alert->textFields().empty();
 }
 
 void Typist::pressInField(ui::Key key) {

@@ -25,6 +25,7 @@ class Typist {
     bool isOnKeyboard() const { return isInField() && !typesByHand_; }
 
   private:
+    bool hasField() const;
     void pressInField(ui::Key key);
     void pressKeyOfKeyboard();
     void finish();

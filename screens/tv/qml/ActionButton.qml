@@ -11,19 +11,21 @@ Item {
     readonly property bool isUsable: look ? look.isEnabled : false
     onIsUsableChanged: stage.tellUse(button)
 
+    readonly property bool isMuted: look ? !look.isEnabled : false
     readonly property real wantedFocus: look && look.isFocused ? 1 : 0
     readonly property bool isMoving: focusLook.opacity !== wantedFocus
 
-    height: 72 * u
+    height: 78 * u
     onWantedFocusChanged: if (wantedFocus) Qt.callLater(stage.tellFocus, button)
 
     Rectangle {
-        x: 12 * button.u
-        y: 2 * button.u
-        width: parent.width - 2 * x
-        height: parent.height - 2 * y
-        radius: 10 * button.u
-        color: "#e7eaf0"
+        anchors.fill: parent
+        anchors.leftMargin: 12 * button.u
+        anchors.rightMargin: 12 * button.u
+        anchors.topMargin: 3 * button.u
+        anchors.bottomMargin: 3 * button.u
+        radius: 12 * button.u
+        color: "#e9edf3"
     }
     Rectangle {
         id: focusLook
@@ -31,8 +33,12 @@ Item {
         anchors.fill: parent
         anchors.leftMargin: 12 * button.u * (1 - opacity)
         anchors.rightMargin: 12 * button.u * (1 - opacity)
-        radius: 12 * button.u
-        color: button.look && button.look.isEnabled ? "#16243a" : "#8b93a1"
+        anchors.topMargin: button.u * (3 - 6 * opacity)
+        anchors.bottomMargin: button.u * (3 - 6 * opacity)
+        radius: 14 * button.u
+        color: button.isMuted ? "#d5dce8" : "#16243a"
+        border.width: button.isMuted ? 4 * button.u : 0
+        border.color: "#66758e"
         opacity: button.wantedFocus
         visible: opacity > 0
         Behavior on opacity {
@@ -52,7 +58,7 @@ Item {
         font.family: button.stage.fontFamily
         font.pointSize: button.u * 32
         font.hintingPreference: Font.PreferNoHinting
-        color: !button.look ? "black" : button.look.isFocused ? "#ffffff" : button.look.isEnabled ? "#16191f" : "#767c87"
+        color: !button.look ? "black" : button.isMuted ? "#6a7281" : button.look.isFocused ? "#ffffff" : "#16191f"
     }
 
     Accessible.role: Accessible.Button

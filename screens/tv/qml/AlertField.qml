@@ -11,9 +11,12 @@ Rectangle {
     // While a key of the keyboard on the screen has the focus, a screen reader follows that one.
     readonly property bool isRead: look.isFieldFocused && !stage.keyboard.some(key => key.isFocused)
 
+    // As the text is drawn, whose size is rounded to dots.
+    readonly property real cursorX: look.textWidth > 0 ? typed.implicitWidth * look.cursorX / look.textWidth : 0
+
     onIsReadChanged: if (isRead) Qt.callLater(stage.tellFocus, field)
 
-    height: 76 * u
+    height: 84 * u
     radius: 12 * u
     color: "#f1f3f7"
     border.width: u * (look.isFieldFocused ? 4 : 2)
@@ -30,7 +33,7 @@ Rectangle {
         Text {
             id: typed
 
-            x: Math.min(0, view.width - field.u * (4 + field.look.cursorX))
+            x: Math.min(0, view.width - 4 * field.u - field.cursorX)
             height: parent.height
             verticalAlignment: Text.AlignVCenter
             horizontalAlignment: Text.AlignLeft
@@ -54,11 +57,11 @@ Rectangle {
             font.family: field.stage.fontFamily
             font.pointSize: field.u * 34
             font.hintingPreference: Font.PreferNoHinting
-            color: "#767c87"
+            color: "#6a7281"
         }
         Rectangle {
             objectName: "cursor"
-            x: typed.x + field.u * field.look.cursorX
+            x: typed.x + field.cursorX
             y: 16 * field.u
             width: 4 * field.u
             height: parent.height - 2 * y

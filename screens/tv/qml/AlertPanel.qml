@@ -1,6 +1,6 @@
 import QtQuick
 
-// An alert over everything: its texts, its field, its actions one below the other.
+// An alert over everything: its texts, its field with the keyboard, its actions.
 Rectangle {
     id: alert
 
@@ -8,8 +8,8 @@ Rectangle {
     readonly property real u: stage.unit
     readonly property var look: stage.alert
     readonly property real wantedOpacity: look.isShown ? 1 : 0
-    readonly property real capWidth: (panel.width - 112 * u) / 22
-    readonly property real capHeight: 70 * u
+    readonly property real capWidth: (panel.width - 120 * u) / 22
+    readonly property real capHeight: 74 * u
 
     function moves() {
         if (opacity !== wantedOpacity)
@@ -33,9 +33,9 @@ Rectangle {
         id: panel
 
         anchors.centerIn: parent
-        width: alert.u * (alert.look.hasField ? 1240 : 960)
-        height: content.height + 96 * alert.u
-        radius: 18 * alert.u
+        width: alert.u * (alert.look.hasField ? 1280 : 1000)
+        height: content.height + 112 * alert.u
+        radius: 24 * alert.u
         color: "#ffffff"
 
         Accessible.role: Accessible.AlertMessage
@@ -46,23 +46,29 @@ Rectangle {
         Column {
             id: content
 
-            x: 56 * alert.u
-            y: 48 * alert.u
+            x: 64 * alert.u
+            y: 56 * alert.u
             width: parent.width - 2 * x
-            spacing: 26 * alert.u
+            spacing: 32 * alert.u
 
-            AlertText {
-                stage: alert.stage
-                text: alert.look.title
-                font.pointSize: u * 40
-                font.bold: true
-                color: "#16191f"
-            }
-            AlertText {
-                stage: alert.stage
-                text: alert.look.message
-                font.pointSize: u * 32
-                color: "#3a414d"
+            Column {
+                width: parent.width
+                spacing: 16 * alert.u
+
+                AlertText {
+                    stage: alert.stage
+                    text: alert.look.title
+                    size: 42
+                    font.bold: true
+                    color: "#16191f"
+                }
+                AlertText {
+                    stage: alert.stage
+                    text: alert.look.message
+                    size: 33
+                    isBalanced: true
+                    color: alert.look.title !== "" ? "#3a414d" : "#16191f"
+                }
             }
             AlertField {
                 stage: alert.stage
@@ -71,7 +77,9 @@ Rectangle {
                 visible: look.hasField
             }
             Item {
-                width: parent.width
+                // The keys' own margins end at the field's edges.
+                x: -4 * alert.u
+                width: parent.width - 2 * x
                 height: 5 * alert.capHeight
                 visible: alert.look.hasField
 
@@ -95,9 +103,12 @@ Rectangle {
                     }
                 }
             }
-            Column {
-                width: parent.width
-                spacing: 6 * alert.u
+            // One below the other; under a keyboard side by side, as wide as it together.
+            Grid {
+                x: -12 * alert.u
+                width: parent.width - 2 * x
+                columns: alert.look.hasField ? Math.max(1, alert.look.actions.length) : 1
+                rowSpacing: 12 * alert.u
 
                 Repeater {
                     id: actions
@@ -107,7 +118,7 @@ Rectangle {
 
                         stage: alert.stage
                         look: alert.look.actions[index]
-                        width: parent ? parent.width : 0
+                        width: parent ? parent.width / parent.columns : 0
                     }
                 }
             }

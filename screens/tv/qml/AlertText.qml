@@ -2,9 +2,13 @@ import QtQuick
 
 Text {
     required property var stage
+    required property int size
+    property bool isBalanced: false
     readonly property real u: stage.unit
+    readonly property real limit: parent.width / u
 
-    width: parent.width
+    anchors.horizontalCenter: parent.horizontalCenter
+    width: u * (isBalanced ? stage.balancedWidth(text, size, limit) : limit)
     visible: text !== ""
     textFormat: Text.PlainText
     wrapMode: Text.Wrap
@@ -12,6 +16,7 @@ Text {
     elide: Text.ElideRight
     horizontalAlignment: Text.AlignHCenter
     font.family: stage.fontFamily
+    font.pointSize: u * size
     font.hintingPreference: Font.PreferNoHinting
 
     Accessible.role: Accessible.StaticText

@@ -12,6 +12,9 @@ Item {
     readonly property bool isUsable: look ? look.isEnabled : false
     onIsUsableChanged: stage.tellUse(cap)
 
+    readonly property bool isMuted: look ? !look.isEnabled : false
+    // Signs are drawn larger than words, which share their key with more letters.
+    readonly property int fontSize: !look || !look.isFunction ? 34 : look.label.length > 2 ? 27 : 40
     readonly property real wantedFocus: look && look.isFocused ? 1 : 0
     readonly property bool isMoving: focusLook.opacity !== wantedFocus
 
@@ -22,7 +25,7 @@ Item {
         anchors.fill: parent
         anchors.margins: 4 * cap.u
         radius: 10 * cap.u
-        color: cap.look && (cap.look.isOn || cap.look.isFunction) ? (cap.look.isOn ? "#b9c8e2" : "#d9dee7") : "#eef1f5"
+        color: !cap.look ? "white" : cap.look.isOn ? "#1b5fc1" : cap.look.isFunction ? "#d0d8e4" : "#e9edf3"
     }
     Rectangle {
         id: focusLook
@@ -30,7 +33,9 @@ Item {
         anchors.fill: parent
         anchors.margins: cap.u * (4 - 8 * opacity)
         radius: 12 * cap.u
-        color: cap.look && cap.look.isEnabled ? "#16243a" : "#8b93a1"
+        color: cap.isMuted ? "#d5dce8" : "#16243a"
+        border.width: cap.isMuted ? 4 * cap.u : 0
+        border.color: "#66758e"
         opacity: cap.wantedFocus
         visible: opacity > 0
         Behavior on opacity {
@@ -48,9 +53,9 @@ Item {
         textFormat: Text.PlainText
         elide: Text.ElideRight
         font.family: cap.stage.fontFamily
-        font.pointSize: cap.u * (cap.look && cap.look.isFunction && cap.look.label.length > 2 ? 27 : 32)
+        font.pointSize: cap.u * cap.fontSize
         font.hintingPreference: Font.PreferNoHinting
-        color: !cap.look ? "black" : cap.look.isFocused ? "#ffffff" : cap.look.isEnabled ? "#16191f" : "#767c87"
+        color: cap.isMuted ? "#6a7281" : cap.look && (cap.look.isFocused || cap.look.isOn) ? "#ffffff" : "#16191f"
     }
 
     Accessible.role: Accessible.Button

@@ -10,6 +10,8 @@ Item {
     function moves() {
         if (opacity !== stage.table.opacity || content.y !== -u * stage.table.offset)
             return true
+        if (above.isMoving || below.isMoving)
+            return true
         for (let i = 0; i < lines.count; ++i) {
             const line = lines.itemAt(i)
             if (line && line.isMoving)
@@ -51,5 +53,19 @@ Item {
                 stage: table.stage
             }
         }
+    }
+
+    // Rows beyond the edges fade out there.
+    Veil {
+        id: above
+        stage: table.stage
+        isShown: table.stage.table.hasMoreAbove
+    }
+    Veil {
+        id: below
+        stage: table.stage
+        isShown: table.stage.table.hasMoreBelow
+        anchors.bottom: parent.bottom
+        rotation: 180
     }
 }

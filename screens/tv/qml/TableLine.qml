@@ -23,6 +23,10 @@ Item {
     onIsUsableChanged: stage.tellUse(line)
 
     property bool isThere: !isNew
+    readonly property bool isMuted: stage.table.isMuted
+    // Where the whole table is pale its rows need no paler ink of their own.
+    readonly property bool isPale: stage.table.opacity === 1 && (isMuted || !isEnabled)
+    readonly property color ink: isPale && !(isFocused && isMuted) ? "#6a7281" : "#16191f"
     readonly property real wantedOpacity: isLeaving || !isThere ? 0 : 1
     readonly property bool isMoving: opacity !== wantedOpacity || y !== u * lineTop || focusLook.opacity !== focusLook.wanted
 
@@ -46,18 +50,19 @@ Item {
         if (isFocused) Qt.callLater(stage.tellFocus, line)
     }
 
-    // The ground of a row; the rows of a group stand closer to each other than to the next group.
+    // The ground of a row. It does not shine through the focus of a table at half opacity.
     Rectangle {
-        visible: !line.isHeader
-        x: 12 * line.u
-        y: line.isFirst ? 3 * line.u : 0
-        width: line.width - 2 * x
-        height: line.height - y - (line.isLast ? 3 : 2) * line.u
-        radius: 10 * line.u
-        color: "#eff1f5"
+        visible: !line.isHeader && focusLook.opacity < 1
+        anchors.fill: parent
+        anchors.leftMargin: 12 * line.u
+        anchors.rightMargin: 12 * line.u
+        anchors.topMargin: 3 * line.u
+        anchors.bottomMargin: 3 * line.u
+        radius: 12 * line.u
+        color: "#e9edf3"
     }
 
-    // The focus: a dark ground, 12 points wider on either side.
+    // The focus: a dark ground that grows to every side; a pale one with an edge while nothing can be chosen.
     Rectangle {
         id: focusLook
 
@@ -67,8 +72,12 @@ Item {
         anchors.fill: parent
         anchors.leftMargin: 12 * line.u * (1 - opacity)
         anchors.rightMargin: 12 * line.u * (1 - opacity)
-        radius: 12 * line.u
-        color: line.stage.table.isMuted ? "#8b93a1" : "#16243a"
+        anchors.topMargin: line.u * (3 - 6 * opacity)
+        anchors.bottomMargin: line.u * (3 - 6 * opacity)
+        radius: 14 * line.u
+        color: line.isMuted ? "#d5dce8" : "#16243a"
+        border.width: line.isMuted ? 4 * line.u : 0
+        border.color: "#66758e"
         opacity: wanted
         Behavior on opacity {
             enabled: line.stage.hasMotion && line.isThere
@@ -81,7 +90,7 @@ Item {
     }
 
     Text {
-        x: line.u * (line.isHeader ? 28 : 40)
+        x: line.u * 40
         width: line.width - 2 * x
         height: line.height - (line.isHeader ? 8 * line.u : 0)
         verticalAlignment: line.isHeader ? Text.AlignBottom : Text.AlignVCenter
@@ -92,8 +101,9 @@ Item {
         maximumLineCount: 1
         font.family: line.stage.fontFamily
         font.pointSize: line.u * (line.isHeader ? 24 : 32)
+        font.bold: line.isHeader
         font.hintingPreference: Font.PreferNoHinting
-        color: line.isHeader ? "#5a6270" : line.isFocused ? "#ffffff" : line.isEnabled ? "#16191f" : "#767c87"
+        color: line.isHeader ? "#4f5866" : line.isFocused && !line.isMuted ? "#ffffff" : line.ink
     }
 
     Accessible.role: isHeader ? Accessible.Heading : Accessible.ListItem

@@ -147,7 +147,7 @@ TEST_F(TypistTest, DoneWithoutATextDoesNothing) {
 TEST_F(TypistTest, BelowTheKeyboardAreTheActionsAndUpLeadsBack) {
     press({Key::down, Key::down, Key::down, Key::down});
     EXPECT_FALSE(typist.isInField());
-    press({Key::down, Key::up, Key::up});
+    press({Key::down, Key::up});
 
     EXPECT_TRUE(typist.isOnKeyboard());
     EXPECT_EQ(typist.keyboard().focusedRow(), 4U);

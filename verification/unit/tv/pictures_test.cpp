@@ -67,6 +67,15 @@ class Pictures : public testing::Test {
         run.showList();
     }
 
+    /// Presses keys of the remote control.
+    void pressKeys(const std::vector<Qt::Key>& keys) {
+        QWindow* window = QGuiApplication::topLevelWindows().front();
+        for (Qt::Key key : keys) {
+            QKeyEvent event(QEvent::KeyPress, key, Qt::NoModifier);
+            QCoreApplication::sendEvent(window, &event);
+        }
+    }
+
     /// Puts the focus on the row without a key.
     void focus(const std::string& text) { run.focus(text); }
 
@@ -174,6 +183,24 @@ TEST_F(Pictures, FocusOnOther) {
     expectPicture("focus_other");
 }
 
+TEST_F(Pictures, FocusOnSearchAgain) {
+    open();
+    showList(neighbourhood(4));
+
+    focus("Search Again");
+
+    expectPicture("focus_search");
+}
+
+TEST_F(Pictures, ScrolledToTheEnd) {
+    open();
+    showList(neighbourhood(18));
+
+    focus("Search Again");
+
+    expectPicture("list_end");
+}
+
 TEST_F(Pictures, FocusIsMutedWhileARescanRuns) {
     open();
     showList(neighbourhood(4));
@@ -211,6 +238,40 @@ TEST_F(Pictures, TextEntryOfALongName) {
     run.press({Key::down, Key::down});
 
     expectPicture("text_entry_done");
+}
+
+TEST_F(Pictures, TextEntryWithShiftAndSymbols) {
+    open();
+    showList(neighbourhood(4));
+
+    run.choose("Other…");
+    // From "q" to the lowest row's first key, which is shift; pressed twice it locks.
+    pressKeys({Qt::Key_Down, Qt::Key_Down, Qt::Key_Down, Qt::Key_Select, Qt::Key_Select, Qt::Key_Up});
+    pressKeys({Qt::Key_Select});
+    expectPicture("text_entry_shift");
+    pressKeys({Qt::Key_Down, Qt::Key_Right, Qt::Key_Select});
+    expectPicture("text_entry_symbols");
+}
+
+TEST_F(Pictures, TextEntryInGerman) {
+    open("de");
+    showList(neighbourhood(4));
+    run.choose("Anderes …");
+    expectPicture("text_entry_german");
+}
+
+TEST_F(Pictures, TextEntryInJapanese) {
+    open("ja");
+    showList(neighbourhood(4));
+    run.choose("その他…");
+    expectPicture("text_entry_japanese");
+}
+
+TEST_F(Pictures, ConfirmationOfAHostileName) {
+    open();
+    showList({{"<b>\u202Eabc</b>\x1b[2J WWWWWWWWWWWWWWW", "1"}});
+    run.choose("<b>\u202Eabc</b>\x1b[2J WWWWWWWWWWWWWWW");
+    expectPicture("confirmation_hostile");
 }
 
 TEST_F(Pictures, WiFiIsOff) {
@@ -319,6 +380,14 @@ TEST_F(Pictures, InFullSize) {
     showList(neighbourhood(18));
 
     expectPicture("list_1080");
+}
+
+TEST_F(Pictures, InFourTimesFullSize) {
+    setenv("WIFI_PROFILE_TV_SIZE", "3840x2160", 1);
+    open();
+    showList(neighbourhood(4));
+
+    expectPicture("list_2160");
 }
 
 }  // namespace

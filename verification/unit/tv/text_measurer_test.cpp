@@ -60,6 +60,24 @@ TEST_F(TextMeasurerTest, NothingTakesNoRoom) {
     EXPECT_EQ(measure("").lines, 0);
 }
 
+TEST_F(TextMeasurerTest, ABalancedTextTakesNoMoreLinesAndLeavesNoWordAlone) {
+    QString text = QStringLiteral("Wi-Fi is turned off. Turn it on to see the networks nearby?");
+    double width = measure("Wi-Fi is turned off. Turn it on to see the networks").size.width;
+
+    double balanced = balancedWidth(measurer, text, ui::Font::body(), width);
+
+    EXPECT_EQ(measure(text.toStdString(), balanced).lines, 2);
+    EXPECT_LT(balanced, 0.7 * width);
+    EXPECT_EQ(balancedWidth(measurer, QStringLiteral("nearby?"), ui::Font::body(), width), width);
+}
+
+TEST_F(TextMeasurerTest, BalancingBreaksNoWord) {
+    QString text = QStringLiteral("to ") + QString(20, QLatin1Char('W')) + QStringLiteral(" now");
+    double word = measure(std::string(20, 'W')).size.width;
+
+    EXPECT_GE(balancedWidth(measurer, text, ui::Font::body(), 1.1 * word), word);
+}
+
 TEST_F(TextMeasurerTest, TheCursorStandsBehindWhatIsBeforeIt) {
     QString text = QStringLiteral("Home");
 

@@ -174,6 +174,27 @@ TEST(TableScrolling, KeepsTheFocusedRowInsideTheTableWithRoomBelow) {
     EXPECT_GE(visible.size(), 13u);
 }
 
+TEST(TableScrolling, ShowsTheRowAboveTheFocusedOne) {
+    Rows rows;
+    for (int i = 0; i < 100; ++i) rows.push_back("row " + std::to_string(i));
+    TableOnScreen given({rows});
+
+    for (int i = 0; i < 50; ++i) given.screen.press(Key::down);
+    for (int i = 0; i < 30; ++i) given.screen.press(Key::up);
+
+    EXPECT_EQ(given.table->indexPathsForVisibleRows().front(), (IndexPath{19, 0}));
+    EXPECT_EQ(given.table->contentOffset(), given.table->rectForRow({19, 0}).y);
+}
+
+TEST(TableGroups, AreApartWhereNoTitleStandsBetweenThem) {
+    TableOnScreen given("a b||c|d");
+
+    double gap = SettingsTableView::kGroupGap;
+    EXPECT_EQ(given.table->rectForRow({0, 2}).y - given.table->rectForRow({1, 0}).bottom(), gap);
+    EXPECT_EQ(given.table->rectForRow({0, 3}).y - given.table->rectForRow({0, 2}).bottom(), gap);
+    EXPECT_EQ(given.table->contentHeight(), given.table->rectForRow({0, 3}).bottom());
+}
+
 TEST(TableScrolling, DoesNothingForARowThatThereIsNot) {
     TableOnScreen given("a");
 
