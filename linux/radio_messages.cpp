@@ -123,6 +123,13 @@ bool RadioInterface::isStation() const {
     return type == NL80211_IFTYPE_STATION;
 }
 
+bool RadioChannel::carriesNetworks() const {
+    constexpr std::uint32_t kMetersUntil = 1000, kVehiclesFrom = 5850, kVehiclesUntil = 5925,
+                            kChannel149 = 5745;
+    if (frequency < kVehiclesFrom || frequency > kVehiclesUntil) return frequency > kMetersUntil;
+    return (frequency - kChannel149) % 20 == 0;
+}
+
 std::optional<RadioFamily> readFamily(Bytes buffer) {
     std::optional<RadioFamily> family;
     forEachOf(CTRL_CMD_NEWFAMILY, buffer, [&](const Attributes& message) {

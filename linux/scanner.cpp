@@ -33,6 +33,8 @@ class ScanRun {
         : radio_(radio), wish_(wish), until_(until), startedAt_(bootMilliseconds()) {
         if (const Known<RadioAbilities> abilities = radio_.abilities(wish_.radio, until_))
             abilities_ = *abilities;
+        std::erase_if(abilities_.channels,
+                      [](const RadioChannel& each) { return each.disabled || !each.carriesNetworks(); });
     }
 
     Known<ScanReport> run() {
@@ -46,7 +48,7 @@ class ScanRun {
     Known<ScanReport> listen() {
         ScanOrder order{{}, false, {}};
         for (const RadioChannel& channel : abilities_.channels) {
-            if (!channel.disabled && !channel.passive) order.frequencies.push_back(channel.frequency);
+            if (!channel.passive) order.frequencies.push_back(channel.frequency);
         }
         return complete(order);
     }
@@ -85,17 +87,14 @@ class ScanRun {
         // A radio that can ask for one name only asks for the one that is wanted; all others are heard all the same.
         order.probeForAll = order.names.size() < std::max<std::size_t>(abilities_.namesPerScan, 1);
         if (!wish_.named && wish_.manner == ScanWish::Manner::listening) order.probeForAll = false;
+        for (const RadioChannel& channel : abilities_.channels)
+            order.frequencies.push_back(channel.frequency);
         return order;
-    }
-
-    std::size_t usableChannels() const {
-        return static_cast<std::size_t>(std::ranges::count_if(
-            abilities_.channels, [](const RadioChannel& channel) { return !channel.disabled; }));
     }
 
     bool isAsGood(const ScanEvent& event, const ScanOrder& order) const {
         return order.probeForAll && order.names.empty() && event.probedForAll &&
-               event.frequencies >= usableChannels();
+               event.frequencies >= abilities_.channels.size();
     }
 
     /// What a scan of this order found, and when it was over.
@@ -179,7 +178,7 @@ class ScanRun {
     RadioSocket& radio_;
     const ScanWish& wish_;
     const Until& until_;
-    RadioAbilities abilities_;
+    RadioAbilities abilities_;  ///< with only the channels that may be used and that carry networks
     std::int64_t startedAt_;
     bool wasCutShort_ = false;
 };

@@ -141,6 +141,22 @@ TEST(RadioMessages, GatherARadioFromItsManyMessages) {
     EXPECT_FALSE(readAbilities(dump, 4711));
 }
 
+TEST(RadioMessages, KnowTheChannelsOfVehiclesFromThoseOfNetworks) {
+    std::vector<std::uint32_t> leftOut;
+    for (std::uint32_t frequency = 2400; frequency <= 7115; ++frequency)
+        if (!RadioChannel{frequency, false, false, false}.carriesNetworks()) leftOut.push_back(frequency);
+
+    const auto isLeftOut = [&](std::uint32_t frequency) {
+        return std::ranges::find(leftOut, frequency) != leftOut.end();
+    };
+    for (const std::uint32_t network : {2412, 5180, 5825, 5845, 5865, 5885, 5905, 5955})
+        EXPECT_FALSE(isLeftOut(network)) << network;
+    for (const std::uint32_t vehicles : {5855, 5860, 5870, 5875, 5880, 5890, 5900, 5920})
+        EXPECT_TRUE(isLeftOut(vehicles)) << vehicles;
+    EXPECT_GT(leftOut.front(), 5845U);
+    EXPECT_LT(leftOut.back(), 5955U);
+}
+
 TEST(RadioMessages, TellStartAndEndOfScans) {
     const auto events = readScanEvents(captured("good-home-scan_events"));
 
