@@ -19,12 +19,15 @@ namespace wp::host {
 /// looks at any more is free again soon.
 inline constexpr std::chrono::seconds kClosingPageTime{60};
 
-/// The last page of a run: the sentence on the whole, the most important findings with what to do, and how the
-/// page is closed. The select key closes it on any row. *Main*.
+/// The last page of a run: the sentence on the whole, how the page is closed, and the most important findings with
+/// what to do, each in one row. The select key closes it on any row. *Main*.
 class ClosingPage final : public HostPage, private ui::TableViewDataSource, private ui::TableViewDelegate {
   public:
+    /// The texts stay where they are as long as the page.
     ClosingPage(const Report& report, const Texts& texts);
 
+    /// Tells the viewer how long the page still stands by itself.
+    void showTimeLeft(std::chrono::seconds left);
     void close() { isClosed_ = true; }
     bool isClosed() const { return isClosed_; }
 
@@ -33,10 +36,11 @@ class ClosingPage final : public HostPage, private ui::TableViewDataSource, priv
   private:
     struct Section {
         std::optional<std::string> title;
-        std::vector<std::string> rows;
+        std::string text;
+        std::string detail;
     };
 
-    void addFinding(const ReportedFinding& finding, const Texts& texts);
+    void addFinding(const ReportedFinding& finding);
 
     int numberOfSectionsInTableView(ui::SettingsTableView&) override;
     int tableViewNumberOfRowsInSection(ui::SettingsTableView&, int section) override;
@@ -52,6 +56,7 @@ class ClosingPage final : public HostPage, private ui::TableViewDataSource, priv
         return ui::IndexPath{0, 0};
     }
 
+    const Texts& texts_;
     std::vector<Section> sections_;
     bool isClosed_ = false;
 };

@@ -12,6 +12,9 @@ constexpr ui::Size kSize{1920, 1080};
 constexpr double kTextOpacity = 0.6;
 // As the other screens have it, but darker: a page that is read from three metres, not a list that is used.
 constexpr double kTitleOpacity = 0.6;
+/// The sentence that matters most on a page is larger than its other texts.
+constexpr ui::Font kDescriptionFont = ui::Font::system(34);
+constexpr double kDescriptionOpacity = 0.85;
 constexpr int kDescriptionLines = 5;
 constexpr int kStatusLines = 3;
 
@@ -69,6 +72,8 @@ void HostPage::buildColumn(ui::View& root, const std::string& description, Colum
     add(root, image, ui::identifiers::image);
     std::shared_ptr<ui::Label> text = addLabel(root, ui::identifiers::description, kDescriptionLines);
     text->setText(description);
+    text->setFont(kDescriptionFont);
+    text->setTextColor(ui::Color::white(0, kDescriptionOpacity));
     progress_ = std::make_shared<ui::ProgressView>();
     progress_->setTrackColor(ui::Color::lightGray());
     add(root, progress_, ui::identifiers::progress);
@@ -78,7 +83,7 @@ void HostPage::buildColumn(ui::View& root, const std::string& description, Colum
         {of(*area, top),         equal, of(root, top),            180},
         {of(*area, leading),     equal, of(root, leading),        column.leading},
         {of(*area, width),       equal, {},                       column.width},
-        {of(*area, height),      equal, {},                       480},
+        {of(*area, height),      equal, {},                       440},
         {of(*image, centerX),    equal, of(*area, centerX)},
         {of(*image, centerY),    equal, of(*area, centerY)},
         {of(*text, top),         equal, of(*area, bottom)},
@@ -97,7 +102,8 @@ void HostPage::buildColumn(ui::View& root, const std::string& description, Colum
 ui::SettingsTableView& HostPage::addTable(double width) {
     ui::View& root = *view();
     auto table = std::make_shared<ui::SettingsTableView>(root.frame(), ui::SettingsTableView::Style::grouped);
-    table->setContentInset({0, 0, 60, 0});
+    // Above as far as the focus grows, so that the table's edge does not cut it; below as far as the screen's margin.
+    table->setContentInset({12, 0, 60, 0});
     add(root, table, ui::identifiers::table);
     // clang-format off
     ui::activateConstraints({

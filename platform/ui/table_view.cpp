@@ -63,6 +63,17 @@ void SettingsTableView::loadTitles() {
         section.headerHeight = header >= 0 ? header : section.title ? kHeaderHeight : 0;
         section.footerHeight = footer >= 0 ? footer : 0;
     }
+    measureRows();
+}
+
+void SettingsTableView::measureRows() {
+    for (Section& section : sections_) {
+        section.rowHeight = kRowHeight;
+        if (section.rows.empty() || section.rows.front()->style() != TableViewCell::Style::subtitle) continue;
+        for (const auto& cell : section.rows)
+            section.rowHeight =
+                std::max(section.rowHeight, cell->subtitleHeight(textMeasurer(), frame().width));
+    }
 }
 
 void SettingsTableView::reloadData() {
@@ -120,7 +131,8 @@ double SettingsTableView::sectionTop(int section) const {
         const Section& next = sections_[number];
         if (height >= kHeaderHeight) height += gapAbove(next);
         if (number == section) break;
-        height += next.headerHeight + next.footerHeight + kRowHeight * static_cast<double>(next.rows.size());
+        height +=
+            next.headerHeight + next.footerHeight + next.rowHeight * static_cast<double>(next.rows.size());
     }
     return contentInset_.top + height;
 }
@@ -141,8 +153,9 @@ Rect SettingsTableView::rectForHeader(int section) const {
 
 Rect SettingsTableView::rectForRow(IndexPath indexPath) const {
     if (!hasRow(indexPath)) return {};
-    double top = rectForHeader(indexPath.section).bottom() + indexPath.row * kRowHeight;
-    return {0, top, frame().width, kRowHeight};
+    double height = sections_[indexPath.section].rowHeight;
+    double top = rectForHeader(indexPath.section).bottom() + indexPath.row * height;
+    return {0, top, frame().width, height};
 }
 
 std::vector<IndexPath> SettingsTableView::indexPathsForVisibleRows() const {
@@ -150,11 +163,12 @@ std::vector<IndexPath> SettingsTableView::indexPathsForVisibleRows() const {
     double lowerEdge = contentOffset_ + viewHeight();
     for (int section = 0; section < numberOfSections(); ++section) {
         double top = rectForHeader(section).bottom();
-        int first = std::max(0, static_cast<int>((contentOffset_ - top) / kRowHeight));
+        double height = sections_[section].rowHeight;
+        int first = std::max(0, static_cast<int>((contentOffset_ - top) / height));
         for (int row = first; row < numberOfRows(section); ++row) {
-            double rowTop = top + row * kRowHeight;
+            double rowTop = top + row * height;
             if (rowTop >= lowerEdge) break;
-            if (rowTop + kRowHeight > contentOffset_) visible.push_back({row, section});
+            if (rowTop + height > contentOffset_) visible.push_back({row, section});
         }
     }
     return visible;
@@ -180,6 +194,7 @@ void SettingsTableView::scrollToRow(IndexPath indexPath, ScrollPosition /*positi
 
 void SettingsTableView::layoutSubviews() {
     loadIfNeeded();
+    measureRows();
     double lowest = std::max(0.0, contentHeight() - viewHeight());
     contentOffset_ = std::min(contentOffset_, lowest);
 }

@@ -69,7 +69,8 @@ class SettingsTableView : public View {
     static constexpr double kAutomaticDimension = -1;
     /// As a header's or footer's height: takes no visible room. 0 would mean automatic to older tables.
     static constexpr double kSmallestPositive = std::numeric_limits<double>::min();
-    /// What a remote control's viewer reads and hits: text of 32 points with air around it.
+    /// What a remote control's viewer reads and hits: text of 32 points with air around it. Where the first row of
+    /// a section is of the style `subtitle`, all rows of it are as high as the one that takes most.
     static constexpr double kRowHeight = 66;
     /// Automatic height of a header with a title.
     static constexpr double kHeaderHeight = 66;
@@ -172,6 +173,7 @@ class SettingsTableView : public View {
         std::optional<std::string> title;
         double headerHeight = 0;
         double footerHeight = 0;
+        double rowHeight = kRowHeight;  ///< of each of its rows
         std::vector<std::shared_ptr<TableViewCell>> rows;
     };
     /// What one section becomes, worked out before anything changes.
@@ -180,6 +182,7 @@ class SettingsTableView : public View {
     void loadIfNeeded();
     void load();
     void loadTitles();
+    void measureRows();
     bool titlesAreNew();
     void applyBatch();
     std::string planBatch(std::vector<Plan>& plans);

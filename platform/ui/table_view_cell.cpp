@@ -26,6 +26,15 @@ Rect TableViewCell::detailTextFrame() const {
     return {frame().width - kMargin - detail, 0, detail, detail > 0 ? frame().height : 0};
 }
 
+double TableViewCell::subtitleHeight(const TextMeasurer& measurer, double width) const {
+    // A front end may round its letters up a little.
+    constexpr double kSafePart = 0.97;
+    double limit = kSafePart * (width - 2 * kSubtitleSideMargin);
+    double height = 2 * kSubtitleTopMargin + measurer.measure(text_, kSubtitleTextFont, limit, 0).size.height;
+    if (detailText_.empty()) return height;
+    return height + kSubtitleGap + measurer.measure(detailText_, kSubtitleDetailFont, limit, 0).size.height;
+}
+
 void TableViewCell::prepareForReuse() {
     setText({});
     setDetailText({});

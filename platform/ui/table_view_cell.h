@@ -2,6 +2,8 @@
 
 #include <string>
 
+#include "platform/ui/style.h"
+#include "platform/ui/text_measurer.h"
 #include "platform/ui/view.h"
 
 namespace wp::ui {
@@ -13,6 +15,7 @@ class TableViewCell : public View {
     enum class Style {
         standard = 0,  ///< the text alone
         value1 = 1,    ///< the text on the left, the detail on the right
+        subtitle = 3,  ///< the detail below the text, both over as many lines as they take
     };
 
     TableViewCell(Style style, std::string reuseIdentifier)
@@ -33,6 +36,14 @@ class TableViewCell : public View {
     Rect detailTextFrame() const;
     /// From the cell's edges to its texts.
     static constexpr double kMargin = 20;
+
+    /// How high a cell of the style `subtitle` must be for its texts, at a width.
+    double subtitleHeight(const TextMeasurer& measurer, double width) const;
+    static constexpr Font kSubtitleTextFont{TextStyle::body, 32};
+    static constexpr Font kSubtitleDetailFont{TextStyle::body, 28};
+    static constexpr double kSubtitleSideMargin = 40;
+    static constexpr double kSubtitleTopMargin = 18;
+    static constexpr double kSubtitleGap = 6;
 
     /// Makes a cell that was used before as good as new.
     virtual void prepareForReuse();

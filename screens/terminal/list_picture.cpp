@@ -10,6 +10,28 @@ bool hasTitle(const ui::SettingsTableView& table, int section) {
     return title && !title->empty();
 }
 
+/// A long text is told in this many lines, or cut off.
+constexpr int kMostLines = 12;
+constexpr int kDetailIndent = 2;
+/// For the focus' mark on the left and air on the right.
+constexpr int kRowMargins = 3;
+
+bool isBlock(const ui::TableViewCell& cell) {
+    return cell.style() == ui::TableViewCell::Style::subtitle;
+}
+
+/// The lines of a row: its text, or text and detail over as many as they take.
+std::vector<Cells> textOf(const ui::TableViewCell& cell, int columns, Charset charset) {
+    if (!isBlock(cell)) return {elided(cellsOf(cell.text(), charset), columns, charset)};
+    std::vector<Cells> lines = wrapped(cellsOf(cell.text(), charset), columns, kMostLines, charset);
+    Cells detail = cellsOf(cell.detailText(), charset);
+    for (Cells& line : wrapped(detail, columns - kDetailIndent, kMostLines, charset)) {
+        line.insert(line.begin(), kDetailIndent, Cell{L" ", 1});
+        lines.push_back(std::move(line));
+    }
+    return lines;
+}
+
 int lineOf(const std::vector<ListLine>& lines, ui::IndexPath path) {
     auto isLine = [&](const ListLine& line) { return line.kind == ListLine::Kind::row && line.path == path; };
     return static_cast<int>(std::find_if(lines.begin(), lines.end(), isLine) - lines.begin());
@@ -24,7 +46,7 @@ class ListPainter {
 
     void drawLine(int row, const ListLine& line) {
         if (line.kind == ListLine::Kind::header) drawHeader(row, *table_.titleForHeader(line.path.section));
-        if (line.kind == ListLine::Kind::row) drawRow(row, line.path);
+        if (line.kind == ListLine::Kind::row) drawRow(row, line);
     }
 
   private:
@@ -34,20 +56,20 @@ class ListPainter {
                     elided(cellsOf(title, canvas_.charset()), area_.columns, canvas_.charset()), style);
     }
 
-    void drawRow(int row, ui::IndexPath path) {
-        const ui::TableViewCell& cell = *table_.cellForRow(path);
-        bool isFocused = focused_ == path;
+    void drawRow(int row, const ListLine& line) {
+        const ui::TableViewCell& cell = *table_.cellForRow(line.path);
+        bool isFocused = focused_ == line.path;
         bool isLive = isFocused && table_.allowsSelection();
         Style style{.bold = isLive, .dim = isDim_ || !cell.isUserInteractionEnabled(), .reverse = isLive};
         if (isLive) canvas_.fill(row, area_.column, area_.columns, style);
-        if (isFocused) {
+        if (isFocused && line.part == 0) {
             if (isLive)
                 canvas_.put(row, area_.column, "\u25B8", ">", style);
             else
                 canvas_.put(row, area_.column, "\u25B9", "-", style);
         }
-        Cells name = elided(cellsOf(cell.text(), canvas_.charset()), area_.columns - 3, canvas_.charset());
-        canvas_.put(row, area_.column + 2, name, style);
+        std::vector<Cells> text = textOf(cell, area_.columns - kRowMargins, canvas_.charset());
+        canvas_.put(row, area_.column + 2, text[static_cast<std::size_t>(line.part)], style);
     }
 
     Canvas& canvas_;
@@ -68,15 +90,20 @@ void drawScrollMark(Canvas& canvas, Area frame, int first, int height, int count
 
 }  // namespace
 
-std::vector<ListLine> linesOf(const ui::SettingsTableView& table) {
+std::vector<ListLine> linesOf(const ui::SettingsTableView& table, int columns, Charset charset) {
     std::vector<ListLine> lines;
     for (int section = 0; section < table.numberOfSections(); ++section) {
         if (hasTitle(table, section)) {
             if (!lines.empty()) lines.push_back({ListLine::Kind::blank, {}});
             lines.push_back({ListLine::Kind::header, {0, section}});
         }
-        for (int row = 0; row < table.numberOfRows(section); ++row)
-            lines.push_back({ListLine::Kind::row, {row, section}});
+        for (int row = 0; row < table.numberOfRows(section); ++row) {
+            const ui::TableViewCell& cell = *table.cellForRow({row, section});
+            int parts =
+                isBlock(cell) ? static_cast<int>(textOf(cell, columns - kRowMargins, charset).size()) : 1;
+            for (int part = 0; part < parts; ++part)
+                lines.push_back({ListLine::Kind::row, {row, section}, part});
+        }
     }
     return lines;
 }
@@ -88,7 +115,10 @@ int firstLineToShow(const std::vector<ListLine>& lines, std::optional<ui::IndexP
     int at = focused ? lineOf(lines, *focused) : count;
     if (at < count) {
         bool isUnderTitle = at > 0 && lines[static_cast<std::size_t>(at - 1)].kind == ListLine::Kind::header;
-        first = std::max(first, at - height + 1);
+        int last = at;
+        auto isOfRow = [&](const ListLine& line) { return line.path == *focused && line.part > 0; };
+        while (last + 1 < count && isOfRow(lines[static_cast<std::size_t>(last + 1)])) ++last;
+        first = std::max(first, last - height + 1);
         first = std::min(first, isUnderTitle && height > 1 ? at - 1 : at);
     }
     return std::clamp(first, 0, std::max(0, count - height));
@@ -99,7 +129,7 @@ void drawList(Canvas& canvas, Area area, const ui::SettingsTableView& table,
     Style frame{.dim = true};
     drawFrame(canvas, area, frame);
     Area inner{area.row + 1, area.column + 2, area.rows - 2, area.columns - 4};
-    std::vector<ListLine> lines = linesOf(table);
+    std::vector<ListLine> lines = linesOf(table, inner.columns, canvas.charset());
     firstLine = firstLineToShow(lines, table.lastFocusedIndexPath(), inner.rows, firstLine);
     ListPainter painter(canvas, inner, table, focused);
     int count = static_cast<int>(lines.size());

@@ -16,12 +16,15 @@ struct ListLine {
     Kind kind = Kind::blank;
     /// The row; of a header only the section counts.
     ui::IndexPath path;
+    /// Which of the row's own lines.
+    int part = 0;
 };
 
-/// The table's lines: each section's title (with a blank line before it, but at the top) and its rows.
-std::vector<ListLine> linesOf(const ui::SettingsTableView& table);
+/// The table's lines: each section's title (with a blank line before it, but at the top) and its rows. A row takes
+/// one line, or as many as its texts take at that width.
+std::vector<ListLine> linesOf(const ui::SettingsTableView& table, int columns, Charset charset);
 
-/// The first line to show in a window of that height, so that the focused line is inside, and the title above
+/// The first line to show in a window of that height, so that the focused row is inside, and the title above
 /// it where it is its section's first row. Moves as little as it takes from where it was.
 int firstLineToShow(const std::vector<ListLine>& lines, std::optional<ui::IndexPath> focused, int height,
                     int before);

@@ -26,6 +26,8 @@ Line rowOf(const ui::SettingsTableView& table, ui::IndexPath path) {
     line.row = path.row;
     const ui::TableViewCell& cell = *table.cellForRow(path);
     line.text = ui::displayForm(cell.text());
+    line.detail = ui::displayForm(cell.detailText());
+    line.isBlock = cell.style() == ui::TableViewCell::Style::subtitle;
     line.isEnabled = cell.isUserInteractionEnabled();
     line.isFirst = path.row == 0;
     line.isLast = path.row == table.numberOfRows(path.section) - 1;

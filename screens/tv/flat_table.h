@@ -14,6 +14,8 @@ struct Line {
     int section = 0;
     int row = kHeader;
     std::string text;  ///< in its display form
+    std::string detail;
+    bool isBlock = false;  ///< text and detail over several lines
     bool isEnabled = true;
     bool isFirst = false;  ///< of its section's rows
     bool isLast = false;

@@ -23,6 +23,10 @@ QVariant TableModel::data(const QModelIndex& index, int role) const {
             return entry.id;
         case textRole:
             return QString::fromStdString(entry.line.text);
+        case detailRole:
+            return QString::fromStdString(entry.line.detail);
+        case isBlockRole:
+            return entry.line.isBlock;
         case isHeaderRole:
             return entry.line.isHeader();
         case isEnabledRole:
@@ -47,10 +51,11 @@ QVariant TableModel::data(const QModelIndex& index, int role) const {
 }
 
 QHash<int, QByteArray> TableModel::roleNames() const {
-    return {{idRole, "lineId"},           {textRole, "text"},          {isHeaderRole, "isHeader"},
-            {isEnabledRole, "isEnabled"}, {isFirstRole, "isFirst"},    {isLastRole, "isLast"},
-            {topRole, "lineTop"},         {heightRole, "lineHeight"},  {isFocusedRole, "isFocused"},
-            {isNewRole, "isNew"},         {isLeavingRole, "isLeaving"}};
+    return {{idRole, "lineId"},          {textRole, "text"},           {detailRole, "detail"},
+            {isBlockRole, "isBlock"},    {isHeaderRole, "isHeader"},   {isEnabledRole, "isEnabled"},
+            {isFirstRole, "isFirst"},    {isLastRole, "isLast"},       {topRole, "lineTop"},
+            {heightRole, "lineHeight"},  {isFocusedRole, "isFocused"}, {isNewRole, "isNew"},
+            {isLeavingRole, "isLeaving"}};
 }
 
 void TableModel::setWindow(double top, double height) {

@@ -20,6 +20,8 @@ class TableModel final : public QAbstractListModel {
     enum Role {
         idRole = Qt::UserRole,
         textRole,
+        detailRole,
+        isBlockRole,
         isHeaderRole,
         isEnabledRole,
         isFirstRole,

@@ -8,6 +8,8 @@ Item {
     readonly property real u: stage.unit
     required property int lineId
     required property string text
+    required property string detail
+    required property bool isBlock
     required property bool isHeader
     required property bool isEnabled
     required property bool isFirst
@@ -89,7 +91,20 @@ Item {
         }
     }
 
+    Loader {
+        active: line.isBlock
+        x: line.u * 40
+        y: line.u * 18
+        width: line.width - 2 * x
+        sourceComponent: BlockText {
+            stage: line.stage
+            text: line.text
+            detail: line.detail
+            isLight: line.isFocused && !line.isMuted
+        }
+    }
     Text {
+        visible: !line.isBlock
         x: line.u * 40
         width: line.width - 2 * x
         height: line.height - (line.isHeader ? 8 * line.u : 0)
@@ -108,6 +123,7 @@ Item {
 
     Accessible.role: isHeader ? Accessible.Heading : Accessible.ListItem
     Accessible.name: text
+    Accessible.description: detail
     Accessible.focusable: !isHeader
     Accessible.focused: isFocused
     Accessible.ignored: isLeaving

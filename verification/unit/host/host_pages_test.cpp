@@ -3,6 +3,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <map>
+
 #include "host/closing_page.h"
 #include "host/running_page.h"
 #include "platform/activity.h"
@@ -25,7 +27,8 @@ Evidence withJoined(Dictionary::Entries entries, std::int64_t statusCode = 0) {
 }
 
 std::shared_ptr<ClosingPage> pageOf(const Evidence& evidence, const char* language = "en") {
-    Texts texts(language);
+    static std::map<std::string, Texts> all;
+    const Texts& texts = all.try_emplace(language, language).first->second;
     return std::make_shared<ClosingPage>(makeReport(evidence, {}, texts), texts);
 }
 
@@ -48,8 +51,11 @@ class Viewer final : public ui::FrontEnd {
         ui::SettingsTableView& table = *screen.table();
         for (int section = 0; section < table.numberOfSections(); ++section) {
             if (table.titleForHeader(section)) lines.push_back("[" + *table.titleForHeader(section) + "]");
-            for (int row = 0; row < table.numberOfRows(section); ++row)
-                lines.push_back(table.cellForRow({row, section})->text());
+            for (int row = 0; row < table.numberOfRows(section); ++row) {
+                auto cell = table.cellForRow({row, section});
+                lines.push_back(cell->text());
+                if (!cell->detailText().empty()) lines.push_back(cell->detailText());
+            }
         }
         return lines;
     }
@@ -81,10 +87,10 @@ TEST(ClosingPage, TellsTheOutcomeAndTheThreeWorstFindingsWithWhatToDo) {
         if (line.front() == '[') titles.push_back(line);
     EXPECT_THAT(titles, ElementsAre("[Does not work: Network “Home”]", "[Problem: Network “Home”]",
                                     "[Could be better: Network “Home”]"));
-    EXPECT_EQ(lines[1], "A sign-in page stands between this device and");
-    EXPECT_EQ(lines[2], "the Internet.");
+    EXPECT_EQ(lines[0], "Close");
+    EXPECT_EQ(lines[2], "A sign-in page stands between this device and the Internet.");
     EXPECT_NE(lines[3].front(), '[') << "what to do";
-    EXPECT_EQ(lines.back(), "Close");
+    EXPECT_EQ(viewer.screen.table()->numberOfRows(1), 1) << "a finding is one row";
     EXPECT_TRUE(viewer.screen.layoutReport().conflicts.empty());
     EXPECT_TRUE(viewer.notes.empty());
 }
@@ -136,6 +142,32 @@ TEST(ClosingPage, StandsInsideTheSafeAreaInEveryLanguage) {
         EXPECT_LE(status.frameOnScreen().right(), viewer.screen.table()->frameOnScreen().x) << language;
         EXPECT_EQ(viewer.screen.table()->frameOnScreen(), (ui::Rect{820, 162, 1000, 918}));
     }
+}
+
+TEST(ClosingPage, TheWayOutHasTheFocusAndEachFindingTheRoomThatItTakes) {
+    Viewer viewer;
+    viewer.screen.setRootViewController(
+        pageOf(withJoined({{"isCaptive", true}, {"reachedVantor", false}, {"hasPoorSignal", true}})));
+    viewer.screen.layoutIfNeeded();
+    viewer.screen.focusPreferredView();
+    ui::SettingsTableView& table = *viewer.screen.table();
+
+    EXPECT_EQ(viewer.screen.focusedIndexPath(), (ui::IndexPath{0, 0}));
+    EXPECT_EQ(table.rectForRow({0, 0}).height, ui::SettingsTableView::kRowHeight);
+    ui::Rect finding = table.rectForRow({0, 1});
+    EXPECT_EQ(finding.height, table.cellForRow({0, 1})->subtitleHeight(viewer.screen.textMeasurer(), 1000));
+    EXPECT_GT(finding.height, ui::SettingsTableView::kRowHeight);
+    EXPECT_EQ(table.rectForHeader(2).y, finding.bottom());
+}
+
+TEST(ClosingPage, TellsHowLongItStillStands) {
+    Viewer viewer;
+    std::shared_ptr<ClosingPage> page = pageOf(withJoined({}));
+    viewer.screen.setRootViewController(page);
+
+    page->showTimeLeft(15s);
+
+    EXPECT_EQ(viewer.text(ui::identifiers::status), "Close with OK or Back, or wait 15 seconds.");
 }
 
 TEST(ClosingPage, ClosesByOKOnAnyRow) {

@@ -11,6 +11,8 @@
 #include <cstdlib>
 #include <filesystem>
 
+#include "host/closing_page.h"
+#include "host/running_page.h"
 #include "host/string_table.h"
 #include "screens/tv/tv_screen.h"
 #include "verification/unit/network_list/list_run.h"
@@ -372,6 +374,73 @@ TEST_F(Pictures, AnInputMethodIsToldWhereTheCursorIsPainted) {
     EXPECT_EQ(colorAt(cursor.center().x(), cursor.bottom() - 2), blue);
     EXPECT_NE(colorAt(cursor.right() + 2, cursor.center().y()), blue);
     EXPECT_NE(colorAt(cursor.center().x(), cursor.bottom() + 2), blue);
+}
+
+/// A page of the host's own, as it stands after a run with these results of the joined network or while one runs.
+class HostPictures : public Pictures {
+  protected:
+    void showClosingPage(const std::string& language, Dictionary::Entries joined) {
+        open(language);
+        joined.merge(
+            Dictionary::Entries{{"networkName", "Northlight"}, {"pingedWAN", true}, {"reachedVantor", true}});
+        host::Evidence evidence = host::evidenceFrom(
+            0, Dictionary::make({{"currentNetwork", Dictionary::make(std::move(joined))}}));
+        texts = std::make_unique<host::Texts>(language);
+        show(std::make_shared<host::ClosingPage>(host::makeReport(evidence, {}, *texts), *texts));
+    }
+
+    void show(const std::shared_ptr<ui::ViewController>& page) {
+        run.device.screen.setRootViewController(page);
+        run.device.screen.focusPreferredView();
+    }
+
+    static Dictionary::Entries threeProblems() {
+        return {{"isCaptive", true},
+                {"reachedVantor", false},
+                {"hasPoorSignal", true},
+                {"isBeaconIntervalLong", true},
+                {"isIPv6Assigned", false}};
+    }
+
+    std::unique_ptr<host::Texts> texts;
+};
+
+TEST_F(HostPictures, ClosingPageOfASoundNetwork) {
+    showClosingPage("en", {});
+
+    expectPicture("closing_sound");
+}
+
+TEST_F(HostPictures, ClosingPageOfThreeProblems) {
+    showClosingPage("en", threeProblems());
+
+    expectPicture("closing");
+    run.press({Key::down, Key::down, Key::down});
+    expectPicture("closing_end");
+}
+
+TEST_F(HostPictures, ClosingPageInGerman) {
+    showClosingPage("de", threeProblems());
+
+    expectPicture("closing_german");
+}
+
+TEST_F(HostPictures, ClosingPageInJapanese) {
+    showClosingPage("ja", threeProblems());
+
+    expectPicture("closing_japanese");
+}
+
+TEST_F(HostPictures, WhichTestIsRunning) {
+    open();
+    texts = std::make_unique<host::Texts>("en");
+    host::StringTable strings = host::stringTable("en").value();
+    auto page =
+        std::make_shared<host::RunningPage>(strings["WIFI_DIAGNOSTICS"], strings["PROGRESS_TEXT"], *texts);
+    show(page);
+    page->show({19, "Bluetooth devices", 16, 40});
+
+    expectPicture("running");
 }
 
 TEST_F(Pictures, InFullSize) {
