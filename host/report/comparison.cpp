@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <optional>
 
+#include "host/report/causes.h"
 #include "host/report/checks.h"
 #include "host/report/measured.h"
 #include "host/report/report.h"
@@ -14,16 +15,22 @@ using Kind = ReportedChange::Kind;
 
 /// The same test of both runs.
 struct Pair {
-    const Check& earlier;
-    const Check& now;
+    bool wasFinding, isFinding;
     std::string valueBefore, valueNow;
 };
 
 std::optional<Kind> kindOf(const Pair& pair) {
-    if (pair.earlier.isFinding() != pair.now.isFinding())
-        return pair.now.isFinding() ? Kind::appeared : Kind::gone;
-    bool isOther = pair.now.isFinding() && pair.valueBefore != pair.valueNow;
+    if (pair.wasFinding != pair.isFinding) return pair.isFinding ? Kind::appeared : Kind::gone;
+    bool isOther = pair.isFinding && pair.valueBefore != pair.valueNow;
     return isOther ? std::optional(Kind::value) : std::nullopt;
+}
+
+/// Whether the report of a run with these causes tells the check as a finding, not as harmless.
+bool isTold(const Check& check, const std::vector<Cause>& causes) {
+    return check.isFinding() && std::ranges::none_of(causes, [&](const Cause& cause) {
+               return cause.doer == Doer::nobody && cause.testID == check.test->testID &&
+                      cause.part == check.part;
+           });
 }
 
 std::string sentenceOf(Kind kind, int testID, const Texts& texts) {
@@ -76,8 +83,8 @@ class Comparer {
 
     void add(const Check& earlier, const Check& now) {
         if (!earlier.verdict || !now.verdict) return;
-        const Pair pair{earlier, now, measuredText(earlier_, earlier, texts_),
-                        measuredText(evidence_, now, texts_)};
+        const Pair pair{isTold(earlier, causesBefore_), isTold(now, causesNow_),
+                        measuredText(earlier_, earlier, texts_), measuredText(evidence_, now, texts_)};
         const std::optional<Kind> kind = kindOf(pair);
         if (!kind) return;
         const int testID = now.test->testID;
@@ -90,6 +97,8 @@ class Comparer {
     const Evidence& evidence_;
     const Texts& texts_;
     const Checks before_, now_;
+    const std::vector<Cause> causesBefore_ = causesOf(earlier_, before_),
+                             causesNow_ = causesOf(evidence_, now_);
     Comparison comparison_;
 };
 

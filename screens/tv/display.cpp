@@ -130,6 +130,9 @@ Display::Opened Display::open(Messages given) {
     display->windowSize_ = sizeFrom(wanted);
     if (!wanted.empty() && !display->windowSize_)
         return std::string(kSizeVariable) + ": \"" + wanted + "\" is no size; give one like 1280x720";
+    std::string motion = variable(kMotionVariable);
+    if (!motion.empty() && motion != "none" && motion != "full")
+        return std::string(kMotionVariable) + ": \"" + motion + "\" is no kind of motion; give none or full";
     if (!display->windowSize_ && hasWindowSize(*platform)) display->windowSize_ = QSize(kWidth, kHeight);
     if (Console::isDrawnOverBy(*platform)) {
         display->console_ = Console::take();
