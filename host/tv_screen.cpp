@@ -3,6 +3,8 @@
 #include <dlfcn.h>
 #include <unistd.h>
 
+#include <atomic>
+
 #include "host/exit.h"
 #include "host/extension_module.h"
 
@@ -41,7 +43,7 @@ std::unique_ptr<ui::FrontEnd> TvModule::open(ui::Screen& screen, MainQueue& queu
     tv::Opening opening{.screen = screen, .queue = queue, .texts = textsOf(localization)};
     opening.note = [&log](std::string_view line) { log.note(line); };
     // The toolkit ends the process where it loses its display; only our line comes first.
-    auto isOpen = std::make_shared<bool>(false);
+    auto isOpen = std::make_shared<std::atomic<bool>>(false);
     opening.leave = [isOpen, &log](std::string_view reason) {
         log.eraseProgress();
         log.message((*isOpen ? "the display is gone: " : "--screen: tv: ") + std::string(reason));

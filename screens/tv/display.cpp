@@ -9,6 +9,7 @@
 #include <charconv>
 #include <clocale>
 #include <filesystem>
+#include <mutex>
 
 #include "screens/tv/input_devices.h"
 
@@ -22,6 +23,8 @@ constexpr const char* kSizeVariable = "WIFI_PROFILE_TV_SIZE";
 /// "none" or "full": over what the desktop says.
 constexpr const char* kMotionVariable = "WIFI_PROFILE_TV_MOTION";
 
+/// What stands below belongs to the thread that holds it: the toolkit writes messages from threads of its own too.
+std::mutex messagesMutex;
 Display::Messages messages;
 /// What the toolkit's platform first complained of: the reason of what follows.
 std::string firstComplaint;
@@ -50,7 +53,9 @@ bool isAboutTheScene(const QMessageLogContext& context, const QString& text) {
            (context.category && std::string_view(context.category).starts_with("qml"));
 }
 
+/// Several threads find a lost display at once: the first one keeps the lock until the process is gone.
 void takeMessage(QtMsgType type, const QMessageLogContext& context, const QString& text) {
+    std::scoped_lock lock(messagesMutex);
     std::string line = text.section(QLatin1Char('\n'), 0, 0).toStdString();
     if (isAboutThePlatform(context, text) && type != QtDebugMsg && type != QtInfoMsg &&
         firstComplaint.empty())
@@ -61,6 +66,12 @@ void takeMessage(QtMsgType type, const QMessageLogContext& context, const QStrin
         _exit(1);
     }
     if (messages.note && isAboutTheScene(context, text)) messages.note("television screen: " + line);
+}
+
+void replaceMessages(Display::Messages given) {
+    std::scoped_lock lock(messagesMutex);
+    messages = std::move(given);
+    firstComplaint.clear();
 }
 
 /// The settings in which desktops keep a person's wish for reduced motion.
@@ -122,8 +133,7 @@ Display::Opened Display::open(Messages given) {
     std::optional<std::string> platform = platformFor(surroundings);
     if (!platform) return "there is no display: neither a desktop's nor a framebuffer or graphics card";
     qputenv("QT_QPA_PLATFORM", QByteArray::fromStdString(*platform));
-    messages = std::move(given);
-    firstComplaint.clear();
+    replaceMessages(std::move(given));
     qInstallMessageHandler(takeMessage);
     std::unique_ptr<Display> display(new Display);
     std::string wanted = variable(kSizeVariable);
@@ -161,7 +171,7 @@ void Display::makeApplication() {
 Display::~Display() {
     application_.reset();
     qInstallMessageHandler(nullptr);
-    messages = {};
+    replaceMessages({});
 }
 
 bool Display::hasMotion() const {

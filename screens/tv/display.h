@@ -39,9 +39,9 @@ std::optional<QSize> sizeFrom(std::string_view text);
 class Display {
   public:
     struct Messages {
-        /// A fault in the scene, worth telling.
+        /// A fault in the scene, worth telling. *Any* thread, one at a time.
         std::function<void(std::string_view)> note;
-        /// The toolkit is about to end the process. Does not return.
+        /// The toolkit is about to end the process. Does not return. *Any* thread, no more than one.
         std::function<void(std::string_view)> leave;
     };
     using Opened = std::variant<std::unique_ptr<Display>, std::string>;

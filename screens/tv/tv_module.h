@@ -40,7 +40,7 @@ struct Opening {
     /// Takes one line about something that the viewer cannot mend. *Any* thread.
     std::function<void(std::string_view)> note = nullptr;
     /// The display is gone for good, and the toolkit will not return: takes the reason and leaves the process.
-    /// *Main*.
+    /// *Any* thread, no more than one.
     std::function<void(std::string_view)> leave = nullptr;
 
     std::unique_ptr<ui::FrontEnd> frontEnd = nullptr;
