@@ -5,12 +5,13 @@ terminal_run_test.py PROGRAM [TEST ...]
 """
 import json
 import os
+import re
 import shlex
 import signal
 import sys
 import unittest
 
-from tmux_terminal import WRAPPED, Terminal
+from tmux_terminal import OVER, WRAPPED, Terminal
 
 PROGRAM = ""
 
@@ -46,7 +47,7 @@ class TerminalRun(unittest.TestCase):
         return terminal
 
     def assertRestored(self, terminal):
-        terminal.waitFor("finished")
+        terminal.waitFor(OVER)
         self.assertEqual(terminal.waitForFile("after"), terminal.waitForFile("before"))
         self.assertEqual(terminal.state("#{alternate_on} #{cursor_flag}"), "0 1")
 
@@ -76,7 +77,7 @@ class TerminalRun(unittest.TestCase):
         terminal.press("Enter")
         terminal.waitFor("The test is finished")
         # Whoever reads the result does not wait for the viewer.
-        self.assertEqual(json.loads(terminal.waitForFile("result"))["statusCode"], 0)
+        self.assertEqual(json.loads(terminal.waitForFile("result", end="\n}\n"))["statusCode"], 0)
         terminal.press("Enter")
         self.assertEqual(terminal.waitForFile("status"), "0")
         self.assertRestored(terminal)
@@ -143,11 +144,9 @@ class TerminalRun(unittest.TestCase):
         for key in ["Enter", "Escape"]:
             with self.subTest(key=key):
                 terminal = self.start(QUICK, "--screen terminal")
-                picture = terminal.waitFor("The test is finished")
-                self.assertIn("works, but one thing makes it slow", picture)
-                self.assertIn("Problem: Network “Northlight”", picture)
-                self.assertIn("The signal is weak.", picture)
-                self.assertIn("Close with OK or Back, or wait 60 seconds.", picture)
+                terminal.waitFor("The test is finished", "works, but one thing makes it slow",
+                                 "Problem: Network “Northlight”", "The signal is weak.",
+                                 re.compile("Close with OK or Back, or wait [1-9][05]? seconds."))
                 terminal.press("Down", "Up", key)
                 self.assertEqual(terminal.waitForFile("status"), "0")
                 self.assertRestored(terminal)
@@ -158,7 +157,7 @@ class TerminalRun(unittest.TestCase):
         self.assertTrue(terminal.path("copy").exists())
         terminal.press("Enter")
         self.assertEqual(terminal.waitForFile("status"), "0")
-        self.assertIn("The signal is weak.", terminal.waitFor("finished"))
+        self.assertIn("The signal is weak.", terminal.waitFor(OVER))
 
     def testKeepsTheResultThatASignalFindsOnTheClosingPage(self):
         terminal = self.start(QUICK, "--screen terminal", output="")
@@ -177,9 +176,7 @@ class TerminalRun(unittest.TestCase):
 
     def testSaysWithoutTheListWhichTestIsRunning(self):
         terminal = self.start(options="--screen terminal")
-        picture = terminal.waitFor("Bluetooth devices connected (6 of 40)")
-        self.assertIn("Testing the Wi-Fi connection.", picture)
-        self.assertIn("13 %", picture)
+        picture = terminal.waitFor("Testing the Wi-Fi connection.", "Bluetooth devices connected (6 of 40)", "13 %")
         self.assertNotIn("Choose", picture)
         terminal.press("Escape")
         self.assertEqual(terminal.waitForFile("status"), "3")

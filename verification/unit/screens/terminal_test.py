@@ -12,7 +12,7 @@ import tempfile
 import time
 import unittest
 
-from tmux_terminal import PATIENCE, WRAPPED, Terminal
+from tmux_terminal import OVER, PATIENCE, WRAPPED, Terminal
 
 PROGRAM = ""
 
@@ -92,7 +92,7 @@ class TerminalScreen(unittest.TestCase):
         terminal.waitFor("› Network name")
         terminal.type("東京x e")
         terminal.waitFor("› 東京x e")
-        self.assertEqual(terminal.state("#{cursor_flag}"), "1")
+        terminal.waitForState("#{cursor_flag}", "1")
         terminal.press("BSpace", "Home", "DC")
         terminal.waitFor("› 京x ")
         terminal.press("Left", "Right", "Right")
@@ -100,7 +100,7 @@ class TerminalScreen(unittest.TestCase):
         terminal.waitFor("› 京xÜ ")
         terminal.press("Down", "Right", "Enter")
         terminal.waitFor("  京xÜ")
-        self.assertEqual(terminal.state("#{cursor_flag}"), "0")
+        terminal.waitForState("#{cursor_flag}", "0")
 
     def testLeavesAnAlertAndThenTheListByEsc(self):
         terminal = self.start(WRAPPED)
@@ -124,8 +124,7 @@ class TerminalScreen(unittest.TestCase):
         terminal = self.start()
         terminal.waitFor("▸ Home")
         terminal.press("Enter", "Enter")
-        for shown in ["[█████████████████░", "] 4/11", "▹ Home", "Looking at the network ..."]:
-            terminal.waitFor(shown)
+        terminal.waitFor("[█████████████████░", "] 4/11", "▹ Home", "Looking at the network ...")
 
     def testLetsNothingOfANameReachTheTerminal(self):
         names = [b"\x1b]0;owned\x07", b"\x1b[2J", b"\x9b2J", "\u009b2J".encode(), b"a\rb", b"a\bb",
@@ -137,7 +136,7 @@ class TerminalScreen(unittest.TestCase):
         title = terminal.state("#{pane_title}")
         terminal.tmux("pipe-pane", "-o", "cat > " + shlex.quote(str(terminal.path("sent"))))
         terminal.path("go").touch()
-        picture = terminal.waitFor("Refresh")
+        picture = terminal.waitFor("Refresh", "Esc Back")
 
         for shown in ["\\x1B]0;owned\\x07", "  \\x1B[2J", "  \\x9B2J", "a\\x0Db", "a\\x08b",
                       "\\x1B]52;c;aGFja2Vk\\x07", "\\xFF" * 20, "  %n%s", '  "><script>', "  $(reboot)",
@@ -156,7 +155,7 @@ class TerminalScreen(unittest.TestCase):
             terminal.waitFor("▸[ Yes ]")
             terminal.press("Escape")
             terminal.waitFor(lambda text: "[ Yes ]" not in text)
-        sent = terminal.waitFor(lambda data: b"Refresh" in data, lambda: terminal.path("sent").read_bytes())
+        sent = terminal.waitFor(lambda data: b"Refresh" in data, get=lambda: terminal.path("sent").read_bytes())
         for forbidden in [b"\x1b]", b"\x9b2J", b"\xc2\x9b", b"\x1bP", b"\xe2\x80\xae", b"\xff", b"\x0e"]:
             self.assertNotIn(forbidden, sent)
 
@@ -172,19 +171,17 @@ class TerminalScreen(unittest.TestCase):
         terminal.resize(60, 16)
         terminal.waitFor("▸ Café")
         terminal.resize(160, 50)
-        picture = terminal.waitFor(lambda text: "─" * 86 in text)
-        self.assertTrue(picture.splitlines()[49].strip().startswith("↑↓ Move"))
+        terminal.waitFor("─" * 86, lambda text: "".join(text.splitlines()[49:]).strip().startswith("↑↓ Move"))
         terminal.resize(20, 3)
         terminal.waitFor("Please make this wi…")
 
     def testNeedsOnlyAsciiWhereTheTerminalHasNoMore(self):
         terminal = self.start(environment={"LC_ALL": "C"}, names=["Café".encode()])
-        picture = terminal.waitFor("> Home")
-        self.assertIn("Caf\\u{00E9}", picture)
+        picture = terminal.waitFor("> Home", "Caf\\u{00E9}", "Esc Back")
         self.assertTrue(picture.isascii())
 
     def assertRestored(self, terminal):
-        terminal.waitFor("finished")
+        terminal.waitFor(OVER)
         self.assertEqual(terminal.waitForFile("after"), terminal.waitForFile("before"))
         self.assertEqual(terminal.state("#{alternate_on} #{cursor_flag} #{keypad_flag}"), "0 1 0")
         self.assertNotIn("Home", terminal.picture())

@@ -1,6 +1,7 @@
 """A terminal for tests: a program in it, keys in, picture out."""
 import os
 import pathlib
+import re
 import shlex
 import subprocess
 import tempfile
@@ -8,6 +9,12 @@ import time
 
 # Only a failure takes as long.
 PATIENCE = 30
+
+
+def holds(found, wanted):
+    if callable(wanted):
+        return wanted(found)
+    return wanted.search(found) if isinstance(wanted, re.Pattern) else wanted in found
 
 
 class Terminal:
@@ -46,22 +53,31 @@ class Terminal:
     def path(self, name):
         return pathlib.Path(self.directory.name, name)
 
-    def waitFor(self, what, get=None):
-        """Waits until the picture (or what `get` returns) holds the text or fulfils the function."""
+    def waitFor(self, *wanted, get=None):
+        """Waits for a picture (or what `get` returns) that holds each text, matches each pattern and fulfils each function.
+
+        A picture may be taken in the middle of being drawn: only what was waited for is sure to be in it, and what
+        stands above that.
+        """
         get = get or self.picture
         end = time.monotonic() + PATIENCE
         while True:
             found = get()
-            if what(found) if callable(what) else what in found:
+            missing = [each for each in wanted if not holds(found, each)]
+            if not missing:
                 return found
             if time.monotonic() > end:
-                raise AssertionError(f"waited in vain for {what!r}; last seen:\n{found}")
+                raise AssertionError(f"waited in vain for {missing}; last seen:\n{found}")
             time.sleep(0.01)
 
-    def waitForFile(self, name):
+    def waitForState(self, form, value):
+        self.waitFor(lambda state: state == value, get=lambda: self.state(form))
+
+    def waitForFile(self, name, end="\n"):
+        """The content of a file that somebody else writes, once it has its end."""
         def content():
             return self.path(name).read_text() if self.path(name).exists() else ""
-        return self.waitFor(lambda text: text.endswith("\n"), content).strip()
+        return self.waitFor(lambda text: text.endswith(end), get=content).strip()
 
     def close(self):
         subprocess.run(["tmux", "-S", self.socket, "kill-server"], stderr=subprocess.DEVNULL, check=False)
@@ -70,10 +86,12 @@ class Terminal:
     def child(self):
         """The program that the terminal's shell runs."""
         shell = self.state("#{pane_pid}")
-        children = self.waitFor(lambda text: text != "", lambda: pathlib.Path(
+        children = self.waitFor(lambda text: text != "", get=lambda: pathlib.Path(
             f"/proc/{shell}/task/{shell}/children").read_text().strip())
         return int(children.split()[0])
 
 
+# What the shell says once the program is gone: no program says it.
+OVER = "the shell again"
 # Leaves behind the terminal's modes before and after, the exit status, and a shell that waits.
-WRAPPED = "stty -g > before; {program}; echo $? > status; stty -g > after; echo finished; exec sleep 1000"
+WRAPPED = f"stty -g > before; {{program}}; echo $? > status; stty -g > after; echo {OVER}; exec sleep 1000"
