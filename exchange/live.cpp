@@ -193,11 +193,11 @@ LiveRadio::SendPower powerSender(const std::shared_ptr<ServiceConnection>& conne
 
 class LiveService::Parts {
   public:
-    explicit Parts(LiveServiceOptions given)
+    Parts(ServiceProcess process, LiveServiceOptions given)
         : options(std::move(given)),
           radio(std::make_shared<LiveRadio>(options.expectPowerChange)),
           connection(std::make_shared<ServiceConnection>(
-              options.program, options.arguments,
+              std::move(process),
               ServiceConnection::Handlers{[live = radio](bool power) { live->powerChanged(power); },
                                           options.note})),
           diagnostics(*connection, options),
@@ -218,7 +218,8 @@ class LiveService::Parts {
     LiveWiFiManagerService wifi;
 };
 
-LiveService::LiveService(LiveServiceOptions options) : parts_(std::make_unique<Parts>(std::move(options))) {}
+LiveService::LiveService(ServiceProcess process, LiveServiceOptions options)
+    : parts_(std::make_unique<Parts>(std::move(process), std::move(options))) {}
 
 LiveService::~LiveService() = default;
 

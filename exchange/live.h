@@ -4,10 +4,9 @@
 #include <functional>
 #include <memory>
 #include <optional>
-#include <string>
 #include <string_view>
-#include <vector>
 
+#include "exchange/service_process.h"
 #include "platform/diagnostics.h"
 #include "platform/error.h"
 #include "platform/wifi_manager.h"
@@ -15,8 +14,6 @@
 namespace wp {
 
 struct LiveServiceOptions {
-    std::string program;  ///< path of `wifi-profile-service`
-    std::vector<std::string> arguments;
     /// Above what the service itself allows a test, scans included: whoever misses it hangs.
     std::chrono::milliseconds testDeadline{60'000};
     /// The same for everything that the service answers from what it knows.
@@ -30,15 +27,15 @@ struct LiveServiceOptions {
 
 /// The services of this machine, answered by a service process of its own. *Any* thread.
 ///
-/// What befalls the process comes back as an error with a reason, never as an answer: code 4 when it could not
-/// be started, ended or closed the connection, 7 when it missed a deadline (it is killed then), 8 when
+/// What befalls the process comes back as an error with a reason, never as an answer: code 4 when it ended or
+/// closed the connection, 7 when it missed a deadline (it is killed then), 8 when
 /// requests were cancelled, 10 when an answer is not understood. Once requests have been cancelled, whatever
 /// was waiting and whatever test or status is asked later is answered at once with "cancelled (code 8)",
 /// also by a service that hangs.
 class LiveService {
   public:
-    /// Starts the process. A process that cannot be started is an error in every answer.
-    explicit LiveService(LiveServiceOptions options);
+    /// Takes over a process whose greeting has been read.
+    LiveService(ServiceProcess process, LiveServiceOptions options);
     /// Ends the process; nothing of it is left. No request may be outstanding, and power callbacks come no
     /// more.
     ~LiveService();

@@ -44,16 +44,10 @@ std::string nameOf(const WireRequest& request) {
 
 }  // namespace
 
-ServiceConnection::ServiceConnection(const std::string& program, const std::vector<std::string>& arguments,
-                                     Handlers handlers)
-    : handlers_(std::move(handlers)), wakeup_(::eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK)) {
-    auto started = ServiceProcess::start(program, arguments);
-    if (auto* refusal = std::get_if<Refusal>(&started)) {
-        failure_ = Error{kUnavailable, refusal->text()};
-        if (handlers_.note) handlers_.note(failure_->message);
-        return;
-    }
-    process_.emplace(std::get<ServiceProcess>(std::move(started)));
+ServiceConnection::ServiceConnection(ServiceProcess process, Handlers handlers)
+    : handlers_(std::move(handlers)),
+      process_(std::move(process)),
+      wakeup_(::eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK)) {
     thread_ = std::thread([this] { carry(); });
 }
 
@@ -64,7 +58,7 @@ ServiceConnection::~ServiceConnection() {
         isStopping_ = true;
     }
     wake();
-    if (thread_.joinable()) thread_.join();
+    thread_.join();
 }
 
 std::optional<Error> ServiceConnection::failure() const {
@@ -147,7 +141,7 @@ void ServiceConnection::carry() {
     while (exchangeOnce()) {
     }
     bool isGivenUp = failure().has_value();
-    process_->end(isGivenUp ? milliseconds(0) : kPatience);
+    process_.end(isGivenUp ? milliseconds(0) : kPatience);
 }
 
 /// Waits for something to do and does it; false when the conversation is over.
@@ -159,7 +153,7 @@ bool ServiceConnection::exchangeOnce() {
         hasOutgoing = !outgoing_.empty();
     }
     auto events = static_cast<short>(hasOutgoing ? POLLIN | POLLOUT : POLLIN);
-    std::array<pollfd, 2> watched{{{process_->socket(), events, 0}, {wakeup_.number(), POLLIN, 0}}};
+    std::array<pollfd, 2> watched{{{process_.socket(), events, 0}, {wakeup_.number(), POLLIN, 0}}};
     ::poll(watched.data(), watched.size(), -1);
     if (watched[1].revents) clearWakeup(wakeup_.number());
     send();
@@ -173,7 +167,7 @@ bool ServiceConnection::exchangeOnce() {
 void ServiceConnection::send() {
     std::lock_guard lock(mutex_);
     while (!outgoing_.empty()) {
-        ssize_t sent = ::send(process_->socket(), outgoing_.data(), outgoing_.size(), MSG_NOSIGNAL);
+        ssize_t sent = ::send(process_.socket(), outgoing_.data(), outgoing_.size(), MSG_NOSIGNAL);
         if (sent < 0 && errno == EINTR) continue;
         if (sent < 0) return;  // full, or closed: then receiving tells why
         outgoing_.erase(0, static_cast<std::size_t>(sent));
@@ -182,7 +176,7 @@ void ServiceConnection::send() {
 
 bool ServiceConnection::receive() {
     std::array<char, 65536> buffer;
-    ssize_t got = ::recv(process_->socket(), buffer.data(), buffer.size(), 0);
+    ssize_t got = ::recv(process_.socket(), buffer.data(), buffer.size(), 0);
     if (got < 0 && (errno == EAGAIN || errno == EINTR)) return true;
     if (got <= 0) {
         giveUp(endOfService());
@@ -194,7 +188,7 @@ bool ServiceConnection::receive() {
 
 Error ServiceConnection::endOfService() {
     constexpr milliseconds untilEnded(1000);
-    std::optional<std::string> how = process_->waitForEnd(untilEnded);
+    std::optional<std::string> how = process_.waitForEnd(untilEnded);
     return {kUnavailable,
             how ? "wifi-profile-service ended (" + *how + ")" : "wifi-profile-service closed the connection"};
 }

@@ -23,7 +23,7 @@ namespace wp {
 /// The conversation with one service process: several requests may be outstanding, each from a thread of its
 /// own, while one thread inside carries the lines. *Any* thread.
 ///
-/// A service that cannot be started, ends, closes the connection, sends what is no message or lets a deadline
+/// A service that ends, closes the connection, sends what is no message or lets a deadline
 /// pass is given up for good: it is killed, and every request, outstanding or later, is answered with an error
 /// that says what happened. Codes: 4 not there any more, 7 no answer in time, 8 cancelled, 10 not understood.
 class ServiceConnection {
@@ -38,8 +38,7 @@ class ServiceConnection {
         std::function<void(std::string_view text)> note;
     };
 
-    ServiceConnection(const std::string& program, const std::vector<std::string>& arguments,
-                      Handlers handlers);
+    ServiceConnection(ServiceProcess process, Handlers handlers);
     /// Ends the service; requests still outstanding are cancelled, but must have returned before.
     ~ServiceConnection();
     ServiceConnection(const ServiceConnection&) = delete;
@@ -81,7 +80,7 @@ class ServiceConnection {
     Error endOfService();
 
     Handlers handlers_;
-    std::optional<ServiceProcess> process_;  // the thread inside alone, once it runs
+    ServiceProcess process_;  // the thread inside alone, once it runs
     Descriptor wakeup_;
     std::string incoming_;  // the thread inside alone
     std::size_t searched_ = 0;

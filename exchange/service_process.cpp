@@ -7,7 +7,9 @@
 #include <sys/syscall.h>
 #include <sys/wait.h>
 
+#include <algorithm>
 #include <array>
+#include <cerrno>
 #include <csignal>
 #include <cstring>
 #include <filesystem>
@@ -55,6 +57,19 @@ class SpawnSettings {
     posix_spawn_file_actions_t actions_{};
     posix_spawnattr_t attributes_{};
 };
+
+milliseconds leftUntil(Clock::time_point until) {
+    return std::max(std::chrono::ceil<milliseconds>(until - Clock::now()), milliseconds(0));
+}
+
+/// Whether there is something to read, or nothing more will come.
+bool waitForInput(int socket, Clock::time_point until) {
+    pollfd input{socket, POLLIN, 0};
+    int ready = 0;
+    do ready = ::poll(&input, 1, static_cast<int>(leftUntil(until).count()));
+    while (ready < 0 && errno == EINTR);
+    return ready > 0;
+}
 
 std::string describeEnd(int status) {
     if (WIFSIGNALED(status)) {
@@ -114,12 +129,29 @@ bool ServiceProcess::reap() {
     return true;
 }
 
+std::optional<std::string> ServiceProcess::firstLine(Duration patience) {
+    const auto until = Clock::now() + patience;
+    std::array<char, 4096> buffer;
+    std::string line;
+    while (line.size() <= kLongestLine && waitForInput(socket(), until)) {
+        const ssize_t seen = ::recv(socket(), buffer.data(), buffer.size(), MSG_PEEK);
+        if (seen <= 0) return std::nullopt;
+        const std::string_view part(buffer.data(), static_cast<std::size_t>(seen));
+        const std::size_t end = part.find('\n');
+        line += part.substr(0, end);
+        // What was looked at is taken out, up to the end of the line alone.
+        ::recv(socket(), buffer.data(), std::min(part.size(), end + (end == part.npos ? 0 : 1)), 0);
+        if (end != part.npos) return line;
+    }
+    return std::nullopt;
+}
+
 std::optional<std::string> ServiceProcess::waitForEnd(Duration patience) {
     auto until = Clock::now() + patience;
     Descriptor watch(static_cast<int>(::syscall(SYS_pidfd_open, process_, 0)));
     while (!reap()) {
-        auto left = std::chrono::ceil<milliseconds>(until - Clock::now());
-        if (left.count() <= 0) return std::nullopt;
+        auto left = leftUntil(until);
+        if (left.count() == 0) return std::nullopt;
         if (watch) {
             pollfd ended{watch.number(), POLLIN, 0};
             ::poll(&ended, 1, static_cast<int>(left.count()));

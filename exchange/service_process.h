@@ -35,6 +35,10 @@ class ServiceProcess {
     /// This side's end of the pair; it does not block.
     int socket() const { return socket_.number(); }
 
+    /// The first line that the process sends, without its newline; what comes behind it is left to be read. Nothing
+    /// when the process ends, closes the connection or says nothing that long.
+    std::optional<std::string> firstLine(Duration patience);
+
     /// Waits that long for the process to end by itself; tells how it ended ("exit status 3", "signal 11,
     /// Segmentation fault"), nothing when it still runs.
     std::optional<std::string> waitForEnd(Duration patience);

@@ -65,6 +65,16 @@ WireRequest decodeRequest(const Value& json) {
     return request;
 }
 
+Greeting decodeGreeting(const Value& json) {
+    Place top;
+    ObjectReader reader(json, top);
+    Greeting greeting;
+    greeting.configuration = readConfiguration(reader.find("configuration"), Place(top, "configuration"));
+    if (!greeting.configuration) greeting.refused = readText(reader.need("refused"), Place(top, "refused"));
+    reader.finish();
+    return greeting;
+}
+
 WireMessage decodeMessage(const Value& json) {
     Place top;
     ObjectReader reader(json, top);
@@ -106,6 +116,16 @@ std::optional<Error> takeError(ObjectReader& reader) {
 
 Error cancelledError() {
     return {kCancelledCode, "cancelled"};
+}
+
+std::string greetingLine(const Greeting& greeting) {
+    if (!greeting.configuration) return line({{"refused", greeting.refused}});
+    return line({{"configuration", greeting.configuration}});
+}
+
+std::variant<Greeting, Refusal> readGreeting(std::string_view text) {
+    return readLine<std::variant<Greeting, Refusal>>(
+        text, [](const Value& json) -> std::variant<Greeting, Refusal> { return decodeGreeting(json); });
 }
 
 std::string requestLine(const WireRequest& request) {

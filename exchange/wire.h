@@ -12,8 +12,8 @@
 namespace wp {
 
 // The wire between the host and the service that it started: one JSON object a line, both ways, in UTF-8. The
-// service inherits its end of the socket pair as file descriptor `kWireDescriptor`. Every request but the
-// cancelling carries a number of its own, and its answer carries the same; answers come in any order. Every
+// service inherits its end of the socket pair as file descriptor `kWireDescriptor`, and speaks first: a greeting.
+// Every request but the cancelling carries a number of its own, and its answer carries the same; answers come in any order. Every
 // `…Line` function gives the whole line with its newline; every `read…` takes one line without it. *Any*
 // thread.
 
@@ -25,6 +25,16 @@ constexpr int kCancelledCode = 8;
 
 /// The error of every request that was cancelled: "cancelled (code 8)".
 Error cancelledError();
+
+/// `{"configuration": {…}}`, what the service tells of the configuration that it works with, or
+/// `{"refused": "text"}`, what is wrong with it and where; then the service ends.
+struct Greeting {
+    DictionaryPointer configuration;  ///< null: refused
+    std::string refused;
+};
+
+std::string greetingLine(const Greeting& greeting);
+std::variant<Greeting, Refusal> readGreeting(std::string_view line);
 
 /// `{"id": N, "request": "test", "test": 34, "configuration": {…}}`, "status", "wifi",
 /// `{"id": N, "request": "setPower", "power": true}`, and `{"request": "cancel"}`, upon which every

@@ -3,56 +3,76 @@
 #include <filesystem>
 #include <variant>
 
-#include "exchange/object_reader.h"
+#include "exchange/wire.h"
 #include "host/exit.h"
-#include "host/service_program.h"
+#include "host/extension_module.h"
 
 namespace wp::host {
 namespace {
 
-/// The service's first line on standard error, without its own name.
-std::string firstLine(const std::string& text) {
-    const std::string name = kServiceFileName + std::string(": ");
-    std::string line = text.substr(0, text.find('\n'));
-    return line.starts_with(name) ? line.substr(name.size()) : line;
+constexpr const char* kServiceFileName = "wifi-profile-service";
+/// A service reads its configuration in milliseconds; one that says nothing for so long hangs.
+constexpr std::chrono::seconds kLongestStart{10};
+
+ServiceProcess startedProcess(const std::string& program, const std::vector<std::string>& arguments) {
+    if (!std::filesystem::exists(program))
+        fail(program + ": not found; a live run needs it beside the program (--replay and --demo do not)");
+    std::variant<ServiceProcess, Refusal> started = ServiceProcess::start(program, arguments);
+    if (const Refusal* refusal = std::get_if<Refusal>(&started)) fail(refusal->text());
+    return std::get<ServiceProcess>(std::move(started));
 }
 
-/// What the service prints of its configuration when it is called with the option.
-std::string shown(const std::string& option, const std::optional<std::string>& named) {
-    const std::string service = serviceProgram();
-    if (!std::filesystem::exists(service))
-        fail(service + ": not found; a live run needs it beside the program (--replay and --demo do not)");
-    std::vector<std::string> arguments = {option};
-    if (named) arguments.insert(arguments.end(), {"--config", *named});
-    const ProgramOutput printed = runProgram(service, arguments);
-    if (printed.status == exit_status::ok) return printed.standardOutput;
-    const std::string line = firstLine(printed.standardError);
-    const bool isNamed = named && line.starts_with(*named + ": ");
-    if (printed.status == exit_status::unusable) refuse((isNamed ? "--config: " : "configuration: ") + line);
-    fail(service + ": cannot read the configuration: " +
-         (line.empty() ? "it ended with status " + std::to_string(printed.status) : line));
+Greeting greetingOf(ServiceProcess& process, const std::string& program) {
+    const std::optional<std::string> line = process.firstLine(kLongestStart);
+    if (!line) {
+        const std::optional<std::string> how = process.waitForEnd(std::chrono::milliseconds(100));
+        fail(program + ": tells no configuration: " + (how ? "it ended (" + *how + ")" : "it hangs"));
+    }
+    std::variant<Greeting, Refusal> greeting = readGreeting(*line);
+    if (const Refusal* refusal = std::get_if<Refusal>(&greeting))
+        fail(program + ": tells the configuration in a form of its own: " + refusal->text());
+    return std::get<Greeting>(std::move(greeting));
+}
+
+DictionaryPointer readDictionary(ObjectReader& object, std::string_view key) {
+    if (const auto* dictionary = object.need(key).as<DictionaryPointer>()) return *dictionary;
+    Place(object.place(), key).refuse("must be an object");
+}
+
+Configuration configurationFrom(const DictionaryPointer& told) {
+    const Place top;
+    ObjectReader object(told, top);
+    Configuration configuration;
+    configuration.capabilities = readFlags(object.need("capabilities"), Place(top, "capabilities"));
+    configuration.thresholds = readDictionary(object, "thresholds");
+    configuration.endpoints = readDictionary(object, "endpoints");
+    object.finish();
+    return configuration;
 }
 
 }  // namespace
 
-Configuration readConfiguration(const std::optional<std::string>& named) {
-    const auto json = readJSON(shown("--show-host-part", named));
-    Configuration configuration;
-    try {
-        if (const Refusal* refusal = std::get_if<Refusal>(&json)) throw Refused(*refusal);
-        const Place top;
-        ObjectReader object(std::get<Value>(json), top);
-        configuration.capabilities = readFlags(object.need("capabilities"), Place(top, "capabilities"));
-        if (const auto* thresholds = object.need("thresholds").as<DictionaryPointer>())
-            configuration.thresholds = *thresholds;
-    } catch (const Refused& refused) {
-        fail(serviceProgram() + ": tells the configuration in a form of its own: " + refused.what());
+StartedService startService(const std::optional<std::string>& named,
+                            const std::optional<std::string>& interfaceName) {
+    const std::string program = (programFolder() / kServiceFileName).string();
+    std::vector<std::string> arguments;
+    if (interfaceName) arguments = {"--interface", *interfaceName};
+    if (named) arguments.insert(arguments.end(), {"--config", *named});
+    ServiceProcess process = startedProcess(program, arguments);
+    const Greeting greeting = greetingOf(process, program);
+    if (!greeting.configuration) {
+        const bool isNamed = named && greeting.refused.starts_with(*named + ": ");
+        refuse((isNamed ? "--config: " : "configuration: ") + greeting.refused);
     }
-    return configuration;
+    try {
+        return {std::move(process), configurationFrom(greeting.configuration)};
+    } catch (const Refused& refused) {
+        fail(program + ": tells the configuration in a form of its own: " + refused.what());
+    }
 }
 
-std::string contactedEndpoints(const std::optional<std::string>& named) {
-    return shown("--show-endpoints", named);
+Configuration readConfiguration(const std::optional<std::string>& named) {
+    return startService(named, std::nullopt).configuration;
 }
 
 bool StatedCapabilities::booleanAnswer(std::string_view capability) const {

@@ -120,8 +120,13 @@ Preparation prepare(const RunOptions& options) {
     prepared.parameters = requestParameters(options);
     prepared.recording = recordingOf(options);
     // A replay has its capabilities from the recording; a file that was named is read all the same.
-    if (!prepared.recording || options.configFile)
+    if (!prepared.recording) {
+        StartedService started = startService(options.configFile, options.interfaceName);
+        prepared.configuration = std::move(started.configuration);
+        prepared.service.emplace(std::move(started.process));
+    } else if (options.configFile) {
         prepared.configuration = readConfiguration(options.configFile);
+    }
     prepared.screen = screenOf(options, *prepared.parameters);
     prepared.script = scriptOf(options, prepared.screen);
     refuseOneFileForTwo(options);

@@ -4,6 +4,7 @@
 #include <optional>
 
 #include "exchange/recording.h"
+#include "exchange/service_process.h"
 #include "host/arguments.h"
 #include "host/configuration.h"
 #include "host/locale.h"
@@ -18,6 +19,7 @@ struct Preparation {
     DictionaryPointer parameters;
     LocaleChoice locale;
     Configuration configuration;
+    std::optional<ServiceProcess> service;       ///< of a live run, ready to be asked
     std::shared_ptr<const Recording> recording;  ///< null: the run is live
     ScreenChoice screen = ScreenChoice::none;    ///< never `automatic`
     remote::Script script;

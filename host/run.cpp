@@ -30,6 +30,7 @@
 #include "platform/activity.h"
 #include "platform/background_queue.h"
 #include "platform/extension.h"
+#include "platform/json_writer.h"
 #include "platform/main_queue.h"
 #include "platform/ui/screen.h"
 #include "screens/remote/remote_control.h"
@@ -54,7 +55,7 @@ enum class Purpose { run, evidence };
 /// One run: all that a diagnostic sees, in the order in which it is made.
 class Run {
   public:
-    Run(const RunOptions& options, const Preparation& prepared, Purpose purpose)
+    Run(const RunOptions& options, Preparation& prepared, Purpose purpose)
         : options_(options),
           prepared_(prepared),
           module_(options.extension),
@@ -304,8 +305,10 @@ void Run::writeResult() {
 }
 
 int showEndpoints(const RunOptions& options) {
-    std::string endpoints = contactedEndpoints(options.configFile);
-    if (std::optional<std::string> error = writeAll(STDOUT_FILENO, endpoints))
+    const Value endpoints =
+        Dictionary::make({{"endpoints", readConfiguration(options.configFile).endpoints}});
+    if (std::optional<std::string> error =
+            writeAll(STDOUT_FILENO, jsonText(endpoints, JSONStyle::indented) + "\n"))
         fail("standard output: cannot be written: " + *error);
     return exit_status::ok;
 }
@@ -318,7 +321,7 @@ int runDiagnostic(const RunOptions& options) {
     return Run(options, prepared, Purpose::run).perform();
 }
 
-Evidence replayedEvidence(const RunOptions& options, const Preparation& prepared) {
+Evidence replayedEvidence(const RunOptions& options, Preparation& prepared) {
     return Run(options, prepared, Purpose::evidence).evidenceAlone();
 }
 

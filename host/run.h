@@ -12,6 +12,6 @@ int runDiagnostic(const RunOptions& options);
 
 /// Replays the prepared recording without a screen, a log or a wait, and hands over its result with all
 /// answers. Throws `Exit` where the replay cannot come to an end. *Main*, once in a process.
-Evidence replayedEvidence(const RunOptions& options, const Preparation& prepared);
+Evidence replayedEvidence(const RunOptions& options, Preparation& prepared);
 
 }  // namespace wp::host

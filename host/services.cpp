@@ -8,7 +8,6 @@
 #include "exchange/live.h"
 #include "exchange/recorder.h"
 #include "exchange/replay.h"
-#include "host/service_program.h"
 
 namespace wp::host {
 namespace {
@@ -36,11 +35,8 @@ class ReplayServices final : public Services {
 /// A radio is up within a second of the switch; one that does not obey must not keep a script waiting for good.
 constexpr std::chrono::seconds kLongestPowerChange{10};
 
-LiveServiceOptions liveOptions(const RunOptions& options, MainQueue& mainQueue, DiagnosticsLog& log) {
+LiveServiceOptions liveOptions(MainQueue& mainQueue, DiagnosticsLog& log) {
     LiveServiceOptions live;
-    live.program = serviceProgram();
-    if (options.interfaceName) live.arguments = {"--interface", *options.interfaceName};
-    if (options.configFile) live.arguments.insert(live.arguments.end(), {"--config", *options.configFile});
     live.expectPowerChange = [&mainQueue] { return mainQueue.expectEvent(kLongestPowerChange); };
     live.note = [&log](std::string_view text) { log.note(text); };
     return live;
@@ -48,9 +44,8 @@ LiveServiceOptions liveOptions(const RunOptions& options, MainQueue& mainQueue, 
 
 class LiveServices final : public Services {
   public:
-    LiveServices(const RunOptions& options, const Preparation& prepared, MainQueue& mainQueue,
-                 DiagnosticsLog& log)
-        : service_(liveOptions(options, mainQueue, log)),
+    LiveServices(Preparation& prepared, MainQueue& mainQueue, DiagnosticsLog& log)
+        : service_(std::move(*prepared.service), liveOptions(mainQueue, log)),
           capabilities_(prepared.configuration.capabilities) {}
 
     DiagnosticsClient& diagnosticsClient() override { return service_.diagnostics(); }
@@ -99,17 +94,17 @@ class RecordedServices final : public Services {
     std::optional<Recording> stopped_;
 };
 
-std::unique_ptr<Services> answeringServices(const RunOptions& options, const Preparation& prepared,
-                                            MainQueue& mainQueue, DiagnosticsLog& log) {
+std::unique_ptr<Services> answeringServices(Preparation& prepared, MainQueue& mainQueue,
+                                            DiagnosticsLog& log) {
     if (prepared.recording) return std::make_unique<ReplayServices>(prepared.recording, mainQueue);
-    return std::make_unique<LiveServices>(options, prepared, mainQueue, log);
+    return std::make_unique<LiveServices>(prepared, mainQueue, log);
 }
 
 }  // namespace
 
-std::unique_ptr<Services> makeServices(const RunOptions& options, const Preparation& prepared,
-                                       MainQueue& mainQueue, DiagnosticsLog& log) {
-    std::unique_ptr<Services> services = answeringServices(options, prepared, mainQueue, log);
+std::unique_ptr<Services> makeServices(const RunOptions& options, Preparation& prepared, MainQueue& mainQueue,
+                                       DiagnosticsLog& log) {
+    std::unique_ptr<Services> services = answeringServices(prepared, mainQueue, log);
     if (!prepared.record) return services;
     return std::make_unique<RecordedServices>(std::move(services), options, prepared);
 }

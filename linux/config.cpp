@@ -245,13 +245,9 @@ std::variant<Config, std::string> loadConfig(const std::vector<std::string>& fil
     return config;
 }
 
-std::string endpointsAsJson(const Config& config) {
+DictionaryPointer toldOf(const Config& config) {
     const DictionaryPointer endpoints = Dictionary::make();
     for (const EndpointKey& each : kEndpointKeys) endpoints->setValue(each.key, config.endpoints.*each.place);
-    return jsonText(Dictionary::make({{"endpoints", endpoints}}), JSONStyle::indented);
-}
-
-std::string hostPartAsJson(const Config& config) {
     const DictionaryPointer capabilities =
         Dictionary::make({config.capabilities.begin(), config.capabilities.end()});
     const auto& [bluetooth, saved, congestion] = config.thresholds;
@@ -261,8 +257,8 @@ std::string hostPartAsJson(const Config& config) {
                                                            {"advertisedLoad", congestion.advertisedLoad},
                                                            {"channelLoad", congestion.load},
                                                            {"overlap", congestion.overlap}});
-    return jsonText(Dictionary::make({{"capabilities", capabilities}, {"thresholds", thresholds}}),
-                    JSONStyle::indented);
+    return Dictionary::make(
+        {{"capabilities", capabilities}, {"endpoints", endpoints}, {"thresholds", thresholds}});
 }
 
 std::optional<HostAndPort> hostAndPort(std::string_view text) {

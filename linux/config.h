@@ -55,10 +55,9 @@ std::vector<std::string> configFiles(const std::string& home, const std::string&
 /// the one `named`. \returns the configuration, or one line: file, place and reason.
 std::variant<Config, std::string> loadConfig(const std::vector<std::string>& files, const std::string& named);
 
-/// The endpoints as JSON, in the form in which a configuration sets them.
-std::string endpointsAsJson(const Config& config);
-/// What the host asks for, capabilities and all thresholds, in the same form.
-std::string hostPartAsJson(const Config& config);
+/// What the host is told, in the form in which a configuration sets it: the capabilities, all endpoints and all
+/// thresholds.
+DictionaryPointer toldOf(const Config& config);
 
 /// "HOST:PORT" in its parts; a host that is an IPv6 address stands in brackets. Nothing for any other form.
 struct HostAndPort {

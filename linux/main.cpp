@@ -18,8 +18,7 @@
 namespace {
 
 constexpr const char* kUsage =
-    "usage: wifi-profile-service [--interface NAME] [--config FILE] [--show-endpoints] [--show-host-part]"
-    "\n"
+    "usage: wifi-profile-service [--interface NAME] [--config FILE]\n"
     "\n"
     "Answers the questions of wifi-profile about the Wi-Fi of this machine. It is started by wifi-profile, "
     "with a\n"
@@ -27,8 +26,6 @@ constexpr const char* kUsage =
     "\n"
     "  --interface NAME     the Wi-Fi interface to look at\n"
     "  --config FILE        a configuration, over those of the system and the user\n"
-    "  --show-endpoints     prints whom the tests contact, and ends\n"
-    "  --show-host-part     prints the device's capabilities and the thresholds, and ends\n"
     "  --help               this text\n"
     "  --version            the version\n";
 
@@ -37,8 +34,6 @@ constexpr int kUnusable = 2;
 struct Options {
     std::optional<std::string> interfaceName;
     std::string config;
-    /// What is printed in place of answering questions.
-    std::string (*shown)(const wp::Config&) = nullptr;
 };
 
 /// The configuration, or the line that says what is wrong with it.
@@ -64,10 +59,6 @@ std::variant<Options, int> readOptions(int count, char** arguments) {
             options.interfaceName = arguments[++i];
         } else if (argument == "--config" && i + 1 < count) {
             options.config = arguments[++i];
-        } else if (argument == "--show-endpoints") {
-            options.shown = wp::endpointsAsJson;
-        } else if (argument == "--show-host-part") {
-            options.shown = wp::hostPartAsJson;
         } else {
             const char* const what = argument == "--interface" ? "needs a name"
                                      : argument == "--config"  ? "needs a file"
@@ -95,15 +86,6 @@ int main(int count, char** arguments) {
     const std::variant<Options, int> read = readOptions(count, arguments);
     if (const int* status = std::get_if<int>(&read)) return *status;
     const Options& options = std::get<Options>(read);
-    const std::variant<wp::Config, std::string> config = readConfig(options.config);
-    if (const std::string* fault = std::get_if<std::string>(&config)) {
-        std::fprintf(stderr, "wifi-profile-service: %s\n", fault->c_str());
-        return kUnusable;
-    }
-    if (options.shown != nullptr) {
-        std::puts(options.shown(std::get<wp::Config>(config)).c_str());
-        return 0;
-    }
     if (!isSocket(wp::kWireDescriptor)) {
         std::fputs(
             "wifi-profile-service: descriptor 3 is no connected socket; this program is started by "
@@ -111,6 +93,13 @@ int main(int count, char** arguments) {
             stderr);
         return kUnusable;
     }
+    wp::LineSocket wire{wp::Descriptor(wp::kWireDescriptor)};
+    const std::variant<wp::Config, std::string> config = readConfig(options.config);
+    if (const std::string* fault = std::get_if<std::string>(&config)) {
+        wire.send(wp::greetingLine({nullptr, *fault}));
+        return kUnusable;
+    }
+    wire.send(wp::greetingLine({wp::toldOf(std::get<wp::Config>(config)), ""}));
     wp::Sources sources;
     sources.interfaceName = options.interfaceName;
     sources.config = std::get<wp::Config>(config);
@@ -120,7 +109,6 @@ int main(int count, char** arguments) {
     wp::dropPrivileges();
     const wp::Sandbox sandbox = wp::enterSandbox();
 
-    wp::LineSocket wire{wp::Descriptor(wp::kWireDescriptor)};
     wp::Session session(wire, sources, power);
     if (sandbox == wp::Sandbox::notInThisKernel)
         session.note("this kernel filters no system calls (seccomp): the service runs without its sandbox");

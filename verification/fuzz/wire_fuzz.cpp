@@ -38,6 +38,16 @@ void readAsRequest(std::string_view line) {
     if (wp::requestLine(std::get<wp::WireRequest>(again)) != written) std::abort();
 }
 
+void readAsGreeting(std::string_view line) {
+    auto outcome = wp::readGreeting(line);
+    const auto* greeting = std::get_if<wp::Greeting>(&outcome);
+    if (!greeting) return;
+    std::string written = wp::greetingLine(*greeting);
+    auto again = wp::readGreeting(std::string_view(written).substr(0, written.size() - 1));
+    if (!std::holds_alternative<wp::Greeting>(again)) std::abort();
+    if (wp::greetingLine(std::get<wp::Greeting>(again)) != written) std::abort();
+}
+
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
@@ -46,6 +56,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
         std::string_view line = text.substr(0, text.find('\n'));
         readAsMessage(line);
         readAsRequest(line);
+        readAsGreeting(line);
         text.remove_prefix(std::min(text.size(), line.size() + 1));
     }
     return 0;

@@ -46,10 +46,14 @@ class Live : public testing::Test {
         EXPECT_EQ(openDescriptors(), descriptors_);
     }
 
-    void start(std::vector<std::string> script, milliseconds deadline = kLong) {
+    static ServiceProcess startedProcess(const std::vector<std::string>& script) {
+        return std::get<ServiceProcess>(ServiceProcess::start(besideProgram("scripted_service"), script));
+    }
+    void start(const std::vector<std::string>& script, milliseconds deadline = kLong) {
+        adopt(startedProcess(script), deadline);
+    }
+    void adopt(ServiceProcess process, milliseconds deadline = kLong) {
         LiveServiceOptions options;
-        options.program = besideProgram("scripted_service");
-        options.arguments = std::move(script);
         options.testDeadline = deadline;
         options.queryDeadline = deadline;
         options.note = [this](std::string_view text) {
@@ -58,7 +62,7 @@ class Live : public testing::Test {
             noted_.notify_all();
         };
         options.expectPowerChange = expectPowerChange_;
-        service_ = std::make_unique<LiveService>(std::move(options));
+        service_ = std::make_unique<LiveService>(std::move(process), std::move(options));
     }
 
     DiagnosticsTestResponse ask(int test) {
@@ -126,17 +130,29 @@ TEST_F(Live, KeepsManyRequestsFromManyThreadsApart) {
 }
 
 TEST_F(Live, SaysWhyAServiceCannotBeStarted) {
-    LiveServiceOptions options;
-    options.program = "/nonexistent/wifi-profile-service";
-    service_ = std::make_unique<LiveService>(options);
+    const auto started = ServiceProcess::start("/nonexistent/wifi-profile-service", {});
+    ASSERT_TRUE(std::holds_alternative<Refusal>(started));
+    EXPECT_EQ(std::get<Refusal>(started).text(),
+              "/nonexistent/wifi-profile-service: cannot be started: No such file or directory");
+}
 
-    EXPECT_EQ(errorOf(1),
-              "/nonexistent/wifi-profile-service: cannot be started: No such file or directory (code 4)");
-    EXPECT_EQ(service_->diagnostics().queryStatus().error->code, 4);
-    EXPECT_FALSE(service_->wifi().hasRadio());
-    EXPECT_FALSE(service_->wifi().createClient(0));
-    service_->diagnostics().cancelAllRequests();
-    EXPECT_EQ(errorOf(1), "cancelled (code 8)");
+TEST_F(Live, TakesTheFirstLineAndLeavesTheRest) {
+    const std::string line(9000, 'x');
+    ServiceProcess process =
+        startedProcess({"start", "send:" + line + "\n{\"note\":\"behind it\"}", "test", "answer:{}"});
+
+    EXPECT_EQ(process.firstLine(kLong), line);
+
+    adopt(std::move(process));
+    EXPECT_EQ(errorOf(1), "no error");
+    EXPECT_EQ(notes(), std::vector<std::string>{"behind it"});
+}
+
+TEST_F(Live, HasNoFirstLineOfAProcessThatEndsHangsOrCloses) {
+    EXPECT_EQ(startedProcess({"start", "exit:3"}).firstLine(kLong), std::nullopt);
+    EXPECT_EQ(startedProcess({"start", "part:half"}).firstLine(milliseconds(20)), std::nullopt);
+    EXPECT_EQ(startedProcess({"start", "close"}).firstLine(kLong), std::nullopt);
+    EXPECT_EQ(startedProcess({"start", "flood"}).firstLine(kLong), std::nullopt);
 }
 
 TEST_F(Live, SaysHowAServiceEnded) {

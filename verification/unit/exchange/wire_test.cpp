@@ -32,6 +32,36 @@ WireAnswer answer(const std::string& line) {
     return read ? *read : WireAnswer{};
 }
 
+Greeting greeting(std::string_view line) {
+    auto outcome = readGreeting(line);
+    if (auto* refusal = std::get_if<Refusal>(&outcome)) ADD_FAILURE() << refusal->text();
+    return std::holds_alternative<Greeting>(outcome) ? std::get<Greeting>(outcome) : Greeting{};
+}
+
+std::string greetingRefusal(std::string_view line) {
+    auto outcome = readGreeting(line);
+    auto* refusal = std::get_if<Refusal>(&outcome);
+    return refusal ? refusal->text() : "accepted";
+}
+
+TEST(Wire, CarriesBothGreetings) {
+    const std::string told = greetingLine({Dictionary::make({{"thresholds", 7}}), ""});
+    EXPECT_EQ(told, "{\"configuration\":{\"thresholds\":7}}\n");
+    EXPECT_EQ(greeting(withoutNewline(told)).configuration->value("thresholds"), Value(7));
+
+    const std::string refused = greetingLine({nullptr, "a.json: endpoints: must be an object"});
+    EXPECT_EQ(refused, "{\"refused\":\"a.json: endpoints: must be an object\"}\n");
+    EXPECT_EQ(greeting(withoutNewline(refused)).configuration, nullptr);
+    EXPECT_EQ(greeting(withoutNewline(refused)).refused, "a.json: endpoints: must be an object");
+}
+
+TEST(Wire, RefusesGreetingsOfAnotherForm) {
+    EXPECT_EQ(greetingRefusal("{}"), R"(needs the key "refused")");
+    EXPECT_EQ(greetingRefusal(R"({"configuration":true})"), "configuration: must be an object");
+    EXPECT_EQ(greetingRefusal(R"({"configuration":{},"refused":"x"})"), "refused: unknown key");
+    EXPECT_EQ(greetingRefusal(R"({"refused":7})"), "refused: must be a text");
+}
+
 TEST(Wire, CarriesEveryRequest) {
     WireRequest test{Kind::test, 7, 34, Dictionary::make({{"NetworkName", "Line\nbreak"}}), false};
     EXPECT_EQ(requestLine(test),

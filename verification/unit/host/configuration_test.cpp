@@ -6,6 +6,7 @@
 #include <filesystem>
 #include <fstream>
 
+#include "exchange/live.h"
 #include "host/exit.h"
 
 namespace wp::host {
@@ -52,6 +53,16 @@ TEST_F(UsersConfiguration, CountsWithoutAnOptionAndTheNamedFileWins) {
               (Flags{{"other", false}, {"third", true}, {"wapi", true}}));
     EXPECT_EQ(readConfiguration(named).thresholds->value("savedNetworks"), Value(7));
     EXPECT_EQ(readConfiguration(named).thresholds->size(), 6u);
+    EXPECT_EQ(readConfiguration(named).endpoints->value("pingIPv4"), Value("9.9.9.9"));
+}
+
+TEST_F(UsersConfiguration, IsToldByTheProcessThatThenAnswers) {
+    StartedService started = startService(std::nullopt, std::nullopt);
+
+    LiveService service(std::move(started.process), {});
+    const auto response = service.diagnostics().runTestRequests({{9999, nullptr}});
+    ASSERT_TRUE(response.error);
+    EXPECT_EQ(response.error->message, "no test 9999");
 }
 
 TEST_F(UsersConfiguration, IsRefusedWithFilePlaceAndReasonWhicheverPartIsWrong) {

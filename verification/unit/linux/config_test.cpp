@@ -6,6 +6,8 @@
 #include <filesystem>
 #include <fstream>
 
+#include "platform/json_writer.h"
+
 namespace wp {
 namespace {
 
@@ -68,27 +70,31 @@ TEST(Config, ARefusalSaysWhereAndWhyAndChangesNothing) {
     EXPECT_EQ(config.endpoints.pingIPv4, Endpoints().pingIPv4);
 }
 
-TEST(Config, TheEndpointsThatAreShownAreAConfigurationThemselves) {
+std::string told(const Config& config) {
+    return jsonText(toldOf(config), JSONStyle::compact);
+}
+
+TEST(Config, WhatTheHostIsToldIsAConfigurationItself) {
     Config shown = Config::defaults();
     shown.endpoints.pingIPv4 = "192.0.2.1";
     Config read = Config::defaults();
-    const auto refusal = applyConfig(endpointsAsJson(shown), read);
+    const auto refusal = applyConfig(told(shown), read);
     ASSERT_FALSE(refusal) << refusal->text();
     EXPECT_EQ(read.endpoints.pingIPv4, "192.0.2.1");
     EXPECT_EQ(read.endpoints.vendorUrl, Endpoints().vendorUrl);
 }
 
-TEST(Config, TheHostsPartIsTakenOverOneByOneAndShown) {
+TEST(Config, CapabilitiesAreTakenOverOneByOne) {
     Config config = Config::defaults();
     EXPECT_FALSE(applyConfig(R"({"capabilities": {"wapi": false, "other": true}})", config));
     EXPECT_FALSE(
         applyConfig(R"({"capabilities": {"wapi": true}, "thresholds": {"channelLoad": 0.25}})", config));
     EXPECT_EQ(config.capabilities, (Flags{{"other", true}, {"wapi", true}}));
     Config read = Config::defaults();
-    EXPECT_FALSE(applyConfig(hostPartAsJson(config), read));
+    EXPECT_FALSE(applyConfig(told(config), read));
     EXPECT_EQ(read.capabilities, config.capabilities);
     EXPECT_EQ(read.thresholds.congestion.load, 0.25);
-    EXPECT_EQ(hostPartAsJson(read), hostPartAsJson(config));
+    EXPECT_EQ(told(read), told(config));
     EXPECT_EQ(refusalOf(R"({"capabilities": {"wapi": 1}})"), "capabilities.wapi: must be true or false");
 }
 
