@@ -87,10 +87,18 @@ void addChannels(std::vector<RadioChannel>& channels, const Attributes& bands) {
     });
 }
 
-std::size_t countOf(const Attributes& list) {
-    std::size_t count = 0;
-    list.forEach([&](std::uint16_t, Bytes) { ++count; });
-    return count;
+/// mac80211 claims both on behalf of drivers that cannot scan by themselves, and no other driver claims both.
+bool scansInSoftware(std::uint32_t features) {
+    constexpr std::uint32_t kInSoftware = NL80211_FEATURE_LOW_PRIORITY_SCAN | NL80211_FEATURE_AP_SCAN;
+    return (features & kInSoftware) == kInSoftware;
+}
+
+std::vector<std::uint32_t> numbersOf(const Attributes& list) {
+    std::vector<std::uint32_t> numbers;
+    list.forEach([&](std::uint16_t, Bytes content) {
+        if (const auto number = Attributes::numberIn<std::uint32_t>(content)) numbers.push_back(*number);
+    });
+    return numbers;
 }
 
 std::optional<ScanEvent::Kind> scanEventKind(Bytes payload) {
@@ -110,7 +118,7 @@ std::optional<ScanEvent::Kind> scanEventKind(Bytes payload) {
 void addScanEvent(std::vector<ScanEvent>& events, ScanEvent::Kind kind, const Attributes& message) {
     const auto index = message.number<std::uint32_t>(NL80211_ATTR_IFINDEX);
     if (!index) return;
-    ScanEvent event{kind, *index, countOf(message.nested(NL80211_ATTR_SCAN_FREQUENCIES)), false};
+    ScanEvent event{kind, *index, numbersOf(message.nested(NL80211_ATTR_SCAN_FREQUENCIES)), false};
     message.nested(NL80211_ATTR_SCAN_SSIDS).forEach([&](std::uint16_t, Bytes name) {
         if (name.empty()) event.probedForAll = true;
     });
@@ -241,6 +249,9 @@ std::optional<RadioAbilities> readAbilities(Bytes buffer, std::uint32_t radio) {
         if (!abilities) abilities.emplace();
         if (const auto names = message.number<std::uint8_t>(NL80211_ATTR_MAX_NUM_SCAN_SSIDS)) {
             abilities->namesPerScan = *names;
+        }
+        if (const auto features = message.number<std::uint32_t>(NL80211_ATTR_FEATURE_FLAGS)) {
+            abilities->scansInSoftware = scansInSoftware(*features);
         }
         addChannels(abilities->channels, message.nested(NL80211_ATTR_WIPHY_BANDS));
     });

@@ -60,6 +60,7 @@ struct RadioChannel {
 /// What a radio can do.
 struct RadioAbilities {
     std::size_t namesPerScan = 0;  ///< how many names one scan can probe for
+    bool scansInSoftware = false;  ///< the kernel (mac80211) leads it from channel to channel
     std::vector<RadioChannel> channels;
 };
 std::optional<RadioAbilities> readAbilities(Bytes buffer, std::uint32_t radio);
@@ -69,8 +70,8 @@ struct ScanEvent {
     enum class Kind { started, finished, aborted };
     Kind kind = Kind::finished;
     std::uint32_t interfaceIndex = 0;
-    std::size_t frequencies = 0;  ///< how many channels the scan covered
-    bool probedForAll = false;    ///< whether it asked for networks of any name
+    std::vector<std::uint32_t> frequencies;  ///< MHz, of the channels that the scan was to visit
+    bool probedForAll = false;               ///< whether it asked for networks of any name
 };
 std::vector<ScanEvent> readScanEvents(Bytes buffer);
 

@@ -4,6 +4,7 @@
 #include <cerrno>
 
 #include "linux/manager_scan.h"
+#include "linux/scan_row.h"
 
 namespace wp {
 namespace {
@@ -12,7 +13,6 @@ using std::chrono::milliseconds;
 
 // A network that hides its name is often missed by one visit of 30 ms on its channel.
 constexpr int kListenAttempts = 3;
-constexpr int kStartAttempts = 4;
 // Managers put a scan off for some seconds when another one has just ended.
 constexpr std::chrono::seconds kManagersDelay{10};
 // A manager's scan calls: 30 to 110 ms on each of some 40 channels, more slowly while it is joined.
@@ -35,6 +35,9 @@ class ScanRun {
             abilities_ = *abilities;
         std::erase_if(abilities_.channels,
                       [](const RadioChannel& each) { return each.disabled || !each.carriesNetworks(); });
+        slicing_.home = homeOfRadio();
+        slicing_.wanted = slicing_.home && abilities_.scansInSoftware;
+        putLikelyFirst(abilities_.channels, slicing_.home);
     }
 
     Known<ScanReport> run() {
@@ -92,9 +95,19 @@ class ScanRun {
         return order;
     }
 
-    bool isAsGood(const ScanEvent& event, const ScanOrder& order) const {
-        return order.probeForAll && order.names.empty() && event.probedForAll &&
-               event.frequencies >= abilities_.channels.size();
+    /// The channel on which an interface of the radio is joined to a network. Its access point tells: the interface
+    /// itself does not always name its network.
+    std::optional<std::uint32_t> homeOfRadio() {
+        const Known<std::vector<RadioInterface>> interfaces = radio_.interfaces(until_);
+        if (!interfaces) return std::nullopt;
+        for (const RadioInterface& each : *interfaces) {
+            if (each.radio != wish_.radio || !each.isStation()) continue;
+            const Known<std::vector<AccessPoint>> known = radio_.accessPoints(each.index, until_);
+            if (!known) continue;
+            const auto joined = std::ranges::find_if(*known, &AccessPoint::joined);
+            if (joined != known->end()) return joined->frequency;
+        }
+        return std::nullopt;
     }
 
     /// What a scan of this order found, and when it was over.
@@ -110,7 +123,7 @@ class ScanRun {
         if (!report || !hearsOthers(report->accessPoints)) return why;
         const auto isNamed = [this](const AccessPoint& each) { return each.says.name == *wish_.named; };
         if (wish_.named && std::ranges::none_of(report->accessPoints, isNamed)) return why;
-        report->completedAt = 0;
+        report->completedAt.reset();
         return report;
     }
 
@@ -123,21 +136,32 @@ class ScanRun {
 
     /// Scans until a scan of this order, or as good a one of somebody else, is complete.
     std::optional<Error> scan(const ScanOrder& order) {
-        bool aborted = false;
-        for (int attempt = 0; attempt < kStartAttempts; ++attempt) {
-            const int error = radio_.startScan(wish_.interfaceIndex, order, until_);
-            if (error != 0 && error != EBUSY) return startFailure(error);
-            const Known<ScanEvent> event = radio_.nextScanEnd(wish_.interfaceIndex, until_);
-            if (!event) {
-                if (error == 0) radio_.abortScan(wish_.interfaceIndex);
-                return event.error();
+        for (ScanRow row(order, slicing_); !row.isComplete();) {
+            wasCutShort_ = row.isGivenUp();
+            if (wasCutShort_)
+                return failure(Reason::timeout, "scans were aborted or the radio was busy with others'");
+            if (waitReadable(-1, until_.within(row.pause())) == Wait::stopped)
+                return waitFailure(Wait::stopped, "scan");
+            if (std::optional<Error> error = visit(row)) {
+                wasCutShort_ = error->code == static_cast<int>(Reason::timeout);
+                return error;
             }
-            const bool finished = event->kind == ScanEvent::Kind::finished;
-            if (finished && (error == 0 || isAsGood(*event, order))) return std::nullopt;
-            if (!finished && error == 0 && std::exchange(aborted, true)) break;
         }
-        wasCutShort_ = true;
-        return failure(Reason::timeout, "scans were aborted or the radio was busy with others'");
+        return std::nullopt;
+    }
+
+    /// Makes the row's next request and waits until the scan, or the one that is in its way, has ended.
+    std::optional<Error> visit(ScanRow& row) {
+        const int error = radio_.startScan(wish_.interfaceIndex, row.next(), until_);
+        if (error != 0 && error != EBUSY) return startFailure(error);
+        if (error == EBUSY && slicing_.wanted) keepHeard();
+        const Known<ScanEvent> event = radio_.nextScanEnd(wish_.interfaceIndex, until_);
+        if (event) {
+            row.ended(error == 0 ? ScanRow::Whose::own : ScanRow::Whose::others, *event);
+            return std::nullopt;
+        }
+        if (error == 0) radio_.abortScan(wish_.interfaceIndex);
+        return event.error();
     }
 
     static Error startFailure(int error) {
@@ -154,7 +178,23 @@ class ScanRun {
         std::erase_if(*found, [&](const AccessPoint& each) {
             return !each.joined && each.lastSeen && *each.lastSeen < oldest;
         });
+        const std::size_t known = found->size();
+        for (const AccessPoint& each : heard_) {
+            const auto isSame = [&](const AccessPoint& other) {
+                return other.address == each.address && other.frequency == each.frequency;
+            };
+            if (std::none_of(found->begin(), found->begin() + static_cast<std::ptrdiff_t>(known), isSame))
+                found->push_back(each);
+        }
         return found;
+    }
+
+    /// Whoever scans between two requests may have the kernel forget what was heard before.
+    void keepHeard() {
+        Known<std::vector<AccessPoint>> heard = results();
+        if (!heard) return;
+        heard_ = std::move(*heard);
+        for (AccessPoint& each : heard_) each.joined = false;
     }
 
     /// Listens on the channels of the named network until a beacon of each of its access points was heard: only a
@@ -180,6 +220,8 @@ class ScanRun {
     const Until& until_;
     RadioAbilities abilities_;  ///< with only the channels that may be used and that carry networks
     std::int64_t startedAt_;
+    ScanSlicing slicing_;
+    std::vector<AccessPoint> heard_;  ///< before others scanned meanwhile
     bool wasCutShort_ = false;
 };
 
@@ -201,7 +243,7 @@ std::optional<ScanReport> heardLately(RadioSocket& radio, const ScanWish& wish, 
         return !each.joined && (!each.lastSeen || *each.lastSeen < wish.freshSince);
     });
     if (!hearsOthers(*known)) return std::nullopt;
-    return ScanReport{std::move(*known), 0};
+    return ScanReport{std::move(*known), std::nullopt};
 }
 
 /// A socket that is told when scans are over.
@@ -216,7 +258,7 @@ Known<RadioSocket> openRadio(const Until& until) {
 }  // namespace
 
 void ScanMemory::keep(std::uint32_t interfaceIndex, const ScanReport& report) {
-    if (report.completedAt == 0) return;
+    if (!report.completedAt) return;
     interfaceIndex_ = interfaceIndex;
     report_ = report;
 }
@@ -230,7 +272,7 @@ const ScanReport* ScanMemory::serving(const ScanWish& wish) const {
 Known<ScanReport> Scanner::scanNow(RadioSocket& radio, const ScanWish& wish, const Until& until) {
     Known<ScanReport> report = ScanRun(radio, wish, until).run();
     if (isNotPermitted(report)) return scanWithoutPermission(radio, wish, until);
-    if (report && report->completedAt == 0)
+    if (report && !report->completedAt)
         notes_.once("scans were cut short: other networks are judged by what was heard until then");
     else if (report && !wish.named && wish.manner == ScanWish::Manner::listening)
         listened_.keep(wish.interfaceIndex, *report);

@@ -11,8 +11,8 @@ namespace wp {
 /// What a scan found, and when it was complete.
 struct ScanReport {
     std::vector<AccessPoint> accessPoints;
-    /// In ms on the clock that counts suspended time too; 0 where no scan came to its end.
-    std::int64_t completedAt = 0;
+    /// In ms on the clock that counts suspended time too; nothing where no scan came to its end.
+    std::optional<std::int64_t> completedAt;
 };
 
 /// What is asked of the scanner.

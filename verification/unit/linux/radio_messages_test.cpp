@@ -141,6 +141,15 @@ TEST(RadioMessages, GatherARadioFromItsManyMessages) {
     EXPECT_FALSE(readAbilities(dump, 4711));
 }
 
+TEST(RadioMessages, KnowARadioThatTheKernelScansFromOneThatScansByItself) {
+    for (const bool inSoftware : {true, false}) {
+        const std::string scenario = inSoftware ? "good-home" : "radio-scans-by-itself";
+        const auto abilities = readAbilities(captured(scenario + "-wiphy"), 0);
+        ASSERT_TRUE(abilities) << scenario;
+        EXPECT_EQ(inSoftware, abilities->scansInSoftware) << scenario;
+    }
+}
+
 TEST(RadioMessages, KnowTheChannelsOfVehiclesFromThoseOfNetworks) {
     std::vector<std::uint32_t> leftOut;
     for (std::uint32_t frequency = 2400; frequency <= 7115; ++frequency)
@@ -166,7 +175,8 @@ TEST(RadioMessages, TellStartAndEndOfScans) {
     EXPECT_FALSE(events[1].probedForAll);
     EXPECT_EQ(ScanEvent::Kind::finished, events[3].kind);
     EXPECT_TRUE(events[3].probedForAll);
-    EXPECT_GT(events[3].frequencies, 11U);
+    EXPECT_GT(events[3].frequencies.size(), 11U);
+    EXPECT_EQ(2412U, events[3].frequencies.front());
 }
 
 TEST(RadioMessages, SurviveAnyCutOfADump) {

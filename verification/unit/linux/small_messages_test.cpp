@@ -104,7 +104,7 @@ TEST(ScanMemory, KeepsAScanOverWhatWasHeardWithoutOne) {
     wish.freshSince = 500;
     EXPECT_EQ(memory.serving(wish), nullptr);
     memory.keep(3, {{}, 1000});
-    memory.keep(3, {std::vector<AccessPoint>(2), 0});
+    memory.keep(3, {std::vector<AccessPoint>(2), std::nullopt});
 
     ASSERT_NE(memory.serving(wish), nullptr);
     EXPECT_EQ(memory.serving(wish)->completedAt, 1000);
