@@ -68,7 +68,7 @@ PortalAnswer portalAnswer(const WebAnswer& answer, const WebRequest& request) {
     portal.end =
         answer.end == WebAnswer::End::answered ? PortalAnswer::End::answered : PortalAnswer::End::noAnswer;
     portal.status = answer.status;
-    portal.bodySize = answer.body.size();
+    portal.bodySize = answer.bodySize;
     portal.location = answer.location;
     portal.server = answer.server;
     if (!portal.server && !request.addresses.empty()) portal.server = request.addresses.front();
@@ -102,7 +102,7 @@ Known<PortalDeclaration> askPortalApi(const Link& link, const LinkSetup& setup, 
 bool decides(const std::optional<WebAnswer>& plain) {
     if (!plain || plain->end != WebAnswer::End::answered) return false;
     return plain->status == 204 || plain->status == 511 || (plain->status >= 300 && plain->status <= 399) ||
-           (plain->status == 200 && plain->body.size() > 1);
+           (plain->status == 200 && plain->bodySize > 1);
 }
 
 ServiceContact contactOf(const WebAnswer& answer) {
@@ -121,6 +121,7 @@ ServiceContact contactOf(const WebAnswer& answer) {
         case WebAnswer::End::badCertificate:
             contact.end = ServiceContact::End::badCertificate;
             break;
+        case WebAnswer::End::noAuthorities:
         case WebAnswer::End::failed:
             contact.end = ServiceContact::End::failed;
             break;
@@ -144,6 +145,9 @@ Known<ServiceContact> contact(const std::string& url, bool connectOnly, const Li
     request->connectOnly = connectOnly;
     const auto answers = runWebRequests({*request}, until);
     if (!answers) return answers.error();
+    // Without them nothing can be said of the network.
+    if (answers->front().end == WebAnswer::End::noAuthorities)
+        return failure(Reason::badConfiguration, answers->front().why);
     return contactOf(answers->front());
 }
 

@@ -14,7 +14,7 @@ struct PortalAnswer {
     enum class End { answered, noAnswer };
     End end = End::noAnswer;
     int status = 0;
-    std::size_t bodySize = 0;                   ///< as far as it was read
+    std::uint64_t bodySize = 0;                 ///< as announced, or else as far as it was read
     std::string location;                       ///< of a redirect
     std::optional<IPAddress> server;            ///< who answered
     std::string why;                            ///< of no answer

@@ -33,7 +33,7 @@ ConnectRace::ConnectRace(const std::vector<IPAddress>& addresses, std::uint16_t 
 
 void ConnectRace::advance(Clock::time_point now) {
     while (!winner_) {
-        std::erase_if(running_, [this](Attempt& each) { return settle(each); });
+        if (std::erase_if(running_, [this](Attempt& each) { return settle(each); }) > 0) nextStart_ = now;
         const bool isDue = running_.empty() || now >= nextStart_;
         if (winner_ || next_ == addresses_.size() || !isDue) break;
         start(now);
@@ -48,12 +48,13 @@ void ConnectRace::addWaits(std::vector<pollfd>& waits, Clock::time_point& wake) 
 
 void ConnectRace::start(Clock::time_point now) {
     const IPAddress& address = addresses_[next_++];
-    nextStart_ = now + kApart;
     Known<Descriptor> socket = ipSocket(SOCK_STREAM, address, interfaceName_);
-    if (socket)
-        running_.push_back({address, std::move(*socket)});
-    else
+    if (!socket) {
         why_ = socket.error().message;
+        return;
+    }
+    running_.push_back({address, std::move(*socket)});
+    nextStart_ = now + kApart;
 }
 
 bool ConnectRace::settle(Attempt& attempt) {

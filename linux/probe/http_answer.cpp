@@ -80,6 +80,14 @@ std::string_view HttpAnswer::header(std::string_view name) const {
     return found == headers_.end() ? std::string_view() : std::string_view(found->second);
 }
 
+/// The values of all headers of that name, as the one list that they stand for (RFC 9110, 5.3).
+std::string HttpAnswer::all(std::string_view name) const {
+    std::string list;
+    for (const auto& [each, value] : headers_)
+        if (equalWithoutCase(each, name)) list += (list.empty() ? "" : ", ") + value;
+    return list;
+}
+
 /// The next whole line without its end; it stays until the next one is taken.
 std::optional<std::string_view> HttpAnswer::takeLine(std::string_view& bytes) {
     const std::size_t end = bytes.find('\n');
@@ -141,18 +149,15 @@ void HttpAnswer::chooseBody() {
         part_ = Part::end;
         return;
     }
-    const std::string_view coding = header("Transfer-Encoding"), length = header("Content-Length");
-    if (!coding.empty()) {
-        const std::size_t comma = coding.rfind(',');
-        const std::string_view last = trimmed(coding.substr(comma == coding.npos ? 0 : comma + 1));
+    const std::string codings = all("Transfer-Encoding");
+    if (!codings.empty()) {
+        const std::string_view last = trimmed(std::string_view(codings).substr(codings.rfind(',') + 1));
         part_ = equalWithoutCase(last, "chunked") ? Part::chunkSize : Part::untilClosed;
         return;
     }
-    part_ = Part::untilClosed;
-    if (length.empty()) return;
-    const auto count = lengthIn(length);
-    left_ = count.value_or(0);
-    part_ = count ? Part::counted : Part::broken;
+    announced_ = lengthIn(all("Content-Length"));
+    left_ = announced_.value_or(0);
+    part_ = announced_ ? Part::counted : Part::untilClosed;
 }
 
 void HttpAnswer::takeChunkSize(std::string_view line) {
@@ -184,7 +189,7 @@ std::optional<std::int64_t> httpDate(std::string_view text) {
          {"%a, %d %b %Y %H:%M:%S GMT", "%A, %d-%b-%y %H:%M:%S GMT", "%a %b %d %H:%M:%S %Y"}) {
         std::tm moment{};
         const char* const end = ::strptime(whole.c_str(), form, &moment);
-        if (end != nullptr && *end == '\0') return ::timegm(&moment);
+        if (end == whole.c_str() + whole.size()) return ::timegm(&moment);
     }
     return std::nullopt;
 }

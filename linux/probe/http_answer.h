@@ -10,8 +10,9 @@
 namespace wp {
 
 /// An answer of HTTP/1.x, read as its bytes come (RFC 9112). It is bounded whatever a server sends: lines of 16 KiB,
-/// 64 KiB before the body, a few interim answers, and the body up to its own bound. Lines that are no header are
-/// passed over, since a page that stands in for another is often served by something home-made. Owner's thread.
+/// 64 KiB before the body, a few interim answers, and the body up to its own bound. A page that stands in for another is
+/// often served by something home-made: lines that are no header are passed over, and a length that makes no sense, or
+/// of which there are two, counts as none. Owner's thread.
 class HttpAnswer {
   public:
     explicit HttpAnswer(std::size_t longestBody) : longestBody_(longestBody) {}
@@ -25,11 +26,15 @@ class HttpAnswer {
     bool ended() const { return part_ == Part::end || part_ == Part::broken; }
     /// Whether status and headers are there; the body may still be cut short.
     bool hasHead() const { return hasHead_; }
+    /// Whether the body is there, as far as it is read at all, and did not break off.
+    bool isWhole() const { return part_ == Part::end; }
 
     int status() const { return hasHead_ ? status_ : 0; }
     /// The value of the first header of that name, whose case plays no part; empty where there is none.
     std::string_view header(std::string_view name) const;
     const std::string& body() const { return body_; }
+    /// How long the body is in bytes: as announced, or else as far as it came.
+    std::uint64_t bodySize() const { return announced_.value_or(body_.size()); }
 
   private:
     enum class Part { statusLine, header, chunkSize, chunk, chunkEnd, counted, untilClosed, end, broken };
@@ -41,6 +46,7 @@ class HttpAnswer {
     void takeBody(std::string_view& bytes);
     void endHead();
     void chooseBody();
+    std::string all(std::string_view name) const;
 
     std::size_t longestBody_;
     Part part_ = Part::statusLine;
@@ -49,8 +55,9 @@ class HttpAnswer {
     int interim_ = 0;
     std::size_t headSize_ = 0;
     std::uint64_t left_ = 0;  ///< of a chunk or a counted body
-    std::string line_;        ///< the beginning of one that is not whole yet
-    std::string whole_;       ///< what the last whole line lies in
+    std::optional<std::uint64_t> announced_;
+    std::string line_;   ///< the beginning of one that is not whole yet
+    std::string whole_;  ///< what the last whole line lies in
     std::vector<std::pair<std::string, std::string>> headers_;
     std::string body_;
 };

@@ -3,6 +3,7 @@
 #include <netinet/in.h>
 
 #include <algorithm>
+#include <array>
 #include <cerrno>
 #include <cstring>
 
@@ -11,18 +12,14 @@ namespace {
 
 constexpr std::size_t kLongestDatagram = 4096;
 
-/// Takes in all that is there; true once one is accepted.
-bool receiveAll(const Descriptor& socket, const AcceptDatagram& accept) {
-    std::vector<std::uint8_t> buffer(kLongestDatagram);
-    while (true) {
-        SocketAddress from;
-        from.size = sizeof from.storage;
-        const ssize_t size = ::recvfrom(socket.number(), buffer.data(), buffer.size(), MSG_DONTWAIT,
-                                        reinterpret_cast<sockaddr*>(&from.storage), &from.size);
-        if (size < 0) return false;
-        const auto sender = from.address();
-        if (sender && accept({buffer.data(), static_cast<std::size_t>(size)}, *sender)) return true;
-    }
+/// Takes in the next datagram; whether it is accepted.
+bool receiveNext(const Descriptor& socket, const AcceptDatagram& accept) {
+    std::array<std::uint8_t, kLongestDatagram> buffer;
+    SocketAddress from;
+    from.size = sizeof from.storage;
+    const ssize_t size = ::recvfrom(socket.number(), buffer.data(), buffer.size(), MSG_DONTWAIT,
+                                    reinterpret_cast<sockaddr*>(&from.storage), &from.size);
+    return size >= 0 && from.address() && accept({buffer.data(), static_cast<std::size_t>(size)}, from);
 }
 
 }  // namespace
@@ -61,6 +58,10 @@ std::uint16_t SocketAddress::port() const {
     return ntohs(reinterpret_cast<const sockaddr_in6*>(&storage)->sin6_port);
 }
 
+bool SocketAddress::isSame(const SocketAddress& other) const {
+    return address() == other.address() && port() == other.port();
+}
+
 Known<Descriptor> ipSocket(int type, const IPAddress& address, const std::string& interfaceName) {
     const int family = address.isIPv4() ? AF_INET : AF_INET6;
     Descriptor socket(::socket(family, type | SOCK_CLOEXEC | SOCK_NONBLOCK, 0));
@@ -82,13 +83,12 @@ Wait exchangeDatagrams(const Descriptor& socket, const SocketAddress& target, By
         (void)::sendto(socket.number(), request.data(), request.size(), MSG_NOSIGNAL, target.raw(),
                        target.size);
         const Until own = turn < pauses.size() ? until.within(pauses[turn]) : until;
-        while (true) {
+        do {
             pollfd descriptor{socket.number(), POLLIN, 0};
             const Wait wait = waitAny({&descriptor, 1}, own);
             if (wait == Wait::stopped) return wait;
-            if (wait == Wait::timeout) break;
-            if (receiveAll(socket, accept)) return Wait::ready;
-        }
+            if (wait == Wait::ready && receiveNext(socket, accept)) return wait;
+        } while (Clock::now() < own.deadline);
     }
     return Wait::timeout;
 }

@@ -22,6 +22,8 @@ struct SocketAddress {
     /// The address without its port; nothing where it is of no IP family.
     std::optional<IPAddress> address() const;
     std::uint16_t port() const;
+    /// Whether both are the same address and port.
+    bool isSame(const SocketAddress& other) const;
     const sockaddr* raw() const { return reinterpret_cast<const sockaddr*>(&storage); }
 };
 
@@ -31,10 +33,10 @@ struct SocketAddress {
 Known<Descriptor> ipSocket(int type, const IPAddress& address, const std::string& interfaceName);
 
 /// Looks at one answer and where it came from; true ends the exchange.
-using AcceptDatagram = std::function<bool(Bytes message, const IPAddress& sender)>;
+using AcceptDatagram = std::function<bool(Bytes message, const SocketAddress& sender)>;
 
 /// Sends the request and waits for an answer that is accepted; sends it again after each of the pauses.
-/// Datagrams longer than 4 KiB are cut there.
+/// Datagrams longer than 4 KiB are cut there. No number of answers that are not accepted keeps it beyond its time.
 Wait exchangeDatagrams(const Descriptor& socket, const SocketAddress& target, Bytes request,
                        const std::vector<std::chrono::milliseconds>& pauses, const AcceptDatagram& accept,
                        const Until& until);

@@ -26,10 +26,10 @@ Known<std::string> findDescription(const RouterPlace& router, const Until& until
     const Wait wait = exchangeDatagrams(
         *socket, SocketAddress::of(router.searched, router.port),
         {reinterpret_cast<const std::uint8_t*>(search.data()), search.size()}, kPauses,
-        [&](Bytes message, const IPAddress& sender) {
+        [&](Bytes message, const SocketAddress& sender) {
             const auto named =
                 locationFromSsdp({reinterpret_cast<const char*>(message.data()), message.size()});
-            if (sender != router.address || !named || !liesOn(*named, router.address)) return false;
+            if (sender.address() != router.address || !named || !liesOn(*named, router.address)) return false;
             location = *named;
             return true;
         },

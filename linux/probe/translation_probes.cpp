@@ -41,8 +41,8 @@ Known<IPAddress> askByPcp(const Descriptor& socket, const SocketAddress& router,
     const auto request = pcpMapRequest(own, local.port(), nonce, 1);
     const Wait wait = exchangeDatagrams(
         socket, router, request, kPauses,
-        [&](Bytes message, const IPAddress& sender) {
-            if (sender == router.address()) external = addressFromPcp(message, nonce);
+        [&](Bytes message, const SocketAddress& sender) {
+            if (sender.isSame(router)) external = addressFromPcp(message, nonce);
             return external.has_value();
         },
         until);
@@ -111,12 +111,13 @@ Known<IPAddress> askMappedAddress(const IPAddress& server, std::uint16_t port,
                                   const std::string& interfaceName, const Until& until) {
     const auto socket = ipSocket(SOCK_DGRAM, server, interfaceName);
     if (!socket) return socket.error();
+    const SocketAddress target = SocketAddress::of(server, port);
     const auto transaction = randomBytes<12>();
     std::optional<IPAddress> mapped;
     const Wait wait = exchangeDatagrams(
-        *socket, SocketAddress::of(server, port), stunBindingRequest(transaction), kPauses,
-        [&](Bytes message, const IPAddress&) {
-            mapped = addressFromStun(message, transaction);
+        *socket, target, stunBindingRequest(transaction), kPauses,
+        [&](Bytes message, const SocketAddress& sender) {
+            if (sender.isSame(target)) mapped = addressFromStun(message, transaction);
             return mapped.has_value();
         },
         until);
@@ -132,8 +133,8 @@ Known<IPAddress> askExternalAddress(const IPAddress& router, std::uint16_t port,
     std::optional<PortMappingAnswer> answer;
     const Wait wait = exchangeDatagrams(
         *socket, target, externalAddressRequest(), kPauses,
-        [&](Bytes message, const IPAddress& sender) {
-            if (sender == router) answer = readExternalAddress(message);
+        [&](Bytes message, const SocketAddress& sender) {
+            if (sender.isSame(target)) answer = readExternalAddress(message);
             return answer.has_value();
         },
         until);
@@ -157,8 +158,8 @@ Known<std::vector<std::optional<IPAddress>>> listHops(const IPAddress& target,
         pollfd descriptor{socket->number(), 0, 0};  // errors are always reported
         const Wait wait = waitAny({&descriptor, 1}, until);
         if (wait == Wait::stopped) return waitFailure(wait, "the way out");
-        if (wait == Wait::timeout) break;
-        while (takeError(*socket, hops)) {
+        if (wait == Wait::timeout || Clock::now() >= until.deadline) break;
+        while (takeError(*socket, hops) && Clock::now() < until.deadline) {
         }
         // An error without an entry in the queue would wake us again at once.
         int pending = 0;

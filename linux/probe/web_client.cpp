@@ -15,6 +15,11 @@
 namespace wp {
 namespace {
 
+/// The one status whose body is read.
+constexpr int kWithBody = 200;
+/// How many steps, each with up to 4 KiB, an exchange takes at a stretch.
+constexpr int kMostTurns = 32;
+
 double millisecondsBetween(Clock::time_point from, Clock::time_point to) {
     return std::chrono::duration<double, std::milli>(to - from).count();
 }
@@ -38,6 +43,12 @@ std::vector<IPAddress> addressesOf(const WebRequest& request, const WebPlace& pl
     return request.addresses;
 }
 
+/// Where a redirect leads, as far as it leads to the web at all.
+std::string targetOf(const std::string& url, std::string_view location) {
+    const std::string whole = resolveReference(url, location);
+    return webPlace(whole) ? plainText(whole, kLongestUrl) : std::string();
+}
+
 /// One request under way.
 class Exchange {
   public:
@@ -51,16 +62,28 @@ class Exchange {
           began_(Clock::now()) {}
     Exchange(const Exchange&) = delete;
 
-    /// Goes on as far as possible without waiting.
+    /// Goes on without waiting, but not for ever: others, the deadline and the stop signal have their turns too.
     void advance() {
-        while (step_ != Step::ended && turn()) {
-        }
+        goesOn_ = true;
+        for (int i = 0; i < kMostTurns && goesOn_ && step_ != Step::ended; ++i) goesOn_ = turn();
+    }
+    /// Ends before its time; at the deadline with what has come by then.
+    void giveUp(bool isDeadline) {
+        if (!isDeadline)
+            fail("not waited for any longer");
+        else if (step_ == Step::connecting)
+            fail("no connection in time");
+        else if (step_ == Step::securing)
+            fail("no secure connection in time");
+        else
+            conclude("no answer in time");
     }
     bool ended() const { return step_ == Step::ended; }
     const WebAnswer& answer() const { return answer_; }
 
     /// What to wait for before it is worth advancing again.
     void addWaits(std::vector<pollfd>& waits, Clock::time_point& wake) const {
+        if (goesOn_) wake = Clock::time_point::min();
         if (step_ == Step::connecting)
             race_.addWaits(waits, wake);
         else if (stream_)
@@ -133,22 +156,23 @@ class Exchange {
             read_.take({buffer.data(), size});
         else
             read_.close();
-        return read_.ended() ? finish(step) : true;
+        if (!read_.ended() && (!read_.hasHead() || read_.status() == kWithBody)) return true;
+        return conclude(step == StreamStep::failed   ? stream_->why()
+                        : step == StreamStep::closed ? "the connection was closed before an answer"
+                                                     : "the answer is none of HTTP/1");
     }
 
-    /// A body that is too long, or breaks off, comes after an answer all the same.
-    bool finish(StreamStep last) {
-        if (!read_.hasHead()) {
-            if (last == StreamStep::failed) return fail(stream_->why());
-            return fail(last == StreamStep::closed ? "the connection was closed before an answer"
-                                                   : "the answer is none of HTTP/1");
-        }
+    /// A body that is too long, or breaks off, comes after an answer all the same; one of which nothing came and
+    /// nothing is known could be taken for an empty page. \param missing why there is no answer, if there is none
+    bool conclude(const std::string& missing) {
+        const bool isUnknown = read_.status() == kWithBody && !read_.isWhole() && read_.bodySize() == 0;
+        if (!read_.hasHead() || isUnknown) return fail(missing);
         answer_.status = read_.status();
         answer_.body = read_.body();
+        answer_.bodySize = read_.bodySize();
         const bool redirects = answer_.status >= 300 && answer_.status <= 399;
         const std::string_view location = read_.header("Location");
-        if (redirects && !location.empty())
-            answer_.location = plainText(resolveReference(request_.url, location), kLongestUrl);
+        if (redirects && !location.empty()) answer_.location = targetOf(request_.url, location);
         if (const auto date = httpDate(read_.header("Date")))
             answer_.clockOffset = std::int64_t{std::time(nullptr)} - *date;
         return end(WebAnswer::End::answered);
@@ -160,9 +184,10 @@ class Exchange {
         if (step == StreamStep::needsRead || step == StreamStep::needsWrite) return false;
         if (step == StreamStep::closed) return fail("the connection was closed");
         answer_.fault = stream_->fault();
-        if (answer_.fault == CertificateFault::none) return fail(stream_->why());
         answer_.why = stream_->why();
-        return end(WebAnswer::End::badCertificate);
+        if (stream_->lacksAuthorities()) return end(WebAnswer::End::noAuthorities);
+        const bool isJudged = answer_.fault != CertificateFault::none;
+        return end(isJudged ? WebAnswer::End::badCertificate : WebAnswer::End::failed);
     }
 
     bool fail(const std::string& why) {
@@ -186,6 +211,7 @@ class Exchange {
     HttpAnswer read_;
     WebAnswer answer_;
     Step step_ = Step::connecting;
+    bool goesOn_ = false;
     short events_ = POLLIN;
     Clock::time_point began_, reached_{}, asked_{};
 };
@@ -193,13 +219,11 @@ class Exchange {
 using Exchanges = std::vector<std::unique_ptr<Exchange>>;
 using Answers = std::vector<std::optional<WebAnswer>>;
 
-/// Advances all and takes in what has ended; whether anything has.
+/// Takes in what has ended; whether anything has.
 bool collect(const Exchanges& exchanges, Answers& answers) {
     bool any = false;
     for (std::size_t i = 0; i < exchanges.size(); ++i) {
-        if (answers[i]) continue;
-        exchanges[i]->advance();
-        if (!exchanges[i]->ended()) continue;
+        if (answers[i] || !exchanges[i]->ended()) continue;
         answers[i] = exchanges[i]->answer();
         any = true;
     }
@@ -209,16 +233,18 @@ bool collect(const Exchanges& exchanges, Answers& answers) {
 /// Turns all until they are answered, what there is suffices, or time is over.
 Wait turnAll(const Exchanges& exchanges, Answers& answers, const Until& until, const Conclusive& conclusive) {
     while (true) {
+        for (std::size_t i = 0; i < exchanges.size(); ++i)
+            if (!answers[i]) exchanges[i]->advance();
         if (collect(exchanges, answers) && conclusive && conclusive(answers)) return Wait::ready;
         if (std::ranges::all_of(answers, [](const auto& each) { return each.has_value(); }))
             return Wait::ready;
+        // A server that never pauses would otherwise keep us beyond the deadline.
+        if (Clock::now() >= until.deadline) return Wait::timeout;
         Until next = until;
         std::vector<pollfd> waits;
         for (std::size_t i = 0; i < exchanges.size(); ++i)
             if (!answers[i]) exchanges[i]->addWaits(waits, next.deadline);
-        const Wait wait = waitAny(waits, next);
-        if (wait == Wait::stopped) return wait;
-        if (wait == Wait::timeout && Clock::now() >= until.deadline) return wait;
+        if (waitAny(waits, next) == Wait::stopped) return Wait::stopped;
     }
 }
 
@@ -245,11 +271,11 @@ Known<std::vector<WebAnswer>> runWebRequests(const std::vector<WebRequest>& requ
     }
     const Wait wait = turnAll(exchanges, answers, until, conclusive);
     if (wait == Wait::stopped) return waitFailure(wait, "the web");
+    for (std::size_t i = 0; i < exchanges.size(); ++i)
+        if (!answers[i]) exchanges[i]->giveUp(wait == Wait::timeout);
+    collect(exchanges, answers);
     std::vector<WebAnswer> all;
-    for (auto& answer : answers) {
-        const char* why = wait == Wait::ready ? "not waited for any longer" : "no answer in time";
-        all.push_back(answer ? std::move(*answer) : failed(why));
-    }
+    for (auto& answer : answers) all.push_back(std::move(*answer));
     return all;
 }
 

@@ -11,7 +11,8 @@
 
 namespace wp {
 
-/// One request. It follows no redirect, goes through no proxy, and takes a connection of its own.
+/// One request. It follows no redirect, goes through no proxy, and takes a connection of its own. A body is read with
+/// status 200 alone; nobody asks for that of another.
 struct WebRequest {
     std::string url;
     std::string interfaceName;         ///< empty: any
@@ -20,17 +21,24 @@ struct WebRequest {
     std::optional<std::string> post;   ///< a body to be sent
     bool connectOnly = false;          ///< ends with the connection, secure where the URL is
     std::size_t longestBody = 64U << 10;
-    std::string authorities;  ///< a file of certificates in place of the system's
+    /// A file of certificates, or a folder of them under the names of their hashes, in place of the system's.
+    std::string authorities;
 };
 
 /// What became of it.
 struct WebAnswer {
-    enum class End { answered, failed, badCertificate };
+    enum class End {
+        answered,
+        failed,
+        badCertificate,
+        noAuthorities,  ///< there was nobody on this device to judge a certificate by
+    };
     End end = End::failed;
     std::string why;
     int status = 0;
-    std::string body;      ///< up to the request's bound
-    std::string location;  ///< where a redirect leads, as a whole URL
+    std::string body;            ///< up to the request's bound
+    std::uint64_t bodySize = 0;  ///< as announced, or else as far as it came
+    std::string location;  ///< where a redirect leads, as a whole URL of http or https; empty for any other
     std::optional<IPAddress> server;
     ContactSteps steps;
     CertificateFault fault = CertificateFault::none;
@@ -40,8 +48,8 @@ struct WebAnswer {
 /// Called after each answer with all answers so far; true ends the others at once, as failed.
 using Conclusive = std::function<bool(const std::vector<std::optional<WebAnswer>>& answers)>;
 
-/// Runs the requests at once. What is not done at the deadline has failed. An error is only that all was
-/// stopped. *Any* thread.
+/// Runs the requests at once. At the deadline an answer counts with as much of its body as has come, and what has none
+/// has failed. An error is only that all was stopped. *Any* thread.
 Known<std::vector<WebAnswer>> runWebRequests(const std::vector<WebRequest>& requests, const Until& until,
                                              const Conclusive& conclusive = nullptr);
 

@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <charconv>
 
+#include "service/ip_address.h"
+
 namespace wp {
 namespace {
 
@@ -36,8 +38,10 @@ bool readPort(std::string_view text, std::uint16_t& port) {
 bool readAuthority(std::string_view text, WebPlace& place) {
     if (text.starts_with("[")) {
         const std::size_t end = text.find(']');
-        if (end == text.npos) return false;
-        place.host = text.substr(1, end - 1);
+        const std::string_view inside = text.substr(1, end == text.npos ? end : end - 1);
+        const auto address = IPAddress::fromText(inside);
+        if (end == text.npos || !address || inside.find(':') == inside.npos) return false;
+        place.host = inside.substr(0, inside.find('%'));
         text.remove_prefix(end + 1);
     } else {
         place.host = text.substr(0, text.find(':'));

@@ -13,7 +13,8 @@ inline constexpr std::size_t kLongestUrl = 2048;
 /// The parts of "http://HOST[:PORT][/PATH]", or the same with https.
 struct WebPlace {
     bool secure = false;
-    std::string host;  ///< without the brackets of an IPv6 address
+    std::string
+        host;  ///< without the brackets of an IPv6 address and its zone, which is another device's word
     std::uint16_t port = 80;
     std::string path;  ///< begins with "/", with the query; without a fragment
     bool operator==(const WebPlace&) const = default;

@@ -8,6 +8,7 @@
 #include <algorithm>
 #include <cerrno>
 #include <cstring>
+#include <filesystem>
 
 #include "service/ip_address.h"
 
@@ -15,7 +16,7 @@ namespace wp {
 namespace {
 
 /// The folder lets the few authorities that are needed be read, a file would all be read.
-constexpr const char* kSystemsAuthorities = "/etc/ssl/certs";
+const std::string kSystemsAuthorities = "/etc/ssl/certs";
 
 struct Release {
     void operator()(SSL_CTX* context) const { SSL_CTX_free(context); }
@@ -52,16 +53,34 @@ std::string lastReason() {
     return reason != nullptr ? reason : "no reason given";
 }
 
-/// Who is trusted; false where the file cannot be read.
-bool setAuthorities(SSL_CTX* context, const std::string& file) {
-    return file.empty() ? SSL_CTX_load_verify_dir(context, kSystemsAuthorities) == 1
-                        : SSL_CTX_load_verify_file(context, file.c_str()) == 1;
+/// Who is trusted; false where a file cannot be read.
+bool setAuthorities(SSL_CTX* context, const std::string& place) {
+    std::error_code failed;
+    return std::filesystem::is_regular_file(place, failed)
+               ? SSL_CTX_load_verify_file(context, place.c_str()) == 1
+               : SSL_CTX_load_verify_dir(context, place.c_str()) == 1;
+}
+
+/// Whether any certificate lies there: a folder holds them as "9d66eef0.0".
+bool holdsAuthorities(const std::string& place) {
+    constexpr std::size_t kHash = 8;
+    std::error_code failed;
+    if (std::filesystem::is_regular_file(place, failed)) return true;
+    for (std::filesystem::directory_iterator each(place, failed), end; !failed && each != end;
+         each.increment(failed)) {
+        const std::string name = each->path().filename();
+        if (name.size() > kHash + 1 && name.find_first_not_of("0123456789abcdef") == kHash &&
+            name[kHash] == '.' && std::filesystem::exists(each->path(), failed))
+            return true;
+    }
+    return false;
 }
 
 /// Whom the certificate must be for.
 bool setHost(SSL* connection, const std::string& host) {
-    if (IPAddress::fromText(host))
-        return X509_VERIFY_PARAM_set1_ip_asc(SSL_get0_param(connection), host.c_str()) == 1;
+    if (const auto address = IPAddress::fromText(host))
+        return X509_VERIFY_PARAM_set1_ip(SSL_get0_param(connection), address->bytes().data(),
+                                         address->bytes().size()) == 1;
     // The macro for the second call casts in C's way.
     return SSL_set1_host(connection, host.c_str()) == 1 &&
            SSL_ctrl(connection, SSL_CTRL_SET_TLSEXT_HOSTNAME, TLSEXT_NAMETYPE_host_name,
@@ -74,23 +93,26 @@ struct WebStream::Secure {
     std::unique_ptr<SSL_CTX, Release> context;
     std::unique_ptr<SSL, Release> connection;
 
-    /// Nothing where all is ready for the first step, else what is missing.
-    std::string prepare(int descriptor, const std::string& host, const std::string& authorities) {
+    bool makeContext() {
         context.reset(SSL_CTX_new(TLS_client_method()));
-        if (!context || SSL_CTX_set_min_proto_version(context.get(), TLS1_2_VERSION) != 1)
-            return lastReason();
-        if (!setAuthorities(context.get(), authorities))
-            return "certificates of authorities: " + lastReason();
+        if (!context || SSL_CTX_set_min_proto_version(context.get(), TLS1_2_VERSION) != 1) return false;
         SSL_CTX_set_verify(context.get(), SSL_VERIFY_PEER, nullptr);
         // An authority that the configuration names need not be the last of its chain.
         X509_VERIFY_PARAM_set_flags(SSL_CTX_get0_param(context.get()), X509_V_FLAG_PARTIAL_CHAIN);
         // Many servers end a connection without a word; a body that breaks off is seen by its own length.
-        SSL_CTX_set_options(context.get(), SSL_OP_IGNORE_UNEXPECTED_EOF);
+        SSL_CTX_set_options(context.get(), SSL_OP_IGNORE_UNEXPECTED_EOF | SSL_OP_NO_RENEGOTIATION);
+        // A step ends with each record: one with no data in it, of which a server may send any number, must not keep
+        // the library from coming back to whoever watches the deadline.
+        SSL_CTX_clear_mode(context.get(), SSL_MODE_AUTO_RETRY);
+        return true;
+    }
+
+    bool makeConnection(int descriptor, const std::string& host) {
         connection.reset(SSL_new(context.get()));
         if (!connection || !setHost(connection.get(), host) || SSL_set_fd(connection.get(), descriptor) != 1)
-            return lastReason();
+            return false;
         SSL_set_connect_state(connection.get());
-        return {};
+        return true;
     }
 };
 
@@ -99,19 +121,38 @@ WebStream::WebStream(Descriptor connection) : connection_(std::move(connection))
 WebStream::~WebStream() = default;
 
 StreamStep WebStream::secure(const std::string& host, const std::string& authorities) {
+    const std::string& place = authorities.empty() ? kSystemsAuthorities : authorities;
+    if (!secure_ && !begin(host, place)) return StreamStep::failed;
     ERR_clear_error();
-    if (!secure_) {
-        secure_ = std::make_unique<Secure>();
-        why_ = secure_->prepare(connection_.number(), host, authorities);
-        if (!why_.empty()) return StreamStep::failed;
-    }
     const StreamStep step = outcomeOf(SSL_do_handshake(secure_->connection.get()));
     const long verified = SSL_get_verify_result(secure_->connection.get());
-    if (step == StreamStep::failed && verified != X509_V_OK) {
-        fault_ = faultOfCode(verified);
-        why_ = std::string("the certificate does not hold: ") + X509_verify_cert_error_string(verified);
-    }
+    if (step == StreamStep::failed && verified != X509_V_OK) judge(verified, place);
     return step;
+}
+
+/// Makes ready for the first step.
+bool WebStream::begin(const std::string& host, const std::string& authorities) {
+    ERR_clear_error();
+    secure_ = std::make_unique<Secure>();
+    const bool isReady = secure_->makeContext();
+    lacksAuthorities_ = isReady && !setAuthorities(secure_->context.get(), authorities);
+    if (isReady && !lacksAuthorities_ && secure_->makeConnection(connection_.number(), host)) return true;
+    why_ =
+        (lacksAuthorities_ ? "no certificates of authorities in " + authorities + ": " : "") + lastReason();
+    return false;
+}
+
+/// What a certificate that was not accepted means.
+void WebStream::judge(long verified, const std::string& authorities) {
+    const CertificateFault fault = faultOfCode(verified);
+    const bool isStranger = fault == CertificateFault::selfSigned || fault == CertificateFault::unknownIssuer;
+    lacksAuthorities_ = isStranger && !holdsAuthorities(authorities);
+    if (lacksAuthorities_) {
+        why_ = "no certificates of authorities in " + authorities;
+        return;
+    }
+    fault_ = fault;
+    why_ = std::string("the certificate does not hold: ") + X509_verify_cert_error_string(verified);
 }
 
 StreamStep WebStream::write(std::string_view& bytes) {
@@ -123,7 +164,7 @@ StreamStep WebStream::write(std::string_view& bytes) {
         return outcomeOf(result);
     }
     const ssize_t written = ::send(connection_.number(), bytes.data(), bytes.size(), MSG_NOSIGNAL);
-    if (written < 0) return errno == EAGAIN ? StreamStep::needsWrite : outcomeOfSystem();
+    if (written < 0) return errno == EAGAIN || errno == EINTR ? StreamStep::needsWrite : outcomeOfSystem();
     bytes.remove_prefix(static_cast<std::size_t>(written));
     return StreamStep::done;
 }

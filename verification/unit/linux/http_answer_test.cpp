@@ -34,9 +34,14 @@ const Case kCases[] = {
     {"no reason", "HTTP/1.0 302\r\n\r\n", 302, ""},
     {"counted", "HTTP/1.1 200 OK\r\nContent-Length: 3\r\n\r\nabcdef", 200, "abc"},
     {"counted twice alike", "HTTP/1.1 200 OK\r\nContent-Length: 3, 3\r\n\r\nabcd", 200, "abc"},
-    {"counted twice differently", "HTTP/1.1 200 OK\r\nContent-Length: 3, 4\r\n\r\nabcd", 200, ""},
-    {"counted below zero", "HTTP/1.1 200 OK\r\nContent-Length: -1\r\n\r\nabcd", 200, ""},
-    {"counted beyond all", "HTTP/1.1 200 OK\r\nContent-Length: 99999999999999999999\r\n\r\nabcd", 200, ""},
+    {"counted twice differently", "HTTP/1.1 200 OK\r\nContent-Length: 3, 4\r\n\r\nabcd", 200, "abcd"},
+    {"counted in two lines", "HTTP/1.1 200 OK\r\nContent-Length: 3\r\nContent-Length: 4\r\n\r\nabcd", 200,
+     "abcd"},
+    {"counted below zero", "HTTP/1.1 200 OK\r\nContent-Length: -1\r\n\r\nabcd", 200, "abcd"},
+    {"counted with a sign", "HTTP/1.1 200 OK\r\nContent-Length: +1\r\n\r\nabcd", 200, "abcd"},
+    {"counted with more behind it", "HTTP/1.1 200 OK\r\nContent-Length: 1x\r\n\r\nabcd", 200, "abcd"},
+    {"counted beyond all", "HTTP/1.1 200 OK\r\nContent-Length: 99999999999999999999\r\n\r\nabcd", 200,
+     "abcd"},
     {"cut short", "HTTP/1.1 200 OK\r\nContent-Length: 9\r\n\r\nabc", 200, "abc"},
     {"until the end", "HTTP/1.1 200 OK\r\n\r\nabc", 200, "abc"},
     {"line feeds alone", "HTTP/1.1 200 OK\nContent-Length: 1\n\nabc", 200, "a"},
@@ -49,6 +54,11 @@ const Case kCases[] = {
     {"chunks go before a length",
      "HTTP/1.1 200 OK\r\ncontent-length: 1\r\ntransfer-encoding: gzip, Chunked\r\n\r\n2\r\nab\r\n0\r\n\r\n",
      200, "ab"},
+    {"codings in two lines",
+     "HTTP/1.1 200 OK\r\nTransfer-Encoding: gzip\r\nTransfer-Encoding: chunked\r\n\r\n2\r\nab\r\n0\r\n\r\n",
+     200, "ab"},
+    {"a chunk below zero", "HTTP/1.1 200 OK\r\nTransfer-Encoding: chunked\r\n\r\n-1\r\na\r\n", 200, ""},
+    {"a page in place of chunks", "HTTP/1.1 200 OK\r\nTransfer-Encoding: chunked\r\n\r\n<html>", 200, ""},
     {"another coding lasts to the end", "HTTP/1.1 200 OK\r\nTransfer-Encoding: gzip\r\n\r\nabc", 200, "abc"},
     {"a chunk of no size", "HTTP/1.1 200 OK\r\nTransfer-Encoding: chunked\r\n\r\nxyz\r\n", 200, ""},
     {"a chunk of every size", "HTTP/1.1 200 OK\r\nTransfer-Encoding: chunked\r\n\r\nFFFFFFFFFFFFFFFFF\r\na",
@@ -85,6 +95,27 @@ TEST(HttpAnswer, EndsWithItsLastByteAndNotWithTheConnection) {
     }
 }
 
+TEST(HttpAnswer, TellsAnEmptyPageFromOneThatDidNotCome) {
+    const struct {
+        const char* headers;
+        bool isWhole;
+        std::uint64_t size;
+    } cases[] = {{"Content-Length: 0\r\n\r\n", true, 0},
+                 {"\r\n", true, 0},
+                 {"\r\nabc", true, 3},
+                 {"Transfer-Encoding: chunked\r\n\r\n0\r\n", true, 0},
+                 {"Transfer-Encoding: chunked\r\n\r\n", false, 0},
+                 {"Transfer-Encoding: chunked\r\n\r\n<html>\r\n", false, 0},
+                 {"Content-Length: 500\r\n\r\n", false, 500},
+                 {"Content-Length: 5000\r\n\r\nabc", false, 5000},
+                 {"Content-Length: x\r\n\r\nabc", true, 3}};
+    for (const auto& each : cases) {
+        const HttpAnswer answer = answerTo(std::string("HTTP/1.1 200 OK\r\n") + each.headers, 9);
+        EXPECT_EQ(answer.isWhole(), each.isWhole) << each.headers;
+        EXPECT_EQ(answer.bodySize(), each.size) << each.headers;
+    }
+}
+
 TEST(HttpAnswer, FindsAHeaderWhateverItsCaseTheFirstOfSeveral) {
     const HttpAnswer answer = answerTo(
         "HTTP/1.1 302 Found\r\nLOCATION :\t http://a/b \r\nLocation: /c\r\nX-Long: one\r\n\t "
@@ -118,8 +149,10 @@ TEST(HttpAnswer, ReadsADateInEachOfItsForms) {
     EXPECT_EQ(httpDate("Sun, 06 Nov 1994 08:49:37 GMT"), kMoment);
     EXPECT_EQ(httpDate("Sunday, 06-Nov-94 08:49:37 GMT"), kMoment);
     EXPECT_EQ(httpDate("Sun Nov  6 08:49:37 1994"), kMoment);
-    for (const char* text :
-         {"", "yesterday", "Sun, 06 Nov 1994 08:49:37", "Sun, 06 Nov 1994 08:49:37 GMT and more"})
+    for (const std::string& text :
+         {std::string(), std::string("yesterday"), std::string("Sun, 06 Nov 1994 08:49:37"),
+          std::string("Sun, 06 Nov 1994 08:49:37 GMT and more"),
+          std::string("Sun, 06 Nov 1994 08:49:37 GMT\0more", 34)})
         EXPECT_EQ(httpDate(text), std::nullopt) << text;
 }
 

@@ -3,6 +3,9 @@
 #include <gtest/gtest.h>
 #include <stdlib.h>
 
+#include <filesystem>
+#include <fstream>
+
 #include "verification/unit/linux/fakes/web_server.h"
 #include "verification/unit/linux/stop.h"
 
@@ -56,6 +59,51 @@ TEST_F(WebClient, FollowsNoRedirectAndTellsWhereItWouldLead) {
     EXPECT_EQ(ask(plain("/nowhere")).location, "");
 }
 
+TEST_F(WebClient, TellsNoRedirectThatLeadsElsewhereThanToTheWeb) {
+    for (const char* target : {"file:///etc/passwd", "javascript:alert(1)", "ftp://h/", "http://bank@thief/",
+                               "http://h:0/", "//", "http:h"}) {
+        const WebAnswer answer = ask(plain("/redirect-to/" + std::string(target)));
+        EXPECT_EQ(answer.status, 302) << target;
+        EXPECT_EQ(answer.location, "") << target;
+    }
+    EXPECT_EQ(ask(plain("/redirect-to///[fe80::1%25wlan0]:8/x")).location, "http://[fe80::1%wlan0]:8/x");
+}
+
+TEST_F(WebClient, AnAnswerOfWhichNoBodyIsWantedEndsWithItsHead) {
+    const WebAnswer answer = ask(plain("/redirect-and-hang"));
+    EXPECT_EQ(answer.status, 302);
+    EXPECT_EQ(answer.location, server_->plain("/login"));
+}
+
+TEST_F(WebClient, AtTheDeadlineAPageCountsAsFarAsItCame) {
+    WebAnswer answer;
+    for (auto time = 50ms; answer.end == End::failed && time < 20s; time *= 2)
+        answer = runWebRequests({plain("/page-and-hang")}, patience(time))->front();
+    EXPECT_EQ(answer.status, 200);
+    EXPECT_EQ(answer.body, "<html>");
+    EXPECT_EQ(answer.bodySize, 500U);
+}
+
+TEST_F(WebClient, APageThatNeverCameIsNotAnEmptyOne) {
+    const WebAnswer announced = ask(plain("/page-that-never-comes")),
+                    unknown = ask(plain("/chunks-that-never-come")), empty = ask(plain("/empty"));
+    EXPECT_EQ(announced.end, End::answered);
+    EXPECT_EQ(announced.bodySize, 500U);
+    EXPECT_EQ(unknown.end, End::failed);
+    EXPECT_EQ(unknown.why, "the connection was closed before an answer");
+    EXPECT_EQ(empty.end, End::answered);
+    EXPECT_EQ(empty.bodySize, 0U);
+}
+
+TEST_F(WebClient, AServerThatNeverPausesIsNotHeardBeyondTheDeadline) {
+    for (WebRequest request : {plain("/endless"), secure("/endless")}) {
+        request.longestBody = 1U << 30;
+        const auto answers = runWebRequests({request}, patience(100ms));
+        ASSERT_TRUE(answers);
+        EXPECT_LT(answers->front().body.size(), request.longestBody);
+    }
+}
+
 TEST_F(WebClient, ABodyIsCutAtItsBound) {
     WebRequest request = plain("/big");
     request.longestBody = 1000;
@@ -101,6 +149,15 @@ TEST_F(WebClient, AnAnswerThatBreaksOffOrNeverComesHasFailed) {
     EXPECT_EQ(late->front().why, "no answer in time");
 }
 
+TEST_F(WebClient, WhatWasReachedByTheDeadlineIsTold) {
+    WebAnswer answer;
+    for (auto time = 50ms; !answer.server && time < 20s; time *= 2)
+        answer = runWebRequests({plain("/hang")}, patience(time))->front();
+    EXPECT_EQ(answer.end, End::failed);
+    EXPECT_EQ(answer.server, IPAddress::fromText("127.0.0.1"));
+    EXPECT_TRUE(answer.steps.connect);
+}
+
 TEST_F(WebClient, AServerThatSpeaksAnotherProtocolHasFailed) {
     EXPECT_EQ(ask(plain("/other-protocol")).end, End::failed);
     EXPECT_EQ(ask(plain("/other-protocol")).why, "the answer is none of HTTP/1");
@@ -137,6 +194,27 @@ TEST_F(WebClient, TellsWhatIsWrongWithACertificate) {
     WebRequest stranger = secure("/204");
     stranger.authorities.clear();
     EXPECT_EQ(ask(stranger).fault, CertificateFault::selfSigned);
+}
+
+TEST_F(WebClient, WithoutAuthoritiesNoCertificateIsJudged) {
+    std::string folder = ::testing::TempDir() + "/wpXXXXXX";
+    ASSERT_NE(mkdtemp(folder.data()), nullptr);
+    WebRequest request = secure("/204");
+    for (const std::string& place : {folder, folder + "/none.pem"}) {
+        request.authorities = place;
+        const WebAnswer answer = ask(request);
+        EXPECT_EQ(answer.end, End::noAuthorities) << place;
+        EXPECT_EQ(answer.why, "no certificates of authorities in " + place);
+    }
+    std::ofstream(folder + "/broken.pem") << "no certificate";
+    request.authorities = folder + "/broken.pem";
+    EXPECT_EQ(ask(request).end, End::noAuthorities);
+    EXPECT_TRUE(ask(request).why.starts_with("no certificates of authorities in " + request.authorities));
+    std::filesystem::copy(server_->certificate(), folder + "/good.pem");
+    EXPECT_EQ(std::system(("openssl rehash " + folder + " 2>/dev/null").c_str()), 0);
+    request.authorities = folder;
+    EXPECT_EQ(ask(request).status, 204);
+    std::filesystem::remove_all(folder);
 }
 
 TEST_F(WebClient, TellsACertificateOfAnotherTimeFromOneThatNobodyVouchesFor) {

@@ -13,10 +13,29 @@ TEST(WebPlace, TakesAUrlApart) {
 }
 
 TEST(WebPlace, TakesNoOtherForm) {
-    for (const char* url :
-         {"http://", "http://:80/", "http://a:b/", "http://a:123456/", "http://a:0/", "http://a:/",
-          "http://u@a/", "ftp://a/", "file:///etc/hostname", "http:/a", "http://a b/", "http://[fe80::1/",
-          "http://[::1]x/", "http://a\r\nb/", "http://a\\b/", "http://\xC3\xA9/", "no url", ""})
+    for (const char* url : {"http://",
+                            "http://:80/",
+                            "http://a:b/",
+                            "http://a:123456/",
+                            "http://a:0/",
+                            "http://a:/",
+                            "http://u@a/",
+                            "ftp://a/",
+                            "file:///etc/hostname",
+                            "http:/a",
+                            "http://a b/",
+                            "http://[fe80::1/",
+                            "http://[::1]x/",
+                            "http://[]/",
+                            "http://[host]/",
+                            "http://[192.0.2.1]/",
+                            "http://[::1]:/",
+                            "http://::1/",
+                            "http://a\r\nb/",
+                            "http://a\\b/",
+                            "http://\xC3\xA9/",
+                            "no url",
+                            ""})
         EXPECT_FALSE(webPlace(url)) << url;
     EXPECT_TRUE(webPlace("http://a/" + std::string(kLongestUrl - 9, 'x')));
     EXPECT_FALSE(webPlace("http://a/" + std::string(kLongestUrl - 8, 'x')));
@@ -29,6 +48,7 @@ TEST(WebPlace, NamesItsHostAsARequestDoes) {
     EXPECT_EQ(authority("https://h:80/"), "h:80");
     EXPECT_EQ(authority("https://[::1]:8443/"), "[::1]:8443");
     EXPECT_EQ(hostOf("https://[::1]:8443/x"), "::1");
+    EXPECT_EQ(authority("http://[fe80::1%25eth0]/"), "[fe80::1]");
     EXPECT_EQ(hostOf("file://host/x"), "");
 }
 

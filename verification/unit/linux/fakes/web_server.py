@@ -9,6 +9,7 @@ import ssl
 import sys
 import threading
 import time
+import urllib.parse
 
 API = b'{"captive": true, "user-portal-url": "https://portal.example/"}'
 DESCRIPTION = b"""<?xml version="1.0"?><root><device><manufacturer>Example Networks</manufacturer>
@@ -60,6 +61,24 @@ class Handler(http.server.BaseHTTPRequestHandler):
             self.answer(302, Location="/login")
         elif path == "/nowhere":
             self.answer(302)
+        elif path.startswith("/redirect-to/"):
+            self.answer(302, Location=urllib.parse.unquote(path.removeprefix("/redirect-to/")))
+        elif path == "/redirect-and-hang":
+            self.wfile.write(b"HTTP/1.1 302 Found\r\nLocation: /login\r\nContent-Length: 500\r\n\r\n")
+            forever.wait()
+        elif path == "/page-and-hang":
+            self.wfile.write(b"HTTP/1.1 200 OK\r\nContent-Length: 500\r\n\r\n<html>")
+            forever.wait()
+        elif path == "/page-that-never-comes":
+            self.wfile.write(b"HTTP/1.1 200 OK\r\nContent-Length: 500\r\n\r\n")
+            self.close_connection = True
+        elif path == "/chunks-that-never-come":
+            self.wfile.write(b"HTTP/1.1 200 OK\r\nTransfer-Encoding: chunked\r\n\r\n")
+            self.close_connection = True
+        elif path == "/endless":
+            self.wfile.write(b"HTTP/1.1 200 OK\r\nTransfer-Encoding: chunked\r\n\r\n")
+            while True:
+                self.wfile.write((b"1;" + b"x" * 240 + b"\r\na\r\n") * 100)
         elif path == "/511":
             self.answer(511, b"log in")
         elif path == "/big":
