@@ -5,7 +5,7 @@
 
 #include "exchange/wire.h"
 #include "host/exit.h"
-#include "host/extension_module.h"
+#include "host/modules/module_entry.h"
 
 namespace wp::host {
 namespace {

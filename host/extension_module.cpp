@@ -3,6 +3,7 @@
 #include <dlfcn.h>
 
 #include "host/exit.h"
+#include "host/modules/module_entry.h"
 
 namespace wp::host {
 namespace {
@@ -13,11 +14,6 @@ std::string loaderReason() {
 }
 
 }  // namespace
-
-std::filesystem::path programFolder() {
-    std::error_code error;
-    return std::filesystem::read_symlink("/proc/self/exe", error).parent_path();
-}
 
 ExtensionModule::ExtensionModule(const std::optional<std::string>& path)
     : path_(path ? std::filesystem::path(*path) : programFolder() / kExtensionFileName) {

@@ -11,9 +11,6 @@ namespace wp::host {
 /// The file name of the diagnostic's module; it stands beside the program.
 inline constexpr const char* kExtensionFileName = "wifi-profile-extension.so";
 
-/// Where the program's own file stands. *Any*.
-std::filesystem::path programFolder();
-
 /// A diagnostic's module, loaded for the rest of the process: blocks and static objects of its code may
 /// outlive every handle, so it is never unloaded.
 class ExtensionModule {

@@ -7,7 +7,7 @@
 #include <cstring>
 
 #include "host/exit.h"
-#include "host/extension_module.h"
+#include "host/modules/module_entry.h"
 
 namespace wp::host {
 namespace {

@@ -1,9 +1,12 @@
 #include "host/front_ends.h"
 
+#include <atomic>
+
 #include "host/exit.h"
+#include "host/modules/module_entry.h"
 #include "host/tv_screen.h"
 #include "screens/headless/headless_screen.h"
-#include "screens/terminal/terminal_screen.h"
+#include "screens/terminal/terminal_module.h"
 
 namespace wp::host {
 namespace {
@@ -21,14 +24,24 @@ class NoScreen final : public ui::FrontEnd {
     MainQueue& queue_;
 };
 
+/// Null as long as no terminal screen was wanted.
+std::atomic<const terminal::Module*> terminalModule = nullptr;
+
+const terminal::Module& loadedTerminalModule() {
+    const auto entry = moduleEntry(terminal::kModuleFileName, terminal::kEntryName);
+    if (const std::string* why = std::get_if<std::string>(&entry)) refuse("--screen: terminal: " + *why);
+    terminalModule = reinterpret_cast<terminal::Entry*>(std::get<void*>(entry))();
+    return *terminalModule;
+}
+
 std::unique_ptr<ui::FrontEnd> makeTerminal(ui::Screen& screen, MainQueue& queue,
                                            const Localization& localization) {
     terminal::Texts texts{
         localization.localizedString("KEY_MOVE"), localization.localizedString("KEY_SELECT"),
         localization.localizedString("KEY_BACK"), localization.localizedString("WINDOW_TOO_SMALL")};
-    terminal::TerminalScreen::Opened opened = terminal::TerminalScreen::open(screen, queue, std::move(texts));
+    auto opened = loadedTerminalModule().open(screen, queue, std::move(texts));
     if (const std::string* why = std::get_if<std::string>(&opened)) refuse("--screen: terminal: " + *why);
-    return std::get<std::unique_ptr<terminal::TerminalScreen>>(std::move(opened));
+    return std::get<std::unique_ptr<ui::FrontEnd>>(std::move(opened));
 }
 
 std::unique_ptr<ui::FrontEnd> makeTelevision(ui::Screen& screen, MainQueue& queue,
@@ -55,7 +68,7 @@ std::unique_ptr<ui::FrontEnd> makeFrontEnd(ScreenChoice choice, ui::Screen& scre
 }
 
 void restoreTerminal() {
-    terminal::TerminalScreen::restoreNow();
+    if (const terminal::Module* module = terminalModule) module->restoreNow();
 }
 
 }  // namespace wp::host

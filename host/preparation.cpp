@@ -11,6 +11,7 @@
 #include "host/screen_choice.h"
 #include "host/string_table.h"
 #include "host/tv_screen.h"
+#include "host/unicode/unicode.h"
 
 namespace wp::host {
 namespace {
@@ -128,6 +129,8 @@ Preparation prepare(const RunOptions& options) {
         prepared.configuration = readConfiguration(options.configFile);
     }
     prepared.screen = screenOf(options, *prepared.parameters);
+    // Before anything is measured, so that nothing measured is lost.
+    if (asksForList(*prepared.parameters) || options.format == OutputFormat::text) needUnicode();
     prepared.script = scriptOf(options, prepared.screen);
     refuseOneFileForTwo(options);
     prepared.output = outputFile("--output", options.outputFile);

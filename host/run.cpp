@@ -15,7 +15,6 @@
 #include "host/exit.h"
 #include "host/extension_module.h"
 #include "host/front_ends.h"
-#include "host/icu_localization.h"
 #include "host/interruption.h"
 #include "host/output_file.h"
 #include "host/preparation.h"
@@ -26,6 +25,7 @@
 #include "host/result_document.h"
 #include "host/running_page.h"
 #include "host/services.h"
+#include "host/table_localization.h"
 #include "host/transcript.h"
 #include "platform/activity.h"
 #include "platform/background_queue.h"
@@ -148,7 +148,7 @@ class Run {
     std::unique_ptr<Services> services_;
     Journal journal_;
     AutomationFile automation_;
-    IcuLocalization localization_;
+    TableLocalization localization_;
     Texts texts_;
     ui::Screen screen_;
     Platform platform_;

@@ -6,7 +6,7 @@
 #include <atomic>
 
 #include "host/exit.h"
-#include "host/extension_module.h"
+#include "host/modules/module_entry.h"
 
 namespace wp::host {
 namespace {

@@ -3,7 +3,7 @@
 #include <cstdio>
 
 #include "host/report/report.h"
-#include "host/report/wrapping.h"
+#include "host/unicode/unicode.h"
 
 namespace wp::host {
 namespace {

@@ -4,7 +4,7 @@
 #include <span>
 
 #include "host/report/heard_networks.h"
-#include "host/report/wrapping.h"
+#include "host/unicode/unicode.h"
 #include "platform/ui/display_text.h"
 
 namespace wp::host {

@@ -1,7 +1,7 @@
 #include "host/report/text_form.h"
 
 #include "host/report/channel_chart.h"
-#include "host/report/wrapping.h"
+#include "host/unicode/unicode.h"
 
 namespace wp::host {
 namespace {

@@ -9,7 +9,7 @@
 #include <string>
 #include <vector>
 
-#include "host/icu_localization.h"
+#include "host/table_localization.h"
 #include "network_list/scan_list.h"
 #include "screens/headless/headless_screen.h"
 #include "verification/unit/network_list/list_run.h"
@@ -33,7 +33,7 @@ ArrayPointer scanOf(int names, int scan) {
 }
 
 const Localization& localization() {
-    static const host::IcuLocalization icu({"en", "en"});
+    static const host::TableLocalization icu({"en", "en"});
     return icu;
 }
 

@@ -24,7 +24,9 @@ MAY_INCLUDE = {
     "screens/terminal": ["platform", "screens/remote"],
     "screens/tv": ["platform", "screens/remote"],
     "host": ["platform", "exchange", "screens"],
-    "host/report": ["platform", "exchange", "host/string_table.h", "service/thresholds.h"],
+    "host/modules": [],
+    "host/unicode": ["host/modules"],
+    "host/report": ["platform", "exchange", "host/string_table.h", "host/unicode/unicode.h", "service/thresholds.h"],
 }
 STANDARD_LIBRARY_ONLY = {"platform", "lifecycle", "tests", "network_list", "service"}
 INCLUDE = re.compile(r'^\s*#\s*include\s+(?:"([^"]+)"|<([^>]+)>)')

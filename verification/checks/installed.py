@@ -15,7 +15,9 @@ WANTED = {
     "lib/wifi-profile/libwifi-profile-platform.so",
     "lib/wifi-profile/wifi-profile",
     "lib/wifi-profile/wifi-profile-extension.so",
+    "lib/wifi-profile/wifi-profile-screen-terminal.so",
     "lib/wifi-profile/wifi-profile-service",
+    "lib/wifi-profile/wifi-profile-unicode.so",
     "share/man/man1/wifi-profile.1",
     "share/wifi-profile/recordings/home.json",
     "share/wifi-profile/recordings/selected.json",
@@ -49,9 +51,9 @@ def main():
         root, found = install(build, cmake, folder)
         faults += [f"missing: {name}" for name in sorted(WANTED - found)]
         faults += [f"not expected: {name}" for name in sorted(found - WANTED)]
-        for arguments in (["run", "--demo", "troubled"], ["run", "--show-endpoints"]):
+        for arguments in (["run", "--demo", "troubled"], ["run", "--show-endpoints"], ["tests"]):
             here, there = output_of(f"{build}/wifi-profile", *arguments), output_of(root / "bin/wifi-profile", *arguments)
-            if here != there or not here.startswith("{"):
+            if here != there or here.startswith("status"):
                 faults.append(f"{' '.join(arguments)}: gives where it is installed\n{there}\nand where it is built\n{here}")
     for fault in faults:
         print(fault)

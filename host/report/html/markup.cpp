@@ -1,6 +1,6 @@
 #include "host/report/html/markup.h"
 
-#include "host/report/wrapping.h"
+#include "host/unicode/unicode.h"
 #include "platform/ui/display_text.h"
 
 namespace wp::host {

@@ -3,9 +3,9 @@
 #include <cstdlib>
 #include <set>
 
-#include "host/icu_localization.h"
 #include "host/locale.h"
 #include "host/string_table.h"
+#include "host/table_localization.h"
 #include "platform/ui/text_measurer.h"
 
 namespace wp::host {
@@ -50,8 +50,8 @@ std::size_t occurrences(const std::string& text, const std::string& part) {
     return count;
 }
 
-IcuLocalization localization(const std::string& table, const std::string& collation) {
-    return IcuLocalization(LocaleChoice{table, collation});
+TableLocalization localization(const std::string& table, const std::string& collation) {
+    return TableLocalization(LocaleChoice{table, collation});
 }
 
 /// Sets variables of the environment and puts the earlier ones back.
@@ -130,7 +130,7 @@ TEST(Localization, AMissingKeyIsTheEmptyText) {
 }
 
 TEST(Localization, CaseIsIgnoredAndAccentsAreKept) {
-    IcuLocalization root = localization("x-keys", "");
+    TableLocalization root = localization("x-keys", "");
 
     EXPECT_EQ(root.collationKey("HOME"), root.collationKey("home"));
     EXPECT_NE(root.collationKey("cafe"), root.collationKey("café"));
@@ -141,7 +141,7 @@ TEST(Localization, CaseIsIgnoredAndAccentsAreKept) {
 
 TEST(Localization, BlanksAndPunctuationCountAlsoWhereTheLocaleWouldIgnoreThem) {
     for (const char* locale : {"", "th", "de"}) {
-        IcuLocalization names = localization("en", locale);
+        TableLocalization names = localization("en", locale);
         EXPECT_NE(names.collationKey("a b"), names.collationKey("ab")) << locale;
         EXPECT_NE(names.collationKey("a-b"), names.collationKey("ab")) << locale;
         EXPECT_NE(names.collationKey(" "), names.collationKey("")) << locale;
@@ -149,15 +149,15 @@ TEST(Localization, BlanksAndPunctuationCountAlsoWhereTheLocaleWouldIgnoreThem) {
 }
 
 TEST(Localization, NamesSortByTheRulesOfTheirLocale) {
-    IcuLocalization german = localization("de", "de_DE");
-    IcuLocalization swedish = localization("en", "sv_SE");
+    TableLocalization german = localization("de", "de_DE");
+    TableLocalization swedish = localization("en", "sv_SE");
 
     EXPECT_LT(german.collationKey("Öland"), german.collationKey("Zebra"));
     EXPECT_GT(swedish.collationKey("Öland"), swedish.collationKey("Zebra"));
 }
 
 TEST(Localization, ALongNameHasAKeyToo) {
-    IcuLocalization names = localization("ja", "ja");
+    TableLocalization names = localization("ja", "ja");
     std::string name;
     for (int i = 0; i < 1000; ++i) name += "漢字";
 

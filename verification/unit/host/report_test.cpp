@@ -11,7 +11,7 @@
 #include "host/report/html/html_form.h"
 #include "host/report/journal.h"
 #include "host/report/text_form.h"
-#include "host/report/wrapping.h"
+#include "host/unicode/unicode.h"
 #include "verification/unit/fakes/fake_diagnostics_client.h"
 
 namespace wp::host {

@@ -1,12 +1,12 @@
-#include "host/report/wrapping.h"
-
 #include <unicode/brkiter.h>
 #include <unicode/uchar.h>
 #include <unicode/unistr.h>
 
 #include <memory>
 
-namespace wp::host {
+#include "host/unicode/icu_functions.h"
+
+namespace wp::host::icu_functions {
 namespace {
 
 int columnsOf(UChar32 character) {
@@ -118,4 +118,4 @@ std::string withUnitsKept(std::string_view text) {
     return kept.toUTF8String(out);
 }
 
-}  // namespace wp::host
+}  // namespace wp::host::icu_functions
