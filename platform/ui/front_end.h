@@ -29,8 +29,8 @@ class FrontEnd {
     virtual bool isAnimating() const { return false; }
 
     /// Saves what is shown as a PNG file. Returns why it could not, nothing when it did.
-    virtual std::optional<std::string> savePicture(const std::string& file) {
-        return file + ": this screen has no pictures";
+    virtual std::optional<std::string> savePicture(const std::string& /*file*/) {
+        return "this screen has no pictures";
     }
 };
 

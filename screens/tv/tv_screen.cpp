@@ -1,6 +1,7 @@
 #include "screens/tv/tv_screen.h"
 
-#include <QImageWriter>
+#include <QBuffer>
+#include <QFile>
 #include <QQmlError>
 #include <QQuickItem>
 #include <QScreen>
@@ -100,9 +101,13 @@ class TvScreen::Loop : private ui::ScreenObserver {
 
     std::optional<std::string> savePicture(const std::string& file) {
         update();
-        QImageWriter writer(QString::fromStdString(file), "png");
-        if (writer.write(window_.grabWindow())) return std::nullopt;
-        return file + ": cannot be written: " + writer.errorString().toStdString();
+        QBuffer picture;
+        window_.grabWindow().save(&picture, "PNG");
+        QFile target(QString::fromStdString(file));
+        if (target.open(QIODevice::WriteOnly) && target.write(picture.data()) == picture.size() &&
+            target.flush())
+            return std::nullopt;
+        return "cannot be written: " + target.errorString().toStdString();
     }
 
   private:

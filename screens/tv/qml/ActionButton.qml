@@ -30,6 +30,9 @@ Item {
     Rectangle {
         id: focusLook
 
+        // Its text turns light with the ground, on its way too.
+        readonly property bool isDark: opacity > 0.5 && !button.isMuted
+
         anchors.fill: parent
         anchors.leftMargin: 12 * button.u * (1 - opacity)
         anchors.rightMargin: 12 * button.u * (1 - opacity)
@@ -58,7 +61,7 @@ Item {
         font.family: button.stage.fontFamily
         font.pointSize: button.u * 32
         font.hintingPreference: Font.PreferNoHinting
-        color: !button.look ? "black" : button.isMuted ? "#6a7281" : button.look.isFocused ? "#ffffff" : "#16191f"
+        color: !button.look ? "black" : button.isMuted ? "#6a7281" : focusLook.isDark ? "#ffffff" : "#16191f"
     }
 
     Accessible.role: Accessible.Button

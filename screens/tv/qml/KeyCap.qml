@@ -30,6 +30,9 @@ Item {
     Rectangle {
         id: focusLook
 
+        // Its label turns light with the ground, on its way too.
+        readonly property bool isDark: opacity > 0.5 && !cap.isMuted
+
         anchors.fill: parent
         anchors.margins: cap.u * (4 - 8 * opacity)
         radius: 12 * cap.u
@@ -55,7 +58,7 @@ Item {
         font.family: cap.stage.fontFamily
         font.pointSize: cap.u * cap.fontSize
         font.hintingPreference: Font.PreferNoHinting
-        color: cap.isMuted ? "#6a7281" : cap.look && (cap.look.isFocused || cap.look.isOn) ? "#ffffff" : "#16191f"
+        color: cap.isMuted ? "#6a7281" : focusLook.isDark || cap.look && cap.look.isOn ? "#ffffff" : "#16191f"
     }
 
     Accessible.role: Accessible.Button

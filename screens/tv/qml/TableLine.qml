@@ -30,7 +30,7 @@ Item {
     readonly property bool isPale: stage.table.opacity === 1 && (isMuted || !isEnabled)
     readonly property color ink: isPale && !(isFocused && isMuted) ? "#6a7281" : "#16191f"
     readonly property real wantedOpacity: isLeaving || !isThere ? 0 : 1
-    readonly property bool isMoving: opacity !== wantedOpacity || y !== u * lineTop || focusLook.opacity !== focusLook.wanted
+    readonly property bool isMoving: opacity !== wantedOpacity || y !== u * lineTop || focusLook.isMoving
 
     y: u * lineTop
     height: u * lineHeight
@@ -69,6 +69,10 @@ Item {
         id: focusLook
 
         readonly property real wanted: line.isFocused ? 1 : 0
+        readonly property color wantedColor: line.isMuted ? "#d5dce8" : "#16243a"
+        readonly property bool isMoving: opacity !== wanted || visible && !Qt.colorEqual(color, wantedColor)
+        // Its texts turn light with the ground, on its way too.
+        readonly property bool isDark: opacity > 0.5 && color.hslLightness < 0.5
 
         visible: opacity > 0
         anchors.fill: parent
@@ -77,7 +81,7 @@ Item {
         anchors.topMargin: line.u * (3 - 6 * opacity)
         anchors.bottomMargin: line.u * (3 - 6 * opacity)
         radius: 14 * line.u
-        color: line.isMuted ? "#d5dce8" : "#16243a"
+        color: wantedColor
         border.width: line.isMuted ? 4 * line.u : 0
         border.color: "#66758e"
         opacity: wanted
@@ -100,7 +104,7 @@ Item {
             stage: line.stage
             text: line.text
             detail: line.detail
-            isLight: line.isFocused && !line.isMuted
+            isLight: focusLook.isDark
         }
     }
     Text {
@@ -118,7 +122,7 @@ Item {
         font.pointSize: line.u * (line.isHeader ? 24 : 32)
         font.bold: line.isHeader
         font.hintingPreference: Font.PreferNoHinting
-        color: line.isHeader ? "#4f5866" : line.isFocused && !line.isMuted ? "#ffffff" : line.ink
+        color: line.isHeader ? "#4f5866" : focusLook.isDark ? "#ffffff" : line.ink
     }
 
     Accessible.role: isHeader ? Accessible.Heading : Accessible.ListItem

@@ -81,10 +81,16 @@ class Pictures : public testing::Test {
     /// Puts the focus on the row without a key.
     void focus(const std::string& text) { run.focus(text); }
 
+    /// What is shown, as it is written to the file of that name.
+    QImage picture(const std::string& name) {
+        std::filesystem::path file = kTaken / (name + ".png");
+        EXPECT_EQ(tv->savePicture(file.string()), std::nullopt);
+        return QImage(QString::fromStdString(file.string()));
+    }
+
     void expectPicture(const std::string& name) {
         std::filesystem::path file = kTaken / (name + ".png");
-        ASSERT_EQ(tv->savePicture(file.string()), std::nullopt);
-        QImage got(QString::fromStdString(file.string()));
+        QImage got = picture(name);
         std::filesystem::path good = kGood / (name + ".png");
         if (std::getenv("WP_TAKE_PICTURES"))
             std::filesystem::copy_file(file, good, std::filesystem::copy_options::overwrite_existing);
@@ -174,6 +180,25 @@ TEST_F(Pictures, FocusOnANetwork) {
     focus("Café am Eck");
 
     expectPicture("focus_network");
+}
+
+TEST_F(Pictures, TextAndGroundTurnTogetherWhenTheFocusMoves) {
+    setenv("WIFI_PROFILE_TV_MOTION", "full", 1);
+    open();
+    showList(neighbourhood(4));
+    auto rest = [&] { tv->runUntil([&] { return !tv->isAnimating(); }); };
+    pressKeys({Qt::Key_Down});
+    rest();
+    QImage before = picture("turning");
+
+    pressKeys({Qt::Key_Down});
+    QImage atOnce = picture("turning");
+
+    EXPECT_TRUE(tv->isAnimating());
+    EXPECT_EQ(compare(before, atOnce).what, "");
+    rest();
+    QImage good(QString::fromStdString((kGood / "focus_network.png").string()));
+    EXPECT_EQ(compare(good, picture("turning")).what, "");
 }
 
 TEST_F(Pictures, FocusOnOther) {
