@@ -19,6 +19,7 @@ namespace {
 using namespace std::chrono_literals;
 
 constexpr auto kTranslationTime = 1s;
+constexpr std::size_t kBeginningOfPage = 256;
 
 Error notConfigured(const std::string& what) {
     return failure(Reason::badConfiguration, "no endpoint is configured for " + what);
@@ -211,7 +212,9 @@ Known<PortalEvidence> gatherPortal(const Link& link, const LinkSetup& setup, con
     auto api = beside([&] { return askPortalApi(link, setup, endpoints, until); });
     const std::string &plainUrl = endpoints.portalPlain, &secureUrl = endpoints.portalSecure;
     auto secureRequest = beside([&] { return requestFor(secureUrl, link, setup, endpoints, until); });
-    const auto plain = requestFor(plainUrl, link, setup, endpoints, until);
+    auto plain = requestFor(plainUrl, link, setup, endpoints, until);
+    // Whether there is a page can be told from its beginning; one that never ends need not be waited for.
+    if (plain) plain->longestBody = kBeginningOfPage;
     const auto secure = secureRequest.get();
     Known<std::vector<WebAnswer>> answers;
     if (!plain || !secure)

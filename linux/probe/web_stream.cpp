@@ -126,7 +126,10 @@ StreamStep WebStream::secure(const std::string& host, const std::string& authori
     ERR_clear_error();
     const StreamStep step = outcomeOf(SSL_do_handshake(secure_->connection.get()));
     const long verified = SSL_get_verify_result(secure_->connection.get());
-    if (step == StreamStep::failed && verified != X509_V_OK) judge(verified, place);
+    if (step == StreamStep::failed && verified != X509_V_OK)
+        judge(verified, place);
+    else if (step == StreamStep::failed)
+        why_.insert(0, "no secure connection: ");
     return step;
 }
 

@@ -58,6 +58,13 @@ TEST(MappedAddress, ALostRequestIsSentAgain) {
     EXPECT_GE(asked, 2);
 }
 
+TEST(MappedAddress, IsNotBelievedFromAnybodyElse) {
+    const UdpServer stranger(stunAnswer, UdpServer::Sender::stranger);
+    const auto mapped = askMappedAddress(kHere, stranger.port(), "", patience(100ms));
+    ASSERT_FALSE(mapped);
+    EXPECT_TRUE(failedBecause(mapped.error(), Reason::timeout));
+}
+
 TEST(MappedAddress, SilenceEndsAtTheDeadline) {
     const UdpServer server(silence);
     const auto mapped = askMappedAddress(kHere, server.port(), "", patience(50ms));
@@ -105,6 +112,26 @@ TEST(ExternalAddress, IsToldByTheYoungerProtocolWhichIsGivenItsMappingBack) {
     while (mappings < 2) std::this_thread::yield();
     EXPECT_EQ(lifetimes.front(), 1U);
     EXPECT_EQ(lifetimes.back(), 0U);
+}
+
+TEST(ExternalAddress, IsNotBelievedFromAnybodyElse) {
+    const UdpServer stranger([](const Message&) { return Message{0, 128, 0, 0, 0, 0, 0, 9, 10, 1, 2, 3}; },
+                             UdpServer::Sender::stranger);
+    const auto external = askExternalAddress(kHere, stranger.port(), kHere, "lo", patience(100ms));
+    ASSERT_FALSE(external);
+    EXPECT_TRUE(failedBecause(external.error(), Reason::timeout));
+}
+
+TEST(ExternalAddress, AMappingThatWasNotAskedForIsNone) {
+    const UdpServer router([&](const Message& request) {
+        if (request[0] != 2) return Message{2, 128, 0, 1, 0, 0, 0, 0};
+        Message answer = request;
+        answer[1] = 0x81;
+        ++answer[24];  // the first byte of what ties it to its request
+        answer[59] = 1;
+        return answer;
+    });
+    EXPECT_FALSE(askExternalAddress(kHere, router.port(), kHere, "lo", patience(100ms)));
 }
 
 TEST(ExternalAddress, ARefusalIsNoAddress) {
@@ -217,6 +244,39 @@ TEST(NameLookup, GarbageIsNoAnswer) {
     ASSERT_TRUE(answer);
     EXPECT_TRUE(answer->addresses.empty());
     EXPECT_NE(answer->why, "");
+}
+
+TEST(NameLookup, AnAnswerToAnotherQuestionOrFromAnybodyElseIsNone) {
+    const Message four = {203, 0, 113, 7};
+    const UdpServer otherNumber([&](const Message& query) {
+        auto answer = dnsAnswer(query, four, {});
+        ++(*answer)[1];
+        return answer;
+    });
+    const UdpServer otherName([&](const Message& query) {
+        auto answer = dnsAnswer(query, four, {});
+        (*answer)[13] = 'x';
+        return answer;
+    });
+    const UdpServer stranger([&](const Message& query) { return dnsAnswer(query, four, {}); },
+                             UdpServer::Sender::stranger);
+    for (const UdpServer* each : {&otherNumber, &otherName, &stranger}) {
+        const auto answer = lookUpName("host.example", at(*each), patience(100ms));
+        ASSERT_TRUE(answer);
+        EXPECT_TRUE(answer->addresses.empty());
+    }
+}
+
+TEST(NameLookup, AnAnswerThatWasCutIsAskedForOnceMoreOverAConnection) {
+    const UdpServer server([](const Message& query) {
+        auto answer = dnsAnswer(query, {203, 0, 113, 7}, {});
+        (*answer)[2] |= 2;
+        return answer;
+    });
+    const auto answer = lookUpName("host.example", at(server), patience());
+    ASSERT_TRUE(answer);
+    EXPECT_TRUE(answer->addresses.empty()) << "nobody takes connections there";
+    EXPECT_EQ(answer->why, "Could not contact DNS servers");
 }
 
 TEST(NameLookup, EachServerIsToldApart) {

@@ -6,6 +6,7 @@
 #include <filesystem>
 #include <fstream>
 
+#include "verification/unit/linux/fakes/restless_server.h"
 #include "verification/unit/linux/fakes/web_server.h"
 #include "verification/unit/linux/stop.h"
 
@@ -102,6 +103,32 @@ TEST_F(WebClient, AServerThatNeverPausesIsNotHeardBeyondTheDeadline) {
         ASSERT_TRUE(answers);
         EXPECT_LT(answers->front().body.size(), request.longestBody);
     }
+}
+
+TEST_F(WebClient, ASecureServerThatOnlyChangesItsKeysIsNotHeardBeyondTheDeadline) {
+    const RestlessServer restless(server_->certificate(), server_->key());
+    WebRequest request = secure("/204");
+    request.url = "https://host.example:" + std::to_string(restless.port()) + "/";
+    const auto answers = runWebRequests({request}, patience(200ms));
+    ASSERT_TRUE(answers);
+    EXPECT_EQ(answers->front().end, End::failed);
+    EXPECT_TRUE(answers->front().why.ends_with(" in time")) << answers->front().why;
+}
+
+TEST_F(WebClient, NoExchangeLeavesADescriptorBehind) {
+    const auto open = [] {
+        const std::filesystem::directory_iterator all("/proc/self/fd");
+        return std::distance(begin(all), end(all));
+    };
+    ask(plain("/204"));
+    const auto before = open();
+    WebRequest refused = plain("/204");
+    refused.url = "http://127.0.0.1:1/";
+    for (int i = 0; i < 20; ++i)
+        for (const WebRequest& each :
+             {plain("/drop"), plain("/page"), secure("/drop"), refused, secure("/204", "other.example")})
+            ask(each);
+    EXPECT_EQ(open(), before);
 }
 
 TEST_F(WebClient, ABodyIsCutAtItsBound) {

@@ -20,8 +20,14 @@ class UdpServer {
     using Message = std::vector<std::uint8_t>;
     using Answer = std::function<std::optional<Message>(const Message& request)>;
 
-    explicit UdpServer(Answer answer)
-        : socket_(::socket(AF_INET, SOCK_DGRAM | SOCK_CLOEXEC, 0)), answer_(std::move(answer)) {
+    /// Whether its answers come from where it was asked, or from another port.
+    enum class Sender { itself, stranger };
+
+    explicit UdpServer(Answer answer, Sender sender = Sender::itself)
+        : socket_(::socket(AF_INET, SOCK_DGRAM | SOCK_CLOEXEC, 0)),
+          other_(::socket(AF_INET, SOCK_DGRAM | SOCK_CLOEXEC, 0)),
+          sender_(sender),
+          answer_(std::move(answer)) {
         sockaddr_in place{};
         place.sin_family = AF_INET;
         place.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
@@ -53,11 +59,13 @@ class UdpServer {
             if (count < 0) continue;
             request.resize(static_cast<std::size_t>(count));
             if (const auto message = answer_(request))
-                (void)::sendto(socket_.number(), message->data(), message->size(), 0, place, size);
+                (void)::sendto(sender_ == Sender::itself ? socket_.number() : other_.number(),
+                               message->data(), message->size(), 0, place, size);
         }
     }
 
-    Descriptor socket_;
+    Descriptor socket_, other_;
+    Sender sender_;
     Answer answer_;
     StopSignal stop_;
     std::uint16_t port_ = 0;

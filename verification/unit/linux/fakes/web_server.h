@@ -30,18 +30,18 @@ class WebServer {
             "openssl req -x509 -newkey ec -pkeyopt ec_paramgen_curve:P-256 -nodes -days 2 -subj "
             "/CN=host.example "
             "-addext subjectAltName=DNS:host.example,IP:127.0.0.1 -keyout " +
-            folder_ + "/key.pem -out " + certificate() + " 2>/dev/null";
+            key() + " -out " + certificate() + " 2>/dev/null";
         EXPECT_EQ(std::system(make.c_str()), 0);
         if (validity) renew(*validity);
-        server_ = std::make_unique<ChildProcess>(
-            std::vector<std::string>{"python3", WP_SOURCE_DIR "/verification/unit/linux/fakes/web_server.py",
-                                     certificate(), folder_ + "/key.pem"});
+        server_ = std::make_unique<ChildProcess>(std::vector<std::string>{
+            "python3", WP_SOURCE_DIR "/verification/unit/linux/fakes/web_server.py", certificate(), key()});
         std::istringstream(server_->firstLine()) >> plainPort_ >> securePort_;
     }
     WebServer(const WebServer&) = delete;
     ~WebServer() { std::filesystem::remove_all(folder_); }
 
     std::string certificate() const { return folder_ + "/certificate.pem"; }
+    std::string key() const { return folder_ + "/key.pem"; }
     const std::string& plainPort() const { return plainPort_; }
     std::string plain(const std::string& path, const std::string& host = "127.0.0.1") const {
         return "http://" + host + ":" + plainPort_ + path;
@@ -53,8 +53,7 @@ class WebServer {
   private:
     /// Signs the certificate once more, for another time.
     void renew(const Validity& validity) const {
-        const std::string key = folder_ + "/key.pem";
-        BIO* const keyFile = BIO_new_file(key.c_str(), "r");
+        BIO* const keyFile = BIO_new_file(key().c_str(), "r");
         BIO* file = BIO_new_file(certificate().c_str(), "r");
         EVP_PKEY* const signer = PEM_read_bio_PrivateKey(keyFile, nullptr, nullptr, nullptr);
         X509* const signed_ = PEM_read_bio_X509(file, nullptr, nullptr, nullptr);

@@ -89,6 +89,8 @@ class Handler(http.server.BaseHTTPRequestHandler):
             self.answer(200, API, **{"Content-Type": "application/captive+json"})
         elif path == "/description.xml":
             self.answer(200, DESCRIPTION)
+        elif path.startswith("/control-at/"):
+            self.answer(200, DESCRIPTION.replace(b"/control<", path.removeprefix("/control-at/").encode() + b"<"))
         elif path == "/drop":
             self.wfile.write(b"HTTP/1.1 2")
             self.close_connection = True
