@@ -56,6 +56,15 @@ std::string csvOf(const NameServerSet& whom) {
     return list;
 }
 
+/// Binds a socket of the library to the interface of that name, or refuses the socket: the library's own way goes over
+/// any interface where it cannot be bound.
+int bindToInterface(ares_socket_t socket, int, void* name) {
+    const std::string& interfaceName = *static_cast<const std::string*>(name);
+    const auto size = static_cast<socklen_t>(interfaceName.size());
+    return ::setsockopt(socket, SOL_SOCKET, SO_BINDTODEVICE, interfaceName.c_str(), size) == 0 ? 0 : -1;
+}
+
+/// \param whom outlives the channel
 /// \param moreFlags of the library, beyond that the name is taken as it is
 Known<Channel> openChannel(const NameServerSet& whom, int tries, int moreFlags = 0) {
     static const LibraryUser user;
@@ -73,7 +82,9 @@ Known<Channel> openChannel(const NameServerSet& whom, int tries, int moreFlags =
     if (status != ARES_SUCCESS)
         return failure(Reason::unavailable,
                        std::string("names cannot be asked for: ") + ares_strerror(status));
-    if (!whom.interfaceName.empty()) ares_set_local_dev(raw, whom.interfaceName.c_str());
+    if (!whom.interfaceName.empty())
+        ares_set_socket_configure_callback(raw, bindToInterface,
+                                           const_cast<std::string*>(&whom.interfaceName));
     return channel;
 }
 
@@ -152,6 +163,7 @@ std::vector<IPAddress> addressesBy(Read read, std::size_t addressSize, Bytes ans
 
 /// One server that is asked by itself.
 struct Asking {
+    NameServerSet whom;
     NameServerAnswer answer;
     Clock::time_point start = Clock::now();
     bool running = true;
@@ -231,10 +243,11 @@ Known<std::vector<NameServerAnswer>> askEachServer(const std::string& name, cons
     std::vector<std::unique_ptr<Asking>> all;
     for (const IPAddress& server : whom.servers) {
         if (all.size() == kMostServers) break;
-        // Each answer is wanted as it is; the library would pass over a refusal.
-        auto channel = openChannel({{server}, whom.interfaceName, whom.port}, 1, ARES_FLAG_NOCHECKRESP);
-        if (!channel) return channel.error();
         auto& asking = *all.emplace_back(std::make_unique<Asking>());
+        asking.whom = {{server}, whom.interfaceName, whom.port};
+        // Each answer is wanted as it is; the library would pass over a refusal.
+        auto channel = openChannel(asking.whom, 1, ARES_FLAG_NOCHECKRESP);
+        if (!channel) return channel.error();
         asking.answer.server = server;
         asking.channel = std::move(*channel);
         ares_query(asking.channel.get(), name.c_str(), kInternet, static_cast<int>(RecordType::a),

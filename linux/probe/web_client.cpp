@@ -83,7 +83,7 @@ class Exchange {
 
     /// What to wait for before it is worth advancing again.
     void addWaits(std::vector<pollfd>& waits, Clock::time_point& wake) const {
-        if (goesOn_) wake = Clock::time_point::min();
+        if (goesOn_) wake = {};
         if (step_ == Step::connecting)
             race_.addWaits(waits, wake);
         else if (stream_)

@@ -81,7 +81,8 @@ bool setHost(SSL* connection, const std::string& host) {
     if (const auto address = IPAddress::fromText(host))
         return X509_VERIFY_PARAM_set1_ip(SSL_get0_param(connection), address->bytes().data(),
                                          address->bytes().size()) == 1;
-    // The macro for the second call casts in C's way.
+    SSL_set_hostflags(connection, X509_CHECK_FLAG_NO_PARTIAL_WILDCARDS);  // RFC 9525, 6.3
+    // The macro for the last call casts in C's way.
     return SSL_set1_host(connection, host.c_str()) == 1 &&
            SSL_ctrl(connection, SSL_CTRL_SET_TLSEXT_HOSTNAME, TLSEXT_NAMETYPE_host_name,
                     const_cast<char*>(host.c_str())) == 1;

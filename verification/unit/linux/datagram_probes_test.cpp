@@ -279,6 +279,19 @@ TEST(NameLookup, AnAnswerThatWasCutIsAskedForOnceMoreOverAConnection) {
     EXPECT_EQ(answer->why, "Could not contact DNS servers");
 }
 
+TEST(NameLookup, GoesOverNoOtherInterfaceWhereItsOwnIsGone) {
+    const UdpServer server([](const Message& query) { return dnsAnswer(query, {203, 0, 113, 7}, {}); });
+    NameServerSet gone = at(server);
+    gone.interfaceName = "none0";
+    const auto answer = lookUpName("host.example", gone, patience());
+    const auto each = askEachServer("host.example", gone, patience());
+    ASSERT_TRUE(answer && each);
+    EXPECT_TRUE(answer->addresses.empty());
+    EXPECT_EQ(answer->why, "Could not contact DNS servers");
+    EXPECT_FALSE(each->front().answered);
+    EXPECT_EQ(each->front().code, "unreachable");
+}
+
 TEST(NameLookup, EachServerIsToldApart) {
     const UdpServer server([](const Message& query) { return dnsAnswer(query, {203, 0, 113, 7}, {}); });
     NameServerSet both = at(server);

@@ -213,6 +213,25 @@ TEST_F(GatherWeb, ACertificateThatNobodyKnowsIsTold) {
     EXPECT_EQ(contacts->retrieve->end, ServiceContact::End::badCertificate);
 }
 
+TEST_F(GatherWeb, ADeviceWithoutAuthoritiesSaysSoInPlaceOfAVerdict) {
+    Endpoints alone = endpoints();
+    alone.certificateAuthorities = "/no/such/folder";
+    const auto contacts = gatherVendorService(loopback(), {}, alone, patience());
+    ASSERT_TRUE(contacts);
+    const std::string reason = "no certificates of authorities in /no/such/folder (code 9)";
+    EXPECT_EQ(textOf(contacts->reach), reason);
+    EXPECT_EQ(textOf(contacts->retrieve), reason);
+    EXPECT_EQ(portal(alone).plain.status, 204);
+}
+
+TEST_F(GatherWeb, APageWithoutAnEndIsTakenAtItsBeginning) {
+    Endpoints endless = endpoints();
+    endless.portalPlain = server_->plain("/endless-page");
+    const PortalEvidence evidence = portal(endless);
+    EXPECT_EQ(evidence.plain.status, 200);
+    EXPECT_GT(evidence.plain.bodySize, 1U);
+}
+
 TEST(GatherReach, WhoeverWaitsForASilentServerReturnsAtOnceWhenStopped) {
     const SilentPlace portal, vendor;
     Endpoints endpoints;

@@ -210,6 +210,7 @@ TEST_F(WebClient, TriesTheNextAddressWhereOneFails) {
 TEST_F(WebClient, ASecureConnectionNeedsACertificateOfTheHost) {
     EXPECT_EQ(ask(secure("/204")).status, 204);
     EXPECT_EQ(ask(secure("/204", "other.example")).end, End::badCertificate);
+    EXPECT_EQ(ask(secure("/204", "wildcard.host.example")).end, End::badCertificate);
     WebRequest stranger = secure("/204");
     stranger.authorities.clear();
     EXPECT_EQ(ask(stranger).end, End::badCertificate);

@@ -15,7 +15,8 @@
 
 namespace wp {
 
-/// The web server of web_server.py on loopback, with a certificate of its own for "host.example" and 127.0.0.1.
+/// The web server of web_server.py on loopback, with a certificate of its own for "host.example", 127.0.0.1, and
+/// "wild*.host.example", which no name may be matched with.
 class WebServer {
   public:
     /// When the certificate begins and ends to hold, in s from now.
@@ -29,7 +30,7 @@ class WebServer {
         const std::string make =
             "openssl req -x509 -newkey ec -pkeyopt ec_paramgen_curve:P-256 -nodes -days 2 -subj "
             "/CN=host.example "
-            "-addext subjectAltName=DNS:host.example,IP:127.0.0.1 -keyout " +
+            "-addext subjectAltName=DNS:host.example,DNS:wild*.host.example,IP:127.0.0.1 -keyout " +
             key() + " -out " + certificate() + " 2>/dev/null";
         EXPECT_EQ(std::system(make.c_str()), 0);
         if (validity) renew(*validity);

@@ -75,6 +75,10 @@ class Handler(http.server.BaseHTTPRequestHandler):
         elif path == "/chunks-that-never-come":
             self.wfile.write(b"HTTP/1.1 200 OK\r\nTransfer-Encoding: chunked\r\n\r\n")
             self.close_connection = True
+        elif path == "/endless-page":
+            self.wfile.write(b"HTTP/1.1 200 OK\r\n\r\n")
+            while True:
+                self.wfile.write(b"<p>please wait</p>" * 100)
         elif path == "/endless":
             self.wfile.write(b"HTTP/1.1 200 OK\r\nTransfer-Encoding: chunked\r\n\r\n")
             while True:
