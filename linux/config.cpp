@@ -202,8 +202,8 @@ Config Config::defaults() {
     // The block of addresses that is set aside for examples in documents (RFC 7042).
     const VendorPrefix example = {0x00, 0x00, 0x5E};
     config.vendors.baseStation = {{"Example Networks"}, {}};
-    config.vendors.hotspot = {
-        {{example, std::uint8_t{0x53}}}, {{0x00, 0x00, 0x5E, 0x00, 0x53}}, {"EXAMPLE_METERED"}};
+    // No text of leases: with one set, a network without a lease cannot be told from a hotspot.
+    config.vendors.hotspot = {{{example, std::uint8_t{0x53}}}, {{0x00, 0x00, 0x5E, 0x00, 0x53}}, {}};
     return config;
 }
 

@@ -102,8 +102,10 @@ LinkSetup setupFromNetworkManager(Known<Bus>& bus, const Link& link, const Netwo
     setup.nameServers = managedNameServers(bus, link, managed, until);
     setup.portalApi = portalApiIn(managed.lease4);
     if (setup.portalApi.empty()) setup.portalApi = portalApiIn(managed.lease6);
-    setup.leaseText = plainText(optionOf(managed.lease4, "vendor_encapsulated_options") + " " +
-                                optionOf(managed.lease4, "vendor_class_identifier"));
+    setup.leaseText = failure(Reason::unavailable, "NetworkManager has no lease of IPv4");
+    if (!managed.lease4.empty())
+        setup.leaseText = plainText(optionOf(managed.lease4, "vendor_encapsulated_options") + " " +
+                                    optionOf(managed.lease4, "vendor_class_identifier"));
     return setup;
 }
 
@@ -122,7 +124,8 @@ LinkSetup setupFromNetworkd(Known<Bus>& bus, const Link& link, const NetworkdLin
     setup.servers = own.empty() ? names.effective : own;
     setup.nameServers = std::move(names);
     setup.portalApi = managed.portalApi;
-    setup.leaseText = managed.vendorText;
+    setup.leaseText = failure(Reason::unavailable, "systemd-networkd has no lease of IPv4");
+    if (managed.hasLease) setup.leaseText = managed.vendorText;
     return setup;
 }
 
@@ -170,6 +173,9 @@ Known<LinkSetup> setupFromKernel(Known<Bus>& bus, const Link& link, const Until&
     names.effective = effectiveServers(bus, link, {}, until);
     setup.servers = lease && !lease->servers.empty() ? lease->servers : names.effective;
     setup.nameServers = std::move(names);
+    setup.leaseText =
+        failure(Reason::unavailable, client ? "the DHCP client left no lease of IPv4 that can be read"
+                                            : "no lease of IPv4 was found");
     if (lease) {
         setup.portalApi = lease->portalApi;
         setup.leaseText = lease->vendorText;

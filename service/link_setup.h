@@ -19,7 +19,7 @@ struct LinkSetup {
     Known<WebProxyPlaces> proxies;
     std::vector<IPAddress> servers;  ///< whom to ask for names over this interface
     std::string portalApi;           ///< what the lease names; empty where it names none
-    std::string leaseText;           ///< the vendor's text in the lease
+    Known<std::string> leaseText;    ///< the vendor's text in the lease, empty where it has none
 };
 
 /// What the router says of itself on the local network.

@@ -85,33 +85,51 @@ WpsDescription decodeWps(Bytes elements) {
     return description;
 }
 
-Outcome isVendorBaseStation(const AccessPoint& accessPoint, const std::optional<RouterDescription>& router,
+Outcome isVendorBaseStation(const AccessPoint& accessPoint, const Known<RouterDescription>& router,
                             const Vendors::BaseStation& vendor) {
+    if (vendor.manufacturers.empty() && vendor.prefixes.empty())
+        return failure(Reason::badConfiguration, "no maker of base stations is configured");
     const WpsDescription wps = decodeWps(accessPoint.elements);
     const bool ours =
         isMaker(wps.manufacturer, vendor) || (router && isMaker(router->manufacturer, vendor)) ||
         std::any_of(vendor.prefixes.begin(), vendor.prefixes.end(),
                     [&](const VendorPrefix& prefix) { return startsWith(accessPoint.address, prefix); });
-    if (!ours) return works(false);
-    if (!wps.modelName.empty()) return works(true, {{"MarlixModelName", wps.modelName}});
-    if (router && !router->modelName.empty()) return works(true, {{"MarlixModelName", router->modelName}});
-    return works(true);
+    if (ours && !wps.modelName.empty()) return works(true, {{"MarlixModelName", wps.modelName}});
+    if (ours && router && !router->modelName.empty())
+        return works(true, {{"MarlixModelName", router->modelName}});
+    if (ours) return works(true);
+    const bool named = !wps.manufacturer.empty() || (router && !router->manufacturer.empty());
+    if (named || vendor.manufacturers.empty()) return works(false);
+    if (!router) return router.error();
+    return failure(Reason::unsupported, "neither the access point nor the router says who made it");
 }
 
-Outcome isVendorHotspot(const AccessPoint& accessPoint, const std::string& leaseText,
-                        const Vendors::Hotspot& vendor) {
-    const bool byAddress =
+HotspotMatches hotspotMatches(const AccessPoint& accessPoint, const Known<std::string>& leaseText,
+                              const Vendors::Hotspot& vendor) {
+    HotspotMatches matches;
+    matches.addressPrefix =
         std::any_of(vendor.addressPrefixes.begin(), vendor.addressPrefixes.end(), [&](const auto& prefix) {
             return !prefix.empty() && prefix.size() <= accessPoint.address.size() &&
                    std::equal(prefix.begin(), prefix.end(), accessPoint.address.begin());
         });
-    const bool byElement =
-        std::any_of(vendor.elements.begin(), vendor.elements.end(),
-                    [&](const auto& wanted) { return hasElement(accessPoint.elements, wanted); });
-    const bool byLease = std::any_of(
-        vendor.leaseTexts.begin(), vendor.leaseTexts.end(),
-        [&](const std::string& text) { return !text.empty() && leaseText.find(text) != leaseText.npos; });
-    return problem(byAddress || byElement || byLease);
+    matches.element = std::any_of(vendor.elements.begin(), vendor.elements.end(), [&](const auto& wanted) {
+        return hasElement(accessPoint.elements, wanted);
+    });
+    matches.leaseText =
+        leaseText &&
+        std::any_of(vendor.leaseTexts.begin(), vendor.leaseTexts.end(), [&](const std::string& text) {
+            return !text.empty() && leaseText->find(text) != text.npos;
+        });
+    return matches;
+}
+
+Outcome isVendorHotspot(const AccessPoint& accessPoint, const Known<std::string>& leaseText,
+                        const Vendors::Hotspot& vendor) {
+    if (vendor.elements.empty() && vendor.addressPrefixes.empty() && vendor.leaseTexts.empty())
+        return failure(Reason::badConfiguration, "no sign of a personal hotspot is configured");
+    const bool found = hotspotMatches(accessPoint, leaseText, vendor).any();
+    if (!found && !leaseText && !vendor.leaseTexts.empty()) return leaseText.error();
+    return problem(found);
 }
 
 }  // namespace wp

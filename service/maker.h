@@ -53,13 +53,25 @@ struct Vendors {
 };
 
 /// Test 33: whether the access point is the vendor's. Information: "MarlixModelName", where a model is told.
-/// \param router what the router says of itself, for the joined network only; absent where nothing is known
-Outcome isVendorBaseStation(const AccessPoint& accessPoint, const std::optional<RouterDescription>& router,
+/// Cannot tell where a maker's name would decide and nobody names one.
+/// \param router what the router says of itself, for the joined network only; else why that is not known
+Outcome isVendorBaseStation(const AccessPoint& accessPoint, const Known<RouterDescription>& router,
                             const Vendors::BaseStation& vendor);
 
-/// Test 44: whether the access point is a personal hotspot of the vendor's.
-/// \param leaseText the vendor's text in the lease, for the joined network only
-Outcome isVendorHotspot(const AccessPoint& accessPoint, const std::string& leaseText,
+/// Which kinds of rules say that an access point is a hotspot of the vendor's.
+struct HotspotMatches {
+    bool element = false;
+    bool addressPrefix = false;
+    bool leaseText = false;
+    bool any() const { return element || addressPrefix || leaseText; }
+};
+/// \param leaseText the vendor's text in the lease, for the joined network only; else why there is none
+HotspotMatches hotspotMatches(const AccessPoint& accessPoint, const Known<std::string>& leaseText,
+                              const Vendors::Hotspot& vendor);
+
+/// Test 44: whether the access point is a personal hotspot of the vendor's; parameters as above. Cannot tell where
+/// only a lease could, and there is none.
+Outcome isVendorHotspot(const AccessPoint& accessPoint, const Known<std::string>& leaseText,
                         const Vendors::Hotspot& vendor);
 
 }  // namespace wp

@@ -23,7 +23,25 @@ bool heardFromSeveral(const Facts& facts, const NetworkName& name) {
                                  [&](const AccessPoint& each) { return each.says.name == name; }) > 1;
 }
 
+/// What the joined network's router says of itself; else why nobody knows who made the access point.
+Known<RouterDescription> routerOf(const Facts& facts) {
+    constexpr const char* kSilent = "the access point does not say who made it";
+    if (facts.named) return failure(Reason::unsupported, kSilent);
+    if (facts.router) return facts.router->description;
+    Error error = facts.router.error();
+    if (error.code != static_cast<int>(Reason::cancelled))
+        error.message = std::string(kSilent) + ", and nor does its router: " + error.message;
+    return error;
+}
+
 }  // namespace
+
+Known<std::string> leaseTextOf(const Facts& facts) {
+    if (facts.named)
+        return failure(Reason::unsupported,
+                       "some hotspots show in their lease alone, and of a named network there is none");
+    return facts.setup ? facts.setup->leaseText : facts.setup.error();
+}
 
 Outcome outsideAnswers(const Facts& facts) {
     if (!facts.outsideEcho) return facts.outsideEcho.error();
@@ -69,16 +87,13 @@ Outcome band5IsFull(const Facts& facts) {
 Outcome isVendorsBaseStation(const Facts& facts) {
     const auto judged = judgedAccessPoint(facts);
     if (!judged) return judged.error();
-    std::optional<RouterDescription> router;
-    if (!facts.named && facts.router) router = facts.router->description;
-    return isVendorBaseStation(**judged, router, facts.settings.vendors.baseStation);
+    return isVendorBaseStation(**judged, routerOf(facts), facts.settings.vendors.baseStation);
 }
 
 Outcome isVendorsHotspot(const Facts& facts) {
     const auto judged = judgedAccessPoint(facts);
     if (!judged) return judged.error();
-    const std::string leaseText = !facts.named && facts.setup ? facts.setup->leaseText : std::string();
-    return isVendorHotspot(**judged, leaseText, facts.settings.vendors.hotspot);
+    return isVendorHotspot(**judged, leaseTextOf(facts), facts.settings.vendors.hotspot);
 }
 
 Outcome hasPortal(const Facts& facts) {

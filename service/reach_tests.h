@@ -26,6 +26,8 @@ Outcome band2IsFull(const Facts& facts);
 Outcome band5IsFull(const Facts& facts);
 /// 33. "MarlixModelName".
 Outcome isVendorsBaseStation(const Facts& facts);
+/// The vendor's text in the joined network's lease, for 44; else why it is not known.
+Known<std::string> leaseTextOf(const Facts& facts);
 /// 44.
 Outcome isVendorsHotspot(const Facts& facts);
 /// 46. "PreferredNetwork".

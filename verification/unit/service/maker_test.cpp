@@ -5,6 +5,7 @@
 #include "service/plain_text.h"
 #include "verification/unit/service/finding.h"
 #include "verification/unit/service/frames.h"
+#include "verification/unit/service/verdict.h"
 
 namespace wp {
 namespace {
@@ -16,6 +17,7 @@ Frame attribute(unsigned type, std::string_view text) {
 }
 
 constexpr std::uint32_t kWps = 0x0050F204;
+const Known<RouterDescription> kSilent = failure(Reason::timeout, "no answer");
 const Vendors::BaseStation kExample{{"Example Networks"}, {{0x02, 0x11, 0x22}}};
 
 TEST(WpsDescription, IsReadFromAttributesSpreadOverElements) {
@@ -56,12 +58,12 @@ TEST(VendorBaseStation, IsKnownByItsMakersNameWithoutCase) {
         heard(vendorElement(kWps, attribute(0x1021, "EXAMPLE networks") + attribute(0x1023, "Base 5")));
     const AccessPoint other = heard(vendorElement(kWps, attribute(0x1021, "Sample Networks")));
 
-    const Outcome outcome = isVendorBaseStation(ours, std::nullopt, kExample);
+    const Outcome outcome = isVendorBaseStation(ours, kSilent, kExample);
 
     EXPECT_TRUE(found(outcome));
     EXPECT_TRUE(outcome->didPass);
     EXPECT_EQ(informationOf(outcome, "MarlixModelName"), Value("Base 5"));
-    EXPECT_FALSE(found(isVendorBaseStation(other, std::nullopt, kExample)));
+    EXPECT_FALSE(found(isVendorBaseStation(other, kSilent, kExample)));
 }
 
 TEST(VendorBaseStation, IsKnownByItsAddressAndTakesTheRoutersModel) {
@@ -70,28 +72,72 @@ TEST(VendorBaseStation, IsKnownByItsAddressAndTakesTheRoutersModel) {
     const RouterDescription router{"Someone", "Router 7", "Attic"};
     EXPECT_EQ(informationOf(isVendorBaseStation(ours, router, kExample), "MarlixModelName"),
               Value("Router 7"));
-    EXPECT_EQ(isVendorBaseStation(ours, std::nullopt, kExample)->info, nullptr);
+    EXPECT_EQ(isVendorBaseStation(ours, kSilent, kExample)->info, nullptr);
 }
 
 TEST(VendorBaseStation, IsKnownByWhatTheRouterSays) {
     const AccessPoint plain = heard(nameElement("Home"));
     EXPECT_TRUE(found(isVendorBaseStation(plain, RouterDescription{"Example Networks", "", ""}, kExample)));
-    EXPECT_FALSE(found(isVendorBaseStation(plain, RouterDescription{"", "", ""}, {{""}, {}})));
+    EXPECT_FALSE(found(isVendorBaseStation(plain, RouterDescription{"Someone", "", ""}, kExample)));
+}
+
+TEST(VendorBaseStation, OfWhichNobodySaysWhoMadeItCannotBeTold) {
+    const AccessPoint plain = heard(nameElement("Home"));
+    EXPECT_TRUE(cannotTell(isVendorBaseStation(plain, kSilent, kExample), Reason::timeout));
+    EXPECT_TRUE(
+        cannotTell(isVendorBaseStation(plain, RouterDescription{"", "", ""}, kExample), Reason::unsupported));
+    // Where addresses alone decide, each tells.
+    EXPECT_FALSE(found(isVendorBaseStation(plain, kSilent, {{}, {{0x02, 0x11, 0x22}}})));
+    EXPECT_TRUE(cannotTell(isVendorBaseStation(plain, kSilent, {}), Reason::badConfiguration));
 }
 
 TEST(VendorHotspot, IsKnownByAnElementAnAddressOrALease) {
     const Vendors::Hotspot byElement{{{{0xAA, 0xBB, 0xCC}, std::uint8_t{9}}}, {}, {}};
-    EXPECT_TRUE(found(isVendorHotspot(heard(vendorElement(0xAABBCC09)), "", byElement)));
-    EXPECT_FALSE(found(isVendorHotspot(heard(vendorElement(0xAABBCC08)), "", byElement)));
-    EXPECT_FALSE(found(isVendorHotspot(heard(element(221, {0xAA, 0xBB, 0xCC})), "", byElement)));
+    EXPECT_TRUE(found(isVendorHotspot(heard(vendorElement(0xAABBCC09)), std::string(), byElement)));
+    EXPECT_FALSE(found(isVendorHotspot(heard(vendorElement(0xAABBCC08)), std::string(), byElement)));
+    EXPECT_FALSE(found(isVendorHotspot(heard(element(221, {0xAA, 0xBB, 0xCC})), std::string(), byElement)));
 
     AccessPoint phone = heard(nameElement("Phone"));
     phone.address = {0x02, 0x1A, 0x11, 0xF0, 0x01, 0x02};
-    EXPECT_TRUE(found(isVendorHotspot(phone, "", {{}, {{0x02, 0x1A, 0x11}}, {}})));
-    EXPECT_FALSE(found(isVendorHotspot(phone, "", {{}, {{0x02, 0x1A, 0x12}, {}}, {}})));
+    EXPECT_TRUE(found(isVendorHotspot(phone, std::string(), {{}, {{0x02, 0x1A, 0x11}}, {}})));
+    EXPECT_FALSE(found(isVendorHotspot(phone, std::string(), {{}, {{0x02, 0x1A, 0x12}, {}}, {}})));
 
-    EXPECT_TRUE(found(isVendorHotspot(phone, "x EXAMPLE_METERED", {{}, {}, {"EXAMPLE_METERED"}})));
-    EXPECT_FALSE(found(isVendorHotspot(phone, "", {{}, {}, {"EXAMPLE_METERED", ""}})));
+    EXPECT_TRUE(
+        found(isVendorHotspot(phone, std::string("x EXAMPLE_METERED"), {{}, {}, {"EXAMPLE_METERED"}})));
+    EXPECT_FALSE(found(isVendorHotspot(phone, std::string(), {{}, {}, {"EXAMPLE_METERED", ""}})));
+}
+
+TEST(VendorHotspot, WithoutALeaseCannotBeToldWhereOnlyALeaseCould) {
+    AccessPoint phone = heard(nameElement("Phone"));
+    phone.address = {0x02, 0x1A, 0x11, 0xF0, 0x01, 0x02};
+    const Known<std::string> none = failure(Reason::unavailable, "no lease");
+
+    EXPECT_TRUE(cannotTell(isVendorHotspot(phone, none, {{}, {}, {"EXAMPLE_METERED"}}), Reason::unavailable));
+    EXPECT_TRUE(found(isVendorHotspot(phone, none, {{}, {{0x02, 0x1A}}, {"EXAMPLE_METERED"}})));
+    EXPECT_FALSE(found(isVendorHotspot(phone, none, {{}, {{0x02, 0x1B}}, {}})));
+    EXPECT_TRUE(cannotTell(isVendorHotspot(phone, none, {}), Reason::badConfiguration));
+}
+
+TEST(VendorBaseStation, TheReasonSaysWhoWasSilent) {
+    const auto reason = [](int number, const Facts& facts) {
+        const Outcome outcome = verdictOf(number, facts);
+        return outcome ? "" : outcome.error().text();
+    };
+    Facts joined = joinedTo({heard(nameElement("Home"))});
+    joined.settings.vendors.baseStation = kExample;
+    joined.router = failure(Reason::timeout, "the router's description took too long");
+    Facts named = askedAbout("Home", {heard(nameElement("Home"))});
+    named.settings.vendors.baseStation = kExample;
+    named.settings.vendors.hotspot.leaseTexts = {"EXAMPLE_METERED"};
+
+    EXPECT_EQ(reason(33, joined),
+              "the access point does not say who made it, and nor does its router: the router's description "
+              "took too long (code 7)");
+    EXPECT_EQ(reason(33, named), "the access point does not say who made it (code 5)");
+    EXPECT_EQ(reason(44, named),
+              "some hotspots show in their lease alone, and of a named network there is none (code 5)");
+    joined.router = failure(Reason::cancelled, "cancelled");
+    EXPECT_EQ(reason(33, joined), "cancelled (code 8)");
 }
 
 }  // namespace
