@@ -1,8 +1,12 @@
 #include "linux/config.h"
 
-#include <charconv>
-#include <filesystem>
+#include <fcntl.h>
 
+#include <cerrno>
+#include <charconv>
+#include <cstring>
+
+#include "exchange/descriptor.h"
 #include "exchange/object_reader.h"
 #include "linux/files/key_value_file.h"
 #include "platform/json_writer.h"
@@ -12,6 +16,16 @@ namespace wp {
 namespace {
 
 constexpr std::size_t kLongestFile = 1U << 20, kLongestText = 512, kMostEntries = 256;
+
+/// The first eleven are those that a desktop's connection manager never takes for one network in two places; the others
+/// are makers' and words that say nothing.
+// clang-format off
+constexpr const char* kCommonNames[] = {
+    "linksys", "linksys-a", "linksys-g", "default", "belkin54g", "netgear", "o2dsl", "wlan", "alice-wlan",
+    "speedport w 501v", "turbonett", "dlink", "d-link", "tp-link", "asus", "home", "wifi", "wi-fi", "wireless",
+    "guest", "internet", "router", "network", "setup",
+};
+// clang-format on
 
 struct EndpointKey {
     const char* key;
@@ -170,12 +184,19 @@ void readHotspot(const Value& json, const Place& place, Vendors::Hotspot& vendor
     reader.finish();
 }
 
+NetworkName readName(const Value& json, const Place& place) {
+    const std::optional<NetworkName> name = nameFromText(readText(json, place));
+    if (!name || name->absent()) place.refuse("must be a network's name of 1 to 32 bytes");
+    return *name;
+}
+
 void readVendors(const Value& json, const Place& place, Config& config) {
     ObjectReader reader(json, place);
     if (const Value* value = reader.find("baseStation"))
         readBaseStation(*value, Place(place, "baseStation"), config.vendors.baseStation);
     if (const Value* value = reader.find("hotspot"))
         readHotspot(*value, Place(place, "hotspot"), config.vendors.hotspot);
+    readList(reader, "commonNames", config.vendors.commonNames, readName);
     if (const Value* value = reader.find("peerLinkIndicator"))
         config.peerLinkIndicator = readBoundedText(*value, Place(place, "peerLinkIndicator"));
     reader.finish();
@@ -195,6 +216,16 @@ void readTop(const Value& json, Config& config) {
     reader.finish();
 }
 
+/// Why a file is not taken, in the system's words where it was not opened; empty for one that need not be there and is
+/// not.
+std::string faultOf(const std::string& file, bool needed) {
+    const Descriptor opened(::open(file.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
+    if (opened) return "is no regular file of at most 1 MiB";
+    const int error = errno;
+    if (!needed && (error == ENOENT || error == ENOTDIR)) return {};
+    return std::string("cannot be read: ") + std::strerror(error);
+}
+
 }  // namespace
 
 Config Config::defaults() {
@@ -204,6 +235,7 @@ Config Config::defaults() {
     config.vendors.baseStation = {{"Example Networks"}, {}};
     // No text of leases: with one set, a network without a lease cannot be told from a hotspot.
     config.vendors.hotspot = {{{example, std::uint8_t{0x53}}}, {{0x00, 0x00, 0x5E, 0x00, 0x53}}, {}};
+    for (const char* name : kCommonNames) config.vendors.commonNames.push_back(*nameFromText(name));
     return config;
 }
 
@@ -235,10 +267,8 @@ std::variant<Config, std::string> loadConfig(const std::vector<std::string>& fil
     for (const std::string& file : all) {
         const bool isNamed = &file == &all.back() && !named.empty();
         const auto text = readSmallFile(file, kLongestFile);
-        std::error_code unknown;
-        if (!text && std::filesystem::exists(file, unknown))
-            return file + ": is no readable file of at most 1 MiB";
-        if (!text && isNamed) return file + ": cannot be read";
+        const std::string fault = text ? "" : faultOf(file, isNamed);
+        if (!fault.empty()) return file + ": " + fault;
         const auto refusal = text ? applyConfig(*text, config) : std::nullopt;
         if (refusal) return file + ": " + refusal->text();
     }

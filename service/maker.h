@@ -50,6 +50,8 @@ struct Vendors {
     };
     BaseStation baseStation;
     Hotspot hotspot;
+    /// Names that access points carry out of the box, and words that say nothing, for test 42; without case.
+    std::vector<NetworkName> commonNames;
 };
 
 /// Test 33: whether the access point is the vendor's. Information: "MarlixModelName", where a model is told.

@@ -119,7 +119,8 @@ Details ambiguousNameDetails(const Facts& facts) {
     if (!judged || (*judged)->says.name.absent()) return {};
     std::set<std::string_view> words;
     for (const AccessPoint* each : networkOf(facts)) words.insert(nameOf(securityOf(each->says.security)));
-    Details details{{"commonName", isCommonName((*judged)->says.name)}};
+    Details details{
+        {"commonName", isCommonName((*judged)->says.name, facts.settings.vendors.commonNames)}};
     if (!words.empty())
         details.emplace("securities", listOf(words, [](std::string_view word) { return word; }));
     return details;

@@ -2,28 +2,14 @@
 
 #include <algorithm>
 #include <set>
-#include <string_view>
 
 #include "service/judged.h"
 
 namespace wp {
 namespace {
 
-/// Names that access points carry out of the box, and words that say nothing: two unrelated networks with one
-/// of them are likely to be in reach of each other. Lower case.
-constexpr std::string_view kCommonNames[] = {
-    "linksys",   "linksys-a", "linksys-g",  "default", "belkin54g", "netgear",
-    "o2dsl",     "wlan",      "alice-wlan", "dlink",   "d-link",    "speedport w 501v",
-    "turbonett", "tp-link",   "asus",       "home",    "wifi",      "wi-fi",
-    "wireless",  "guest",     "internet",   "router",  "network",   "setup",
-};
-
-std::string lowerCase(Bytes name) {
-    std::string text(name.begin(), name.end());
-    for (char& letter : text) {
-        if (letter >= 'A' && letter <= 'Z') letter = static_cast<char>(letter + ('a' - 'A'));
-    }
-    return text;
+std::uint8_t lowerCase(std::uint8_t letter) {
+    return letter >= 'A' && letter <= 'Z' ? static_cast<std::uint8_t>(letter + ('a' - 'A')) : letter;
 }
 
 /// Networks that are secured in different ways are different networks, though they have one name.
@@ -46,8 +32,10 @@ bool usesWep(const SecuritySuites& suites) {
 
 }  // namespace
 
-bool isCommonName(const NetworkName& name) {
-    return std::ranges::find(kCommonNames, lowerCase(name.bytes())) != std::end(kCommonNames);
+bool isCommonName(const NetworkName& name, const std::vector<NetworkName>& common) {
+    return std::ranges::any_of(common, [&](const NetworkName& each) {
+        return std::ranges::equal(each.bytes(), name.bytes(), {}, lowerCase, lowerCase);
+    });
 }
 
 Outcome beaconIntervalIsLong(const Facts& facts) {
@@ -97,7 +85,7 @@ Outcome nameIsAmbiguous(const Facts& facts) {
     if (!judged) return judged.error();
     const NetworkName& name = (*judged)->says.name;
     if (name.absent()) return failure(Reason::notFound, "no frame has told the network's name");
-    bool found = isCommonName(name);
+    bool found = isCommonName(name, facts.settings.vendors.commonNames);
     if (!found) {
         const Known<std::vector<const AccessPoint*>> network = judgedNetwork(facts);
         if (!network) return network.error();

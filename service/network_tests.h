@@ -10,8 +10,8 @@ namespace wp {
 // not be told.
 
 /// Whether access points carry the name out of the box, or it says nothing: two unrelated networks with it are
-/// likely to be in reach of each other.
-bool isCommonName(const NetworkName& name);
+/// likely to be in reach of each other. \param common such names; letters of ASCII have no case
+bool isCommonName(const NetworkName& name, const std::vector<NetworkName>& common);
 
 /// 34. "BeaconInterval" in units of 1.024 ms.
 Outcome beaconIntervalIsLong(const Facts& facts);

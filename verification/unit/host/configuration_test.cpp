@@ -77,7 +77,8 @@ TEST_F(UsersConfiguration, IsRefusedWithFilePlaceAndReasonWhicheverPartIsWrong) 
 }
 
 TEST_F(UsersConfiguration, ThatIsNamedMustBeThere) {
-    EXPECT_EQ(refusalOf(folder_ + "/none"), "--config: " + folder_ + "/none: cannot be read");
+    EXPECT_EQ(refusalOf(folder_ + "/none"),
+              "--config: " + folder_ + "/none: cannot be read: No such file or directory");
 }
 
 }  // namespace

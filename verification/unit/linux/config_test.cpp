@@ -27,7 +27,7 @@ TEST(Config, TakesOverWhatIsSetAndKeepsTheRest) {
         "vendors": {"baseStation": {"manufacturers": ["A", "B"], "addressPrefixes": ["02:1A:2b"]},
                     "hotspot": {"vendorElements": [{"prefix": "00:11:22"}, {"prefix": "00:11:22", "type": 7}],
                                 "addressPrefixes": ["02:1A:11:22"], "leaseTexts": []},
-                    "peerLinkIndicator": "/run/peer"}})",
+                    "commonNames": ["Lobby", "a\\xFF"], "peerLinkIndicator": "/run/peer"}})",
                                      config);
     ASSERT_FALSE(refusal) << refusal->text();
     EXPECT_EQ(config.endpoints.pingIPv4, "192.0.2.1");
@@ -43,6 +43,7 @@ TEST(Config, TakesOverWhatIsSetAndKeepsTheRest) {
     EXPECT_EQ(config.vendors.hotspot.elements[0].type, std::nullopt);
     EXPECT_EQ(config.vendors.hotspot.elements[1].type, 7);
     EXPECT_TRUE(config.vendors.hotspot.leaseTexts.empty());
+    EXPECT_EQ(config.vendors.commonNames, (std::vector{*nameFromText("Lobby"), *nameFromText("a\\xFF")}));
     EXPECT_EQ(config.peerLinkIndicator, "/run/peer");
 }
 
@@ -54,6 +55,10 @@ TEST(Config, ARefusalSaysWhereAndWhyAndChangesNothing) {
     EXPECT_EQ(refusalOf(R"({"endpoints": {"stun": "host"}})"), "endpoints.stun: must be HOST:PORT");
     EXPECT_EQ(refusalOf(R"({"vendors": {"hotspot": {"addressPrefixes": ["02:1A:1"]}}})"),
               "vendors.hotspot.addressPrefixes[0]: must be octets such as 02:00:5E");
+    const std::string badName = "vendors.commonNames[1]: must be a network's name of 1 to 32 bytes";
+    EXPECT_EQ(refusalOf(R"({"vendors": {"commonNames": ["a", ""]}})"), badName);
+    EXPECT_EQ(refusalOf(R"({"vendors": {"commonNames": ["a", ")" + std::string(33, 'b') + R"("]}})"),
+              badName);
     for (const char* json :
          {"", "[]", "{\"other\": 1}", R"({"endpoints": {"ping": ""}})", R"({"endpoints": 1})",
           R"({"endpoints": {"name": "a b"}})", R"({"thresholds": {"savedNetworks": -1}})",
@@ -104,13 +109,18 @@ TEST(Config, WhereTheyLieIsTheSystemsFirstAndTheUsersLast) {
                                         "/home/a/.config/wifi-profile/config.json"}));
 }
 
-TEST(Config, TheDataFileForMakersThatShipsIsAcceptable) {
-    Config config = Config::defaults();
+TEST(Config, TheDataFileForMakersThatShipsSetsWhatHoldsWithoutIt) {
+    Config config;
     std::ifstream file(WP_SOURCE_DIR "/resources/vendors.json");
     const std::string text{std::istreambuf_iterator<char>(file), {}};
     ASSERT_FALSE(text.empty());
     const auto refusal = applyConfig(text, config);
     EXPECT_FALSE(refusal) << refusal->text();
+    const Vendors shipped = config.vendors, built = Config::defaults().vendors;
+    EXPECT_EQ(shipped.commonNames, built.commonNames);
+    EXPECT_EQ(shipped.baseStation.manufacturers, built.baseStation.manufacturers);
+    EXPECT_EQ(shipped.hotspot.addressPrefixes, built.hotspot.addressPrefixes);
+    EXPECT_EQ(shipped.hotspot.leaseTexts, built.hotspot.leaseTexts);
 }
 
 TEST(Config, LaterFilesWinAndOnlyTheNamedOneMustBeThere) {
@@ -127,7 +137,7 @@ TEST(Config, LaterFilesWinAndOnlyTheNamedOneMustBeThere) {
     ASSERT_TRUE(std::holds_alternative<Config>(both));
     EXPECT_EQ(std::get<Config>(both).endpoints.name, "b.example");
     EXPECT_EQ(std::get<Config>(both).endpoints.nameWildcard, "w.example");
-    EXPECT_EQ(std::get<std::string>(missing), folder + "/none: cannot be read");
+    EXPECT_EQ(std::get<std::string>(missing), folder + "/none: cannot be read: No such file or directory");
     EXPECT_TRUE(std::get<std::string>(bad).starts_with(folder + "/bad: endpoints.name: "))
         << std::get<std::string>(bad);
     std::filesystem::remove_all(folder);
@@ -141,7 +151,10 @@ TEST(Config, AFileThatIsThereAndCannotBeTakenIsNotPassedOver) {
 
     for (const char* name : {"/long", "/config.json"})
         EXPECT_EQ(std::get<std::string>(loadConfig({folder + name}, "")),
-                  folder + name + ": is no readable file of at most 1 MiB");
+                  folder + name + ": is no regular file of at most 1 MiB");
+    std::filesystem::create_symlink(folder + "/loop", folder + "/loop");
+    EXPECT_EQ(std::get<std::string>(loadConfig({folder + "/loop"}, "")),
+              folder + "/loop: cannot be read: Too many levels of symbolic links");
     std::filesystem::remove_all(folder);
 }
 

@@ -237,8 +237,9 @@ TEST(Details, OfMixedModesNameTheAccessPoints) {
 }
 
 TEST(Details, OfAnAmbiguousNameSayWhy) {
-    const Facts facts = joinedTo(
+    Facts facts = joinedTo(
         {heard(nameElement("linksys"), 2412, -50, kPrivacy), heard(nameElement("linksys"), 2412, -50)});
+    facts.settings.vendors.commonNames = {*nameFromText("linksys")};
 
     EXPECT_EQ(detail(42, facts, "commonName"), "true");
     EXPECT_EQ(detail(42, facts, "securities"), R"(["Open","WEP"])");

@@ -95,8 +95,15 @@ TEST(NetworkTests, DoNotClearANetworkByASecurityElementThatBreaksOff) {
 }
 
 TEST(NetworkTests, FindANameAmbiguousThatRoutersShipWith) {
-    EXPECT_TRUE(resultOf(42, joinedTo({heard(nameElement("NetGear"))})));
-    EXPECT_FALSE(resultOf(42, joinedTo({heard(nameElement("Netgear2"))})));
+    const auto isAmbiguous = [](std::string_view name) {
+        Facts facts = joinedTo({heard(nameElement(name))});
+        facts.settings.vendors.commonNames = {*nameFromText("lobby"), *nameFromText("NetGear")};
+        return resultOf(42, facts);
+    };
+    EXPECT_TRUE(isAmbiguous("Lobby"));
+    EXPECT_TRUE(isAmbiguous("netgeaR"));
+    EXPECT_FALSE(isAmbiguous("Netgear2"));
+    EXPECT_FALSE(isAmbiguous("lobb"));
 }
 
 TEST(NetworkTests, FindANameAmbiguousThatTwoNetworksShare) {
