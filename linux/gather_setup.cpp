@@ -97,6 +97,7 @@ Known<NameServers> managedNameServers(Known<Bus>& bus, const Link& link, const N
 LinkSetup setupFromNetworkManager(Known<Bus>& bus, const Link& link, const NetworkManagerLink& managed,
                                   const Until& until) {
     LinkSetup setup;
+    setup.toldBy = "NetworkManager";
     setup.methods = {methodOf(managed.settings, "ipv4"), methodOf(managed.settings, "ipv6")};
     setup.servers = managed.servers;
     setup.nameServers = managedNameServers(bus, link, managed, until);
@@ -112,6 +113,7 @@ LinkSetup setupFromNetworkManager(Known<Bus>& bus, const Link& link, const Netwo
 LinkSetup setupFromNetworkd(Known<Bus>& bus, const Link& link, const NetworkdLink& managed,
                             const Until& until) {
     LinkSetup setup;
+    setup.toldBy = "systemd-networkd";
     setup.methods = managed.methods;
     NameServers names{managed.manualServers, {}, managed.offeredServers, true};
     Servers own = managed.manualServers;
@@ -167,6 +169,7 @@ Known<LinkSetup> setupFromKernel(Known<Bus>& bus, const Link& link, const Until&
     KernelIPv6 switches = kernelSwitches(link.interfaceName);
     switches.acceptsAdvertisements |= iwdManages(bus, link, until);
     LinkSetup setup;
+    setup.toldBy = "addresses";
     setup.methods = {methodFromIPv4Addresses(assigned, client), methodFromIPv6Addresses(assigned, switches)};
     NameServers names =
         serversWithoutManager(lease, client, assigned, gatherWaysOut(link.interfaceIndex, until));

@@ -1,9 +1,11 @@
 #include <algorithm>
+#include <map>
 
 #include "service/congestion.h"
 #include "service/detail_values.h"
 #include "service/judged.h"
 #include "service/radio_tests.h"
+#include "service/scan_tests.h"
 
 namespace wp {
 namespace {
@@ -130,6 +132,30 @@ Details countryDetails(const Facts& facts) {
                                      {"accessPoints", entry.second.size()}});
         }));
     return details;
+}
+
+Details hiddenNetworkDetails(const Facts& facts) {
+    if (!facts.nearby || !facts.listened) return {};
+    return {{"networks", listOf(hiddenAccessPoints(*facts.nearby, *facts.listened),
+                                [](const AccessPoint* each) { return networkEntry(*each); })}};
+}
+
+Details scanDetails(const Facts& facts) {
+    if (!facts.nearby) return {};
+    struct Count {
+        int accessPoints = 0, hidden = 0;
+    };
+    std::map<Band, Count> bands;
+    for (const AccessPoint* each : distinctAccessPoints(*facts.nearby)) {
+        Count& count = bands[each->band()];
+        ++count.accessPoints;
+        if (each->says.name.absent()) ++count.hidden;
+    }
+    return {{"bands", listOf(bands, [](const auto& entry) {
+                 return Dictionary::make({{"band", wordOf(entry.first)},
+                                          {"accessPoints", entry.second.accessPoints},
+                                          {"hidden", entry.second.hidden}});
+             })}};
 }
 
 Details signalDetails(const Facts& facts) {

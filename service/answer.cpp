@@ -44,7 +44,7 @@ DiagnosticsTestResults oneResult(bool result, bool didPass, DictionaryPointer in
 
 DiagnosticsTestResponse answerOf(const NumberedTest& test, const Facts& facts) {
     const Outcome outcome = judge(test, facts);
-    Details details = test.details != nullptr ? test.details(facts) : Details();
+    Details details = test.details(facts);
     if (outcome)
         return {oneResult(outcome->result, outcome->didPass, withDetails(outcome->info, std::move(details))),
                 {}};

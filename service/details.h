@@ -11,6 +11,8 @@ namespace wp {
 using Details = Dictionary::Entries;
 
 // The device's own configuration.
+Details ipv4MethodDetails(const Facts& facts);     ///< 14
+Details ipv6MethodDetails(const Facts& facts);     ///< 15
 Details nameServerDetails(const Facts& facts);     ///< 16
 Details webProxyDetails(const Facts& facts);       ///< 17
 Details pairedDetails(const Facts& facts);         ///< 18
@@ -41,14 +43,18 @@ Details modes11NDetails(const Facts& facts);        ///< 37
 Details securityDetails(const Facts& facts);        ///< 38, 39, 40
 Details rateDetails(const Facts& facts);            ///< 41
 Details ambiguousNameDetails(const Facts& facts);   ///< 42
+Details hiddenNameDetails(const Facts& facts);      ///< 43
+Details hotspotDetails(const Facts& facts);         ///< 44
 Details hotspotElementDetails(const Facts& facts);  ///< 45
 
 // The air.
-Details channelDetails(const Facts& facts);  ///< 24: the networks and the channels of all bands
-Details band2Details(const Facts& facts);    ///< 25
-Details band5Details(const Facts& facts);    ///< 26
-Details widthDetails(const Facts& facts);    ///< 27
-Details countryDetails(const Facts& facts);  ///< 28
-Details signalDetails(const Facts& facts);   ///< 32
+Details channelDetails(const Facts& facts);        ///< 24: the networks and the channels of all bands
+Details band2Details(const Facts& facts);          ///< 25
+Details band5Details(const Facts& facts);          ///< 26
+Details widthDetails(const Facts& facts);          ///< 27
+Details countryDetails(const Facts& facts);        ///< 28
+Details hiddenNetworkDetails(const Facts& facts);  ///< 30
+Details scanDetails(const Facts& facts);           ///< 31
+Details signalDetails(const Facts& facts);         ///< 32
 
 }  // namespace wp

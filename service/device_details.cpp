@@ -22,6 +22,18 @@ Value namedNetwork(const SavedNetwork& network) {
 
 }  // namespace
 
+Details ipv4MethodDetails(const Facts& facts) {
+    Details details = ipv6MethodDetails(facts);
+    if (facts.setup) details.emplace("lease", static_cast<bool>(facts.setup->leaseText));
+    return details;
+}
+
+Details ipv6MethodDetails(const Facts& facts) {
+    Details details;
+    if (facts.setup) addText(details, "judgedBy", facts.setup->toldBy);
+    return details;
+}
+
 Details nameServerDetails(const Facts& facts) {
     if (!facts.setup || !facts.setup->nameServers) return {};
     const NameServers& servers = *facts.setup->nameServers;

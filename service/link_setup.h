@@ -14,6 +14,8 @@ namespace wp {
 /// How the interface is set up, by its connection manager, else by what the kernel and the files of the system
 /// give away.
 struct LinkSetup {
+    std::string
+        toldBy;  ///< "NetworkManager", "systemd-networkd"; "addresses": nobody, so that those were looked at
     AddressMethods methods;
     Known<NameServers> nameServers;
     Known<WebProxyPlaces> proxies;

@@ -2,10 +2,12 @@
 #include <set>
 
 #include "service/detail_values.h"
+#include "service/elements.h"
 #include "service/judged.h"
 #include "service/maker.h"
 #include "service/network_tests.h"
 #include "service/radio_tests.h"
+#include "service/reach_tests.h"
 
 namespace wp {
 namespace {
@@ -119,11 +121,32 @@ Details ambiguousNameDetails(const Facts& facts) {
     if (!judged || (*judged)->says.name.absent()) return {};
     std::set<std::string_view> words;
     for (const AccessPoint* each : networkOf(facts)) words.insert(nameOf(securityOf(each->says.security)));
-    Details details{
-        {"commonName", isCommonName((*judged)->says.name, facts.settings.vendors.commonNames)}};
+    Details details{{"commonName", isCommonName((*judged)->says.name, facts.settings.vendors.commonNames)}};
     if (!words.empty())
         details.emplace("securities", listOf(words, [](std::string_view word) { return word; }));
     return details;
+}
+
+Details hiddenNameDetails(const Facts& facts) {
+    const auto judged = judgedAccessPoint(facts);
+    if (!judged) return {};
+    Details details{{"nameKnown", !(*judged)->says.name.absent()}};
+    if (!(*judged)->beaconElements) return details;
+    const Bytes name = decodeElements(*(*judged)->beaconElements).name.bytes();
+    details.emplace("inBeacon", name.empty() ? "empty" : NetworkName(name).absent() ? "zeros" : "name");
+    return details;
+}
+
+Details hotspotDetails(const Facts& facts) {
+    const auto judged = judgedAccessPoint(facts);
+    if (!judged) return {};
+    const Known<std::string> leaseText = leaseTextOf(facts);
+    const HotspotMatches matches = hotspotMatches(**judged, leaseText, facts.settings.vendors.hotspot);
+    Array matched;
+    if (matches.element) matched.emplace_back("vendorElement");
+    if (matches.addressPrefix) matched.emplace_back("addressPrefix");
+    if (matches.leaseText) matched.emplace_back("leaseText");
+    return {{"matched", std::move(matched)}, {"leaseRead", static_cast<bool>(leaseText)}};
 }
 
 Details hotspotElementDetails(const Facts& facts) {

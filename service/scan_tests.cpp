@@ -28,30 +28,45 @@ Value recordOf(const AccessPoint& accessPoint) {
     return record;
 }
 
+Array recordsOf(const std::vector<const AccessPoint*>& accessPoints) {
+    Array records;
+    for (const AccessPoint* each : accessPoints) records.push_back(recordOf(*each));
+    return records;
+}
+
 }  // namespace
+
+std::vector<const AccessPoint*> hiddenAccessPoints(const std::vector<AccessPoint>& nearby,
+                                                   const std::vector<AccessPoint>& listened) {
+    // An access point that hides its name answers no scan: its beacon must be waited for.
+    std::set<MacAddress> told = addressesWithName(nearby);
+    told.merge(addressesWithName(listened));
+    std::vector<const AccessPoint*> hidden;
+    for (const auto* heard : {&nearby, &listened})
+        for (const AccessPoint& each : *heard)
+            if (each.says.name.absent() && told.insert(each.address).second) hidden.push_back(&each);
+    return hidden;
+}
+
+std::vector<const AccessPoint*> distinctAccessPoints(const std::vector<AccessPoint>& nearby) {
+    const std::set<MacAddress> named = addressesWithName(nearby);
+    std::vector<const AccessPoint*> distinct;
+    for (const AccessPoint& each : nearby)
+        if (!each.says.name.absent() || !named.contains(each.address)) distinct.push_back(&each);
+    return distinct;
+}
 
 Outcome foundHiddenNetworks(const Facts& facts) {
     if (!facts.nearby) return facts.nearby.error();
     if (!facts.listened) return facts.listened.error();
-    // An access point that hides its name answers no scan: its beacon must be waited for.
-    std::vector<AccessPoint> all = *facts.nearby;
-    all.insert(all.end(), facts.listened->begin(), facts.listened->end());
-    std::set<MacAddress> told = addressesWithName(all);
-    Array hidden;
-    for (const AccessPoint& each : all) {
-        if (each.says.name.absent() && told.insert(each.address).second) hidden.push_back(recordOf(each));
-    }
+    Array hidden = recordsOf(hiddenAccessPoints(*facts.nearby, *facts.listened));
     const bool found = !hidden.empty();
     return problem(found, {{"ScanResults", std::move(hidden)}});
 }
 
 Outcome foundNoNetworks(const Facts& facts) {
     if (!facts.nearby) return facts.nearby.error();
-    const std::set<MacAddress> named = addressesWithName(*facts.nearby);
-    Array all;
-    for (const AccessPoint& each : *facts.nearby) {
-        if (!each.says.name.absent() || !named.contains(each.address)) all.push_back(recordOf(each));
-    }
+    Array all = recordsOf(distinctAccessPoints(*facts.nearby));
     const bool none = all.empty();
     return problem(none, {{"ScanResults", std::move(all)}});
 }

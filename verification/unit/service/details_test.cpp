@@ -57,7 +57,11 @@ TEST(Answer, KeepsTheVerdictsOwnInformationAsItIs) {
 }
 
 TEST(Answer, HasNoInformationWhereNothingWasMeasured) {
-    const auto response = answerOf(*findTest(43), joinedTo({heard(nameElement("Northlight"))}));
+    Facts facts;
+    facts.setup = LinkSetup();
+    facts.setup->proxies = WebProxyPlaces();
+
+    const auto response = answerOf(*findTest(17), facts);
 
     ASSERT_TRUE(response.results);
     EXPECT_EQ(response.results->front()->info, nullptr);
@@ -234,6 +238,72 @@ TEST(Details, OfMixedModesNameTheAccessPoints) {
     EXPECT_EQ(detail(37, joinedTo({one, other}), "accessPoints"),
               R"([{"band":"5GHz","bssid":"02:00:00:00:01:00","joined":true,"modes":"n"},)"
               R"({"band":"5GHz","bssid":"02:00:00:00:02:00","joined":false,"modes":""}])");
+}
+
+TEST(Details, OfTheAddressesMethodSayWhoTold) {
+    Facts facts;
+    facts.setup = LinkSetup();
+    facts.setup->methods = {std::string("auto"), failure(Reason::notJoined, "no connection")};
+    facts.setup->toldBy = "NetworkManager";
+    facts.setup->leaseText = std::string();
+    EXPECT_EQ(detail(14, facts, "judgedBy"), R"("NetworkManager")");
+    EXPECT_EQ(detail(14, facts, "lease"), "true");
+    EXPECT_EQ(detail(15, facts, "judgedBy"), R"("NetworkManager")");
+    EXPECT_EQ(detail(15, facts, "reason"), R"("notJoined")");
+    EXPECT_EQ(detail(15, facts, "lease"), "");
+    facts.setup->leaseText = failure(Reason::unavailable, "no lease");
+    EXPECT_EQ(detail(14, facts, "lease"), "false");
+}
+
+TEST(Details, OfHiddenNetworksAreWhatTheirBeaconsTellAllTheSame) {
+    Facts facts = joinedTo({heard(nameElement("Northlight")), heard(nameElement(""), 5180, -70)});
+    AccessPoint late = heard(nameElement(std::string(6, '\0')), 2462, -80, kPrivacy);
+    late.address = {2, 0, 0, 0, 9, 9};
+    facts.listened = std::vector{late, late};
+    EXPECT_EQ(detailsOf(30, facts).at("networks").as<ArrayPointer>()->get()->size(), 2U);
+    EXPECT_NE(detail(30, facts, "networks").find(R"("bssid":"02:00:00:00:09:09")"), std::string::npos);
+    EXPECT_NE(detail(30, facts, "networks").find(R"("channel":11)"), std::string::npos);
+}
+
+TEST(Details, OfAScanCountTheAccessPointsOfEachBand) {
+    const Facts facts = joinedTo({heard(nameElement("Northlight")), heard(nameElement("Cafe"), 5180),
+                                  heard(nameElement(""), 5200), heard(nameElement("Bay"), 60480)});
+    EXPECT_EQ(detail(31, facts, "bands"),
+              R"([{"accessPoints":1,"band":"other","hidden":0},{"accessPoints":1,"band":"2.4GHz","hidden":0},)"
+              R"({"accessPoints":2,"band":"5GHz","hidden":1}])");
+    EXPECT_EQ(detail(31, Facts(), "bands"), "");
+}
+
+TEST(Details, OfAHiddenNameSayHowTheBeaconHidesIt) {
+    const auto shown = [](std::string_view name) {
+        return detail(43, joinedTo({heard(nameElement(name))}), "inBeacon");
+    };
+    EXPECT_EQ(shown(""), R"("empty")");
+    EXPECT_EQ(shown(std::string_view("\0\0", 2)), R"("zeros")");
+    EXPECT_EQ(shown("Northlight"), R"("name")");
+
+    AccessPoint answered = heard(nameElement(""));
+    answered.says = decodeAdvertised(0, nameElement("Secret"), nameElement(""));
+    EXPECT_EQ(detail(43, joinedTo({answered}), "nameKnown"), "true");
+    answered.beaconElements.reset();
+    answered.says = decodeAdvertised(0, nameElement("Secret"), std::nullopt);
+    EXPECT_EQ(detail(43, joinedTo({answered}), "inBeacon"), "");
+    EXPECT_EQ(detail(43, joinedTo({answered}), "reason"), R"("unsupported")");
+}
+
+TEST(Details, OfAHotspotAreTheKindsOfRulesThatMatch) {
+    Facts facts = joinedTo({heard(nameElement("Phone") + vendorElement(0xAABBCC09))});
+    facts.settings.vendors.hotspot = {{{{0xAA, 0xBB, 0xCC}, std::uint8_t{9}}}, {{2}}, {"METERED"}};
+    facts.setup = LinkSetup();
+    EXPECT_EQ(detail(44, facts, "matched"), R"(["vendorElement","addressPrefix"])");
+    EXPECT_EQ(detail(44, facts, "leaseRead"), "false");
+    facts.setup->leaseText = std::string("METERED");
+    EXPECT_EQ(detail(44, facts, "matched"), R"(["vendorElement","addressPrefix","leaseText"])");
+    EXPECT_EQ(detail(44, facts, "leaseRead"), "true");
+}
+
+TEST(Details, EveryTestHasSome) {
+    for (const NumberedTest& each : numberedTests()) EXPECT_NE(each.details, nullptr) << each.number;
 }
 
 TEST(Details, OfAnAmbiguousNameSayWhy) {
