@@ -33,6 +33,11 @@ std::optional<std::uint32_t> numberOfRadio(const std::string& name) {
     return static_cast<std::uint32_t>(std::stoul(text));
 }
 
+Descriptor openedDevice() {
+    Descriptor device(open(kDevice, O_RDWR | O_CLOEXEC | O_NONBLOCK));
+    return device ? std::move(device) : Descriptor(open(kDevice, O_RDONLY | O_CLOEXEC | O_NONBLOCK));
+}
+
 }  // namespace
 
 std::optional<SwitchEvent> readSwitchEvent(Bytes bytes) {
@@ -45,13 +50,11 @@ std::optional<SwitchEvent> readSwitchEvent(Bytes bytes) {
                        event.type == RFKILL_TYPE_WLAN, event.soft != 0 || event.hard != 0, event.hard != 0};
 }
 
-PowerSwitch::PowerSwitch()
-    : device_(open(kDevice, O_RDWR | O_CLOEXEC | O_NONBLOCK)), writable_(bool(device_)) {
-    if (!device_) device_ = Descriptor(open(kDevice, O_RDONLY | O_CLOEXEC | O_NONBLOCK));
-    update();
-}
+PowerSwitch::PowerSwitch() : PowerSwitch(openedDevice()) {}
 
-PowerSwitch::PowerSwitch(Descriptor device) : device_(std::move(device)), writable_(bool(device_)) {
+PowerSwitch::PowerSwitch(Descriptor device)
+    : device_(std::move(device)),
+      writable_(device_ && (::fcntl(device_.number(), F_GETFL) & O_ACCMODE) == O_RDWR) {
     update();
 }
 

@@ -28,7 +28,7 @@ std::optional<SwitchEvent> readSwitchEvent(Bytes bytes);
 class PowerSwitch {
   public:
     PowerSwitch();
-    /// Over a device that is open for reading and writing.
+    /// Over a device that is open for reading, and for writing where that is permitted.
     explicit PowerSwitch(Descriptor device);
 
     /// Readable when a switch has changed; -1 where there are none.

@@ -1,7 +1,7 @@
 #!/usr/bin/python3
 """Stand-ins for the services that a device may have on its system bus, with a small fixed state each.
 
-Usage: bus_services.py ADDRESS SERVICE...   (prints "ready"; services: nm, supplicant, iwd, bluez, resolved, broken)
+Usage: bus_services.py ADDRESS SERVICE...   (prints "ready"; services: nm, refusing-nm, supplicant, iwd, bluez, resolved, broken)
 """
 import sys
 
@@ -173,8 +173,24 @@ def broken():
     main.AddMethod(name, "Sleep", "", "", "import time; time.sleep(3600)")
 
 
+def refusing_network_manager():
+    nm = "org.freedesktop.NetworkManager"
+
+    class Refusing(dbus.service.Object):
+        methods = {}  # dbusmock looks there first
+
+        @dbus.service.method("org.freedesktop.DBus.Properties", in_signature="ssv")
+        def Set(self, interface, name, value):
+            raise dbus.exceptions.DBusException(
+                "Not authorized to perform this operation", name=nm + ".PermissionDenied")
+
+    bus = dbus.bus.BusConnection(sys.argv[1])
+    kept.append(dbus.service.BusName(nm, bus, do_not_queue=True))
+    kept.append(Refusing(kept[-1], "/org/freedesktop/NetworkManager"))
+
+
 for each in sys.argv[2:]:
-    {"nm": network_manager, "supplicant": supplicant, "iwd": iwd, "bluez": bluez, "resolved": resolved,
+    {"nm": network_manager, "refusing-nm": refusing_network_manager, "supplicant": supplicant, "iwd": iwd, "bluez": bluez, "resolved": resolved,
      "broken": broken}[each]()
 print("ready", flush=True)
 GLib.MainLoop().run()
