@@ -12,6 +12,7 @@
 #include "linux/dbus/resolved.h"
 #include "linux/dbus/supplicant.h"
 #include "linux/files/dhcp_clients.h"
+#include "linux/files/dhcpcd_leases.h"
 #include "linux/files/leases.h"
 #include "linux/files/networkd.h"
 #include "linux/files/proxy_settings.h"
@@ -146,16 +147,34 @@ bool iwdManages(Known<Bus>& bus, const Link& link, const Until& until) {
     return objects && !iwdDevice(*objects, link.interfaceName).empty();
 }
 
-/// The name servers where no manager tells: by the lease, else by who can have named them at all.
-NameServers serversWithoutManager(const std::optional<Lease>& lease, bool client,
+/// What DHCP clients without a manager wrote down.
+struct ClientLeases {
+    std::optional<Lease> ipv4, ipv6;
+};
+
+ClientLeases readClientLeases(const Link& link, const std::vector<AssignedAddress>& assigned) {
+    std::vector<IPAddress> addresses;
+    for (const AssignedAddress& each : assigned) addresses.push_back(each.address);
+    const std::time_t now = std::time(nullptr);
+    DhcpcdLeases kept = findDhcpcdLeases(link.interfaceName, addresses, now);
+    auto ofDhclient = findLease(link.interfaceName, now);
+    return {ofDhclient ? std::move(ofDhclient) : std::move(kept.ipv4), std::move(kept.ipv6)};
+}
+
+/// The name servers where no manager tells: by the leases, else by who can have named them at all.
+NameServers serversWithoutManager(const ClientLeases& leases, bool client,
                                   const std::vector<AssignedAddress>& assigned, const Known<WaysOut>& ways) {
     NameServers names;
-    names.offerKnown = lease.has_value();
-    if (lease) names.offered = lease->servers;
-    if (lease || !ways) return names;
+    for (const auto* lease : {&leases.ipv4, &leases.ipv6})
+        if (*lease) add(names.offered, (*lease)->servers);
+    names.offerKnown = leases.ipv4.has_value();
+    // What a router advertised is written down nowhere.
+    names.advertisementsKnown = false;
+    if (!ways) return names;
     names.routers = ways->gateways;
+    if (leases.ipv4) return names;
     // Nobody offers anything to an interface that was set up by hand; another one may have brought the servers along.
-    names.offerKnown = !client && !ways->elsewhere && allSetByHand(assigned);
+    names.offerKnown = names.advertisementsKnown = !client && !ways->elsewhere && allSetByHand(assigned);
     return names;
 }
 
@@ -164,25 +183,25 @@ Known<LinkSetup> setupFromKernel(Known<Bus>& bus, const Link& link, const Until&
     if (!details) return details.error();
     std::vector<AssignedAddress> assigned;
     for (const AddressDetails& each : *details) assigned.push_back(each.assigned);
-    const auto lease = findLease(link.interfaceName, std::time(nullptr));
-    const bool client = lease || dhcpClientRuns(link.interfaceName);
+    const ClientLeases leases = readClientLeases(link, assigned);
+    const DhcpClients clients = dhcpClientsOf(link.interfaceName);
+    const bool client = leases.ipv4 || clients.any;
     KernelIPv6 switches = kernelSwitches(link.interfaceName);
-    switches.acceptsAdvertisements |= iwdManages(bus, link, until);
+    switches.acceptsAdvertisements |= clients.askRouters || iwdManages(bus, link, until);
     LinkSetup setup;
     setup.toldBy = "addresses";
     setup.methods = {methodFromIPv4Addresses(assigned, client), methodFromIPv6Addresses(assigned, switches)};
     NameServers names =
-        serversWithoutManager(lease, client, assigned, gatherWaysOut(link.interfaceIndex, until));
+        serversWithoutManager(leases, client, assigned, gatherWaysOut(link.interfaceIndex, until));
     names.effective = effectiveServers(bus, link, {}, until);
-    setup.servers = lease && !lease->servers.empty() ? lease->servers : names.effective;
+    setup.servers = leases.ipv4 && !leases.ipv4->servers.empty() ? leases.ipv4->servers : names.effective;
     setup.nameServers = std::move(names);
     setup.leaseText =
         failure(Reason::unavailable, client ? "the DHCP client left no lease of IPv4 that can be read"
                                             : "no lease of IPv4 was found");
-    if (lease) {
-        setup.portalApi = lease->portalApi;
-        setup.leaseText = lease->vendorText;
-    }
+    if (leases.ipv4) setup.leaseText = leases.ipv4->vendorText;
+    for (const auto* lease : {&leases.ipv4, &leases.ipv6})
+        if (*lease && setup.portalApi.empty()) setup.portalApi = (*lease)->portalApi;
     return setup;
 }
 
@@ -192,6 +211,21 @@ bool is(const Error& error, Reason reason) {
 
 bool isStopped(const Error& error) {
     return is(error, Reason::cancelled);
+}
+
+/// A manager that is there and does not answer may have the interface all the same.
+bool mayManage(const Error& error) {
+    return !is(error, Reason::notFound) && !is(error, Reason::unavailable);
+}
+
+/// Its addresses say nothing: a manager that looks at routers' advertisements itself has the kernel leave them alone.
+LinkSetup setupOfSilentManager(Known<Bus>& bus, const Link& link, const Error& why, const Until& until) {
+    LinkSetup setup;
+    setup.methods = {why, why};
+    setup.nameServers = why;
+    setup.leaseText = why;
+    setup.servers = effectiveServers(bus, link, {}, until);
+    return setup;
 }
 
 /// \param settings of the profile in use. A profile that cannot be read may hold a proxy; without one there is none.
@@ -242,15 +276,20 @@ Known<LinkSetup> gatherSetup(const Link& link, const Until& until) {
         bus ? readNetworkManagerLink(*bus, link.interfaceName, until) : bus.error();
     if (!managed && isStopped(managed.error())) return managed.error();
     Known<LinkSetup> setup;
+    Known<BusValue> profile = BusValue();
     if (managed) {
         setup = setupFromNetworkManager(bus, link, *managed, until);
+        profile = managed->settings;
     } else if (const auto networkd = readNetworkdLink(link.interfaceIndex)) {
         setup = setupFromNetworkd(bus, link, *networkd, until);
+    } else if (mayManage(managed.error())) {
+        setup = setupOfSilentManager(bus, link, managed.error(), until);
+        profile = managed.error();
     } else {
         setup = setupFromKernel(bus, link, until);
     }
     if (!setup) return setup;
-    setup->proxies = allProxies(managed ? managed->settings : Known<BusValue>(BusValue()));
+    setup->proxies = allProxies(profile);
     return setup;
 }
 
@@ -259,9 +298,8 @@ Known<SavedNetworks> gatherSaved(const Link& link, const Until& until) {
     if (!bus) return bus.error();
     const auto managed = readNetworkManagerLink(*bus, link.interfaceName, until);
     if (managed) return networkManagerNetworks(*bus, until);
-    // One that is there and silent may have the interface: what it hands to the supplicant is not its store.
-    if (!is(managed.error(), Reason::notFound) && !is(managed.error(), Reason::unavailable))
-        return managed.error();
+    // What it hands to the supplicant is not its store.
+    if (mayManage(managed.error())) return managed.error();
     const auto objects = iwdObjects(*bus, until);
     if (objects && !iwdDevice(*objects, link.interfaceName).empty()) return iwdNetworks(*objects);
     const auto interface = supplicantInterface(*bus, link.interfaceName, until);

@@ -67,11 +67,14 @@ Outcome usesCustomNameServers(const Known<NameServers>& servers) {
     if (!servers->manual.empty()) return problem(true);
     bool hidden = false, unexplained = false;
     for (const IPAddress& server : servers->effective) {
+        const bool offerKnown = servers->offerKnown && (server.isIPv4() || servers->advertisementsKnown);
         if (server.loopback())
             hidden = true;
-        else if (!contains(servers->offered, server) && servers->offerKnown)
+        else if (contains(servers->offered, server))
+            continue;
+        else if (offerKnown)
             return problem(true);
-        else if (!servers->offerKnown && !contains(servers->routers, server))
+        else if (!contains(servers->routers, server))
             unexplained = true;
     }
     if (hidden)

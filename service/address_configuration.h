@@ -52,6 +52,7 @@ struct NameServers {
     std::vector<IPAddress> offered;    ///< by DHCP or a router's advertisement
     bool offerKnown = false;           ///< whether what the network offers could be read at all
     std::vector<IPAddress> routers{};  ///< the interface's; where the offer is not known they may well be it
+    bool advertisementsKnown = true;   ///< whether the offer holds servers of IPv6 that a router advertises
 };
 
 /// Test 16: whether a name server was entered by hand, or one is asked that the network did not offer. A

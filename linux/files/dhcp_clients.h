@@ -4,8 +4,14 @@
 
 namespace wp {
 
-/// Whether a DHCP client runs that looks after the interface. Some clients write no lease down; that they run is
-/// then all that tells an automatic address from one that was entered. \param root a root folder
-bool dhcpClientRuns(const std::string& interfaceName, const std::string& root = "");
+/// The DHCP clients that run and look after an interface. Some write no lease down; that they run is then all that tells
+/// an automatic address from one that was entered.
+struct DhcpClients {
+    bool any = false;
+    bool askRouters =
+        false;  ///< one looks at routers' advertisements itself, and has the kernel leave them alone
+};
+/// \param root a root folder
+DhcpClients dhcpClientsOf(const std::string& interfaceName, const std::string& root = "");
 
 }  // namespace wp

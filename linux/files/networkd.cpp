@@ -98,6 +98,9 @@ std::optional<NetworkdLink> readNetworkdLink(unsigned interfaceIndex, const std:
         addServers(words, link.manualServers);
     if (const auto lease = readSmallFile(root + "/run/systemd/netif/leases/" + number))
         addLease(readAssignments(*lease), link);
+    // From its version 254 on: of DHCPv4, DHCPv6 or a router's advertisement.
+    if (const auto portal = state.find("CAPTIVE_PORTAL"); portal != state.end())
+        link.portalApi = plainText(portal->second, 2048);
     return link;
 }
 

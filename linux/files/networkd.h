@@ -15,7 +15,7 @@ struct NetworkdLink {
     std::vector<IPAddress> manualServers;
     std::vector<IPAddress> offeredServers;
     bool hasLease = false;
-    std::string portalApi;   ///< what the lease names; empty where it names none
+    std::string portalApi;   ///< what lease or advertisement names; empty where none does
     std::string vendorText;  ///< of the lease
 };
 

@@ -73,6 +73,19 @@ dhclient_lease() {
         > "/run/lab/$1/dhclient.log" 2>&1 || { cat "/run/lab/$1/dhclient.log"; return 1; }
 }
 
+# dhcpcd_lease X: addresses from dhcpcd, which keeps the servers' answers byte for byte.
+dhcpcd_lease() {
+    local dir=/run/lab/$1
+    printf '%s\n' '#!/bin/sh' 'set -- $new_domain_name_servers $new_dhcp6_name_servers; [ $# = 0 ] || printf "nameserver %s\n" "$@" > /etc/resolv.conf' \
+        > "$dir/dhcpcd-hook"
+    chmod +x "$dir/dhcpcd-hook"
+    printf '%s\n' 'option domain_name_servers, routers' 'option dhcp6_name_servers' > "$dir/dhcpcd.conf"
+    mkdir -p /var/lib/dhcpcd
+    grep -q ^dhcpcd: /etc/passwd || echo 'dhcpcd:x:984:984::/var/lib/dhcpcd:/usr/sbin/nologin' >> /etc/passwd
+    "$LAB_PROGRAMS/usr/sbin/dhcpcd" -f "$dir/dhcpcd.conf" -c "$dir/dhcpcd-hook" -w -t 30 "$1" > "$dir/dhcpcd.log" 2>&1 ||
+        { cat "$dir/dhcpcd.log"; return 1; }
+}
+
 # bluetooth PAIRED CONNECTED [COMMAND]: a Bluetooth service with so many devices, that runs the command when it is asked.
 bluetooth() {
     message_bus

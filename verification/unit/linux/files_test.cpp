@@ -134,6 +134,14 @@ TEST_F(Root, OfASystemWithNetworkdTellsMethodsServersAndLease) {
     EXPECT_FALSE(readNetworkdLink(4, root_));
 }
 
+TEST_F(Root, OfASystemWithNetworkdTellsThePortalOfAnAdvertisementToo) {
+    write("/run/systemd/netif/links/3",
+          "NETWORK_FILE=/etc/systemd/network/wlan0.network\nCAPTIVE_PORTAL=https://p.example/six\n");
+    write("/etc/systemd/network/wlan0.network", "[Network]\nDHCP=no\n");
+    ASSERT_TRUE(readNetworkdLink(3, root_));
+    EXPECT_EQ(readNetworkdLink(3, root_)->portalApi, "https://p.example/six");
+}
+
 TEST_F(Root, WithoutANetworkFileIsNotManagedByNetworkd) {
     write("/run/systemd/netif/links/3", "ADMIN_STATE=unmanaged\n");
     EXPECT_FALSE(readNetworkdLink(3, root_));
@@ -153,27 +161,43 @@ std::string commandOf(const std::vector<std::string>& words) {
 }
 
 TEST_F(Root, HasADhcpClientForTheInterfaceThatItNames) {
-    EXPECT_FALSE(dhcpClientRuns("wlan0", root_));
+    EXPECT_FALSE(dhcpClientsOf("wlan0", root_).any);
     write("/proc/1/cmdline", commandOf({"/sbin/init"}));
     write("/proc/12/cmdline", commandOf({"/bin/busybox", "udhcpc", "-i", "wlan0", "-n"}));
     write("/proc/13/cmdline", commandOf({"/sbin/dhclient", "-iwlan2"}));
     write("/proc/14/cmdline", "");
     write("/proc/self/cmdline", commandOf({"dhclient", "eth0"}));
-    EXPECT_TRUE(dhcpClientRuns("wlan0", root_));
-    EXPECT_TRUE(dhcpClientRuns("wlan2", root_));
-    EXPECT_FALSE(dhcpClientRuns("wlan", root_));
-    EXPECT_FALSE(dhcpClientRuns("eth0", root_));
+    EXPECT_TRUE(dhcpClientsOf("wlan0", root_).any);
+    EXPECT_TRUE(dhcpClientsOf("wlan2", root_).any);
+    EXPECT_FALSE(dhcpClientsOf("wlan", root_).any);
+    EXPECT_FALSE(dhcpClientsOf("eth0", root_).any);
 }
 
 TEST_F(Root, HasADhcpClientForAllInterfacesWhereItNamesNone) {
     write("/proc/12/cmdline", commandOf({"dhcpcd", "eth0", "-q"}));
-    EXPECT_FALSE(dhcpClientRuns("wlan0", root_));
+    EXPECT_FALSE(dhcpClientsOf("wlan0", root_).any);
     write("/proc/13/cmdline", commandOf({"/usr/sbin/dhcpcd", "-q", "-f", "/etc/dhcpcd.conf"}));
-    EXPECT_TRUE(dhcpClientRuns("wlan0", root_));
+    EXPECT_TRUE(dhcpClientsOf("wlan0", root_).any);
     write("/proc/13/cmdline", commandOf({"/usr/sbin/connmand", "-n", "-r"}));
-    EXPECT_TRUE(dhcpClientRuns("wlan0", root_));
+    EXPECT_TRUE(dhcpClientsOf("wlan0", root_).any);
     write("/proc/13/cmdline", commandOf({"grep", "connmand.conf"}));
-    EXPECT_FALSE(dhcpClientRuns("wlan0", root_));
+    EXPECT_FALSE(dhcpClientsOf("wlan0", root_).any);
+}
+
+TEST_F(Root, HasADhcpClientThatShowsATitleInPlaceOfItsCommandLine) {
+    write("/proc/13/cmdline", std::string("dhcpcd: wlan0 [ip4] [ip6]") + std::string(8, '\0'));
+    EXPECT_TRUE(dhcpClientsOf("wlan0", root_).any);
+    EXPECT_FALSE(dhcpClientsOf("wlan1", root_).any);
+    write("/proc/13/cmdline", "dhcpcd: [manager] [ip4] [ip6]");
+    EXPECT_TRUE(dhcpClientsOf("wlan1", root_).any);
+}
+
+TEST_F(Root, HasADhcpClientThatLooksAtAdvertisementsItself) {
+    write("/proc/12/cmdline", commandOf({"udhcpc", "-i", "wlan0"}));
+    EXPECT_FALSE(dhcpClientsOf("wlan0", root_).askRouters);
+    write("/proc/13/cmdline", commandOf({"/usr/sbin/dhcpcd", "wlan0"}));
+    EXPECT_TRUE(dhcpClientsOf("wlan0", root_).askRouters);
+    EXPECT_FALSE(dhcpClientsOf("wlan1", root_).askRouters);
 }
 
 TEST_F(Root, FilesThatAreTooLongOrNoFilesAreNotRead) {

@@ -194,6 +194,18 @@ TEST_F(MessageBus, TheStoreOfASilentManagerIsNotReplacedByItsSupplicants) {
     EXPECT_EQ(iwds->store, "iwd");
 }
 
+TEST_F(MessageBus, WhatASilentManagerWasToldIsNotReadFromAddresses) {
+    const auto setup = gatherSetup({"wlan7", 9997, 0, true, {}}, patience());
+    ASSERT_TRUE(setup) << setup.error().text();
+    ASSERT_TRUE(!setup->methods.ipv4 && !setup->methods.ipv6 && !setup->nameServers && !setup->leaseText);
+    EXPECT_EQ(setup->methods.ipv4.error().code, codeOf(Reason::timeout));
+    EXPECT_EQ(setup->methods.ipv6.error().code, codeOf(Reason::timeout));
+    EXPECT_EQ(setup->nameServers.error().code, codeOf(Reason::timeout));
+    // This machine's own environment may set a proxy, which is an answer.
+    EXPECT_TRUE(setup->proxies ? !setup->proxies->empty()
+                               : setup->proxies.error().code == codeOf(Reason::timeout));
+}
+
 TEST_F(MessageBus, NetworkManagerTellsItsNetworks) {
     Bus bus = this->bus();
     const auto saved = networkManagerNetworks(bus, patience());

@@ -101,6 +101,17 @@ TEST(NameServers, TheNetworksOwnRouterNeedsNoOffer) {
     EXPECT_TRUE(found(usesCustomNameServers(NameServers{{}, {router}, {}, true, {router}})));
 }
 
+TEST(NameServers, OfIPv6MayComeWithAnAdvertisementThatNobodyWroteDown) {
+    const IPAddress router = address("192.168.1.1"), other = address("2001:db8::53");
+    NameServers leased = servers({}, {router, other}, {router});
+    leased.advertisementsKnown = false;
+    EXPECT_TRUE(cannotTell(usesCustomNameServers(leased), Reason::unavailable));
+    leased.routers = {other};
+    EXPECT_FALSE(found(usesCustomNameServers(leased)));
+    leased.effective.push_back(address("9.9.9.9"));
+    EXPECT_TRUE(found(usesCustomNameServers(leased)));
+}
+
 TEST(NameServers, NobodyOffersAnyWhereAllAddressesWereSetByHand) {
     const AssignedAddress byHand{address("192.168.1.20"), true, false}, local{address("fe80::5"), true, true};
     EXPECT_TRUE(allSetByHand({byHand, local}));
