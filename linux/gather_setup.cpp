@@ -3,7 +3,6 @@
 #include <algorithm>
 #include <cstdlib>
 #include <ctime>
-#include <filesystem>
 
 #include "linux/address_details.h"
 #include "linux/dbus/bluez.h"
@@ -237,32 +236,6 @@ Known<WebProxyPlaces> allProxies(const Known<BusValue>& settings) {
     return places;
 }
 
-std::optional<std::string> driverOf(const Link& link, const std::string& root) {
-    std::error_code failed;
-    const auto target = std::filesystem::read_symlink(
-        root + "/sys/class/net/" + link.interfaceName + "/device/driver", failed);
-    if (failed) return std::nullopt;
-    return target.filename().string();
-}
-
-/// The parameter of a driver's module that says whether airtime is shared.
-struct Switch {
-    const char* driver;
-    const char* parameter;
-};
-// Of the drivers that have one that can be read without privileges (kernel documentation of ath9k and iwlwifi, and the
-// parameters that the modules of ath9k_htc, iwlegacy and b43 declare).
-// clang-format off
-constexpr Switch kSwitches[] = {
-    {"iwlwifi",   "iwlwifi/parameters/bt_coex_active"},
-    {"ath9k",     "ath9k/parameters/btcoex_enable"},
-    {"ath9k_htc", "ath9k_htc/parameters/btcoex_enable"},
-    {"iwl3945",   "iwlegacy/parameters/bt_coex_active"},
-    {"iwl4965",   "iwlegacy/parameters/bt_coex_active"},
-    {"b43",       "b43/parameters/btcoex"},
-};
-// clang-format on
-
 bool isPeerLink(std::uint32_t type) {
     constexpr std::uint32_t kClient = 8, kOwner = 9, kAwareness = 12;  // nl80211_iftype
     return type == kClient || type == kOwner || type == kAwareness;
@@ -313,17 +286,6 @@ Known<SavedNetworks> gatherSaved(const Link& link, const Until& until) {
 Known<Bluetooth> gatherBluetooth(const Until& until) {
     Known<Bus> bus = Bus::system();
     return readBluetooth(bus, bluetoothControllerExists(), until);
-}
-
-Known<bool> gatherAirtimeSharing(const Link& link, const std::string& root) {
-    const auto driver = driverOf(link, root);
-    for (const Switch& each : kSwitches) {
-        if (driver != each.driver) continue;
-        const auto text = readSmallFile(root + "/sys/module/" + each.parameter, 64);
-        if (text && !text->empty()) return text->front() == 'Y' || text->front() == '1';
-    }
-    return failure(Reason::unsupported, "the driver " + driver.value_or("(unknown)") +
-                                            " does not tell whether it shares airtime with Bluetooth");
 }
 
 Known<PeerLinks> gatherPeerLinks(const Link& link, const std::string& indicator, const Until& until) {

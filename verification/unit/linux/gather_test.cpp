@@ -291,7 +291,10 @@ class Driver : public ::testing::Test {
         std::filesystem::create_symlink("../../../bus/pci/drivers/" + driver, device / "driver");
     }
     void setParameter(const std::string& path, const std::string& content) const {
-        const std::filesystem::path file = root_ + "/sys/module/" + path;
+        write("/sys/module/" + path, content);
+    }
+    void write(const std::string& path, const std::string& content) const {
+        const std::filesystem::path file = root_ + path;
         std::filesystem::create_directories(file.parent_path());
         std::ofstream(file) << content;
     }
@@ -309,6 +312,34 @@ TEST_F(Driver, TellsWhetherItSharesAirtimeByItsSwitch) {
     use("ath9k");
     setParameter("ath9k/parameters/btcoex_enable", "1\n");
     EXPECT_EQ(*sharing(), true);
+}
+
+TEST_F(Driver, TellsItInTheFolderForDebugging) {
+    const std::string folder = "/sys/kernel/debug/ieee80211/phy7/";
+    write("/sys/class/net/lo/phy80211/name", "phy7\n");
+    use("ath10k_pci");
+    EXPECT_FALSE(sharing());
+    write(folder + "ath10k/btcoex", "1\n");
+    EXPECT_EQ(*sharing(), true);
+    write(folder + "ath10k/btcoex", "0\n");
+    EXPECT_EQ(*sharing(), false);
+}
+
+TEST_F(Driver, ThatReportsOnCoexistenceIsTakenAtItsWord) {
+    write("/sys/class/net/lo/phy80211/name", "phy7\n");
+    use("rtw_8822ce");
+    const auto told = [&](const std::string& report) {
+        write("/sys/kernel/debug/ieee80211/phy7/rtw88/coex_info", report);
+        return sharing() ? *sharing() ? "shares" : "does not" : "cannot tell";
+    };
+    const std::string shared = "Mech/ RFE                                = Shared/ 4\n";
+    EXPECT_STREQ(told(shared), "shares");
+    EXPECT_STREQ(told("Mech/ RFE                                = Non-Shared/ 4\n"), "cannot tell");
+    EXPECT_STREQ(told("============[Under Manual Control]============\n" + shared), "does not");
+    EXPECT_STREQ(told(shared + "Coex Ver/ BT Dez/ BT Rpt = 20070114/ 0x11/ 0x00000000 (BT disabled)\n"),
+                 "does not");
+    use("rtw89_8852ae");
+    EXPECT_FALSE(sharing());
 }
 
 TEST_F(Driver, WithoutASwitchIsNoGuess) {
