@@ -20,6 +20,7 @@ using std::chrono::milliseconds;
 
 constexpr milliseconds kApart{200};
 constexpr milliseconds kWait{1000};
+constexpr milliseconds kSilence{300};
 
 struct SocketAddress {
     sockaddr_storage storage{};
@@ -72,8 +73,20 @@ class EchoRow {
         : descriptor_(descriptor), raw_(raw), target_(target), address_(addressOf(target, interfaceIndex)) {}
 
     /// Nothing, or why the row could not be completed.
-    std::optional<Error> run(const Until& until) {
+    std::optional<Error> run(const WhenSilent& whenSilent, const Until& until) {
         drain();
+        if (!sendAll(until) || !receiveUntil(sent_.back() + kSilence, until))
+            return waitFailure(Wait::stopped, "echo");
+        if (std::ranges::none_of(answered_, [](auto& each) { return each.has_value(); })) whenSilent();
+        if (!receiveUntil(sent_.back() + kWait, until)) return waitFailure(Wait::stopped, "echo");
+        return std::nullopt;
+    }
+
+    std::vector<std::optional<double>> roundTrips() const { return {answered_.begin(), answered_.end()}; }
+
+  private:
+    /// Takes what is answered between the requests too. False when stopped.
+    bool sendAll(const Until& until) {
         for (std::size_t i = 0; i < kEchoRequests; ++i) {
             sent_[i] = Clock::now();
             const std::vector<std::uint8_t> request =
@@ -83,16 +96,11 @@ class EchoRow {
                 sendto(descriptor_, request.data(), request.size(), 0, address_.get(), address_.size);
             asked_ = i + 1;
             const Clock::time_point next = sent_[0] + kApart * static_cast<int>(i + 1);
-            if (!receiveUntil(i + 1 < kEchoRequests ? next : sent_[i] + kWait, until)) {
-                return waitFailure(Wait::stopped, "echo");
-            }
+            if (asked_ < kEchoRequests && !receiveUntil(next, until)) return false;
         }
-        return std::nullopt;
+        return true;
     }
 
-    std::vector<std::optional<double>> roundTrips() const { return {answered_.begin(), answered_.end()}; }
-
-  private:
     /// Takes answers until the time is over, or, after the last request, until all are there. False when stopped.
     bool receiveUntil(Clock::time_point time, const Until& until) {
         while (asked_ < kEchoRequests || std::ranges::any_of(answered_, [](auto& each) { return !each; })) {
@@ -173,7 +181,7 @@ EchoSocket::End EchoSocket::open(Address::Family family) {
 }
 
 Known<Echo> EchoSocket::ask(const Gateway& target, const std::string& interfaceName,
-                            std::uint32_t interfaceIndex, const Until& until) {
+                            std::uint32_t interfaceIndex, const WhenSilent& whenSilent, const Until& until) {
     const std::lock_guard lock(asking_);
     const End& end = this->end(target.family);
     if (!end.descriptor) {
@@ -188,7 +196,7 @@ Known<Echo> EchoSocket::ask(const Gateway& target, const std::string& interfaceN
     }
     const double startedAt = secondsSinceReference();
     EchoRow row(end.descriptor.number(), end.raw, target, interfaceIndex);
-    if (std::optional<Error> error = row.run(until)) return *error;
+    if (std::optional<Error> error = row.run(whenSilent, until)) return *error;
     return Echo{interfaceName, textOf(target.family, target.bytes), row.roundTrips(), startedAt};
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <functional>
 #include <mutex>
 
 #include "linux/echo_message.h"
@@ -7,6 +8,9 @@
 #include "linux/stop_signal.h"
 
 namespace wp {
+
+/// Called when a whole row of echo requests seems to be lost.
+using WhenSilent = std::function<void()>;
 
 /// Sends echo requests. It is opened while the program still has its privileges; sending needs none. One row of
 /// requests at a time, *any* thread.
@@ -16,9 +20,10 @@ class EchoSocket {
     EchoSocket();
 
     /// Sends 5 requests 200 ms apart out of the interface and waits up to 1 s for each answer, all at once. Every
-    /// peer waits about that long, and a home network answers within a few milliseconds.
+    /// peer waits about that long, and a home network answers within a few milliseconds. Where nothing at all has come
+    /// 300 ms after the last request, more than a second after the first, it says so and waits on.
     Known<Echo> ask(const Gateway& target, const std::string& interfaceName, std::uint32_t interfaceIndex,
-                    const Until& until);
+                    const WhenSilent& whenSilent, const Until& until);
 
   private:
     struct End {

@@ -101,7 +101,7 @@ Store addresses(const Gathering& g) {
 
 Store gatewayEcho(const Gathering& g) {
     return fromLink(g, &Facts::gatewayEcho, [&](const Link& found) {
-        Known<Echo> echo = gatherGatewayEcho(found, g.sources.gatewayEcho, g.until);
+        Known<Echo> echo = gatherGatewayEcho(found, g.sources.gatewayEcho, g.yield, g.until);
         const bool isSilent =
             echo && std::ranges::none_of(echo->roundTrips, [](auto& each) { return each.has_value(); });
         if (isSilent && answersAsNeighbour(found, echo->target, g.until))
@@ -149,7 +149,7 @@ Store allowedChannels(const Gathering& g) {
 
 Store outsideEcho(const Gathering& g) {
     return fromLink(g, &Facts::outsideEcho, [&](const Link& found) {
-        return gatherOutsideEcho(found, g.sources.config.endpoints, g.sources.outsideEcho, g.until);
+        return gatherOutsideEcho(found, g.sources.config.endpoints, g.sources.outsideEcho, g.yield, g.until);
     });
 }
 

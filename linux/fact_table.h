@@ -18,6 +18,8 @@ struct Gathering {
     Sources& sources;
     Until until;
     const char* loss;  ///< of the row
+    /// To be called where the fact no longer minds what is kept waiting for it (`FactRow::after`). *Any* thread.
+    std::function<void()> yield = {};
 };
 
 /// How one fact is had.
@@ -25,7 +27,7 @@ struct FactRow {
     Fact fact;
     const char* name;             ///< in a trace
     std::span<const Fact> needs;  ///< facts that it builds on
-    std::span<const Fact> after;  ///< facts that it must not disturb: it waits while they are being gathered
+    std::span<const Fact> after;  ///< facts that it must not disturb: it waits until each is there or yields
     std::chrono::milliseconds most;               ///< how long it may take
     Store (*gather)(const Gathering& gathering);  ///< on a worker's thread
     const char* loss;                             ///< what nobody can tell without it

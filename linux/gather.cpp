@@ -167,13 +167,14 @@ bool answersAsNeighbour(const Link& link, const std::string& address, const Unti
     return dump && wanted && isReachable(*dump, link.interfaceIndex, wanted->bytes());
 }
 
-Known<Echo> gatherGatewayEcho(const Link& link, EchoSocket& socket, const Until& until) {
+Known<Echo> gatherGatewayEcho(const Link& link, EchoSocket& socket, const WhenSilent& whenSilent,
+                              const Until& until) {
     if (!link.joined) return notJoined(link);
     const auto dump = routeDump<rtmsg>(RTM_GETROUTE, "routes", until);
     if (!dump) return dump.error();
     const std::vector<Gateway> gateways = readGateways(*dump, link.interfaceIndex);
     if (gateways.empty()) return failure(Reason::notJoined, link.interfaceName + " has no default route");
-    return socket.ask(gateways.front(), link.interfaceName, link.interfaceIndex, until);
+    return socket.ask(gateways.front(), link.interfaceName, link.interfaceIndex, whenSilent, until);
 }
 
 }  // namespace wp

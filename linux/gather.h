@@ -22,7 +22,8 @@ Known<Station> gatherStation(const Link& link, const Until& until);
 Known<Survey> gatherSurvey(const Link& link, const Until& until);
 Known<Regulation> gatherRegulation(const Link& link, const Until& until);
 Known<Addresses> gatherAddresses(const Link& link, const Until& until);
-Known<Echo> gatherGatewayEcho(const Link& link, EchoSocket& socket, const Until& until);
+Known<Echo> gatherGatewayEcho(const Link& link, EchoSocket& socket, const WhenSilent& whenSilent,
+                              const Until& until);
 
 /// Whether the kernel has lately heard from this address on the link, as from a router that ignores echo requests.
 bool answersAsNeighbour(const Link& link, const std::string& address, const Until& until);

@@ -81,10 +81,17 @@ void Phase::launchWhatCan() {
         const FactRow& row = rowOf(fact);
         const auto isDone = [&](Fact other) { return state(other) == State::done; };
         const auto isOver = [&](Fact other) {
-            return state(other) == State::done || state(other) == State::idle;
+            const State of = state(other);
+            return of == State::done || of == State::idle || of == State::yielding;
         };
         if (std::ranges::all_of(row.needs, isDone) && std::ranges::all_of(row.after, isOver)) launch(fact);
     }
+}
+
+void Phase::yield(Fact fact) {
+    if (state(fact) != State::running) return;
+    state(fact) = State::yielding;
+    launchWhatCan();
 }
 
 void Phase::trace(const char* fact, Clock::time_point begin) const {
@@ -102,8 +109,9 @@ void Phase::launch(Fact fact) {
     workers_.start([self = shared_from_this(), &row]() -> Workers::Publication {
         const Clock::time_point begin = Clock::now();
         const Until until{self->stop_, begin + row.most};
-        Store store =
-            row.gather({self->facts_, self->topic_, self->startedAt_, self->sources_, until, row.loss});
+        const auto yield = [self, &row] { self->workers_.post([self, &row] { self->yield(row.fact); }); };
+        Store store = row.gather(
+            {self->facts_, self->topic_, self->startedAt_, self->sources_, until, row.loss, yield});
         if (self->sources_.traced) self->trace(row.name, begin);
         return [self, &row, store = std::move(store)] {
             store(self->facts_);

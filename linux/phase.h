@@ -49,7 +49,7 @@ class Phase : public std::enable_shared_from_this<Phase> {
     bool isReady(const NumberedTest& test) const;
 
   private:
-    enum class State { idle, wanted, running, done };
+    enum class State { idle, wanted, running, yielding, done };
 
     State& state(Fact fact) { return states_[static_cast<std::size_t>(fact)]; }
     State state(Fact fact) const { return states_[static_cast<std::size_t>(fact)]; }
@@ -58,6 +58,8 @@ class Phase : public std::enable_shared_from_this<Phase> {
     void want(Fact fact);
     void launchWhatCan();
     void launch(Fact fact);
+    /// Lets those begin that wait for a fact which is still being gathered.
+    void yield(Fact fact);
     void trace(const char* fact, Clock::time_point begin) const;
 
     PhaseTopic topic_;

@@ -39,6 +39,15 @@ void putFrequencies(NetlinkRequest& request, const ScanOrder& order) {
     request.endNest(list);
 }
 
+/// Of the channels of 6 GHz a radio that scans by itself then visits those alone on which networks of that band
+/// announce themselves, and those that access points of the other bands name (IEEE 802.11ax, 26.17.2.3).
+void putFlags(NetlinkRequest& request, const ScanOrder& order) {
+    constexpr std::uint32_t k6GHzFrom = 5945;
+    const bool visits6GHz =
+        std::ranges::any_of(order.frequencies, [](auto each) { return each >= k6GHzFrom; });
+    if (visits6GHz) request.put(NL80211_ATTR_SCAN_FLAGS, std::uint32_t{NL80211_SCAN_FLAG_COLOCATED_6GHZ});
+}
+
 /// What a reader made of an answer, or why there is none.
 template <class T>
 Known<T> orReason(std::optional<T> read, const std::string& what) {
@@ -75,6 +84,12 @@ std::int64_t bootMilliseconds() {
     timespec now{};
     clock_gettime(CLOCK_BOOTTIME, &now);
     return std::int64_t{now.tv_sec} * 1000 + now.tv_nsec / 1000000;
+}
+
+void putOrder(NetlinkRequest& request, const ScanOrder& order) {
+    putNames(request, order);
+    putFrequencies(request, order);
+    putFlags(request, order);
 }
 
 RadioSocket::RadioSocket(NetlinkSocket questions, NetlinkSocket events, RadioFamily family)
@@ -160,8 +175,7 @@ int RadioSocket::startScan(std::uint32_t interfaceIndex, const ScanOrder& order,
     NetlinkRequest request(family_.number, 0);
     request.header<genlmsghdr>() = {NL80211_CMD_TRIGGER_SCAN, 0, 0};
     request.put(NL80211_ATTR_IFINDEX, interfaceIndex);
-    putNames(request, order);
-    putFrequencies(request, order);
+    putOrder(request, order);
     receiveWaitingEvents();
     arrived_.clear();
     const int error = questions_.ask(request, until).error;

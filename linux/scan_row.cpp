@@ -8,7 +8,7 @@ namespace {
 
 // Long enough that an access point hands over what it kept meanwhile, and that a short exchange goes to and fro. The
 // kernel itself stays for a fifth of a second (mac80211, HZ / 5).
-constexpr std::chrono::milliseconds kAtHome{40};
+constexpr std::chrono::milliseconds kAtHome{30};
 
 /// Channels 1, 6 and 11, which alone do not overlap; then those of 5 GHz on which no radar must be waited for.
 constexpr std::array<std::uint32_t, 12> kLikely = {2412, 2437, 2462, 5180, 5200, 5220,

@@ -20,6 +20,8 @@ class Workers {
 
     /// Runs `work` on a thread of its own and then what it returns on the owner's. The owner's thread.
     void start(std::function<Publication()> work);
+    /// What work has to say before it is done, for the owner's thread. *Any* thread.
+    void post(Publication publication) { inbox_.post(std::move(publication)); }
 
   private:
     Inbox& inbox_;

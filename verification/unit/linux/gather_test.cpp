@@ -8,6 +8,7 @@
 #include <algorithm>
 #include <filesystem>
 #include <fstream>
+#include <future>
 
 #include "linux/fact_table.h"
 #include "linux/gather_reach.h"
@@ -82,7 +83,8 @@ TEST(GatherRadio, WithoutTheInterfaceSaysWhatIsMissing) {
 TEST(GatherRadio, OfALinkThatHasJoinedNothingNothingIsAsked) {
     EchoSocket socket;
     EXPECT_EQ(textOf(gatherStation(notJoined(), patience())), "lo is not joined to a network (code 2)");
-    EXPECT_EQ(textOf(gatherGatewayEcho(notJoined(), socket, patience())),
+    EXPECT_EQ(textOf(gatherGatewayEcho(
+                  notJoined(), socket, [] {}, patience())),
               "lo is not joined to a network (code 2)");
     Link down = notJoined();
     down.up = false;
@@ -110,11 +112,40 @@ TEST(GatherAddresses, OfLoopbackReachNobody) {
 
 TEST(GatherEcho, NeedsARouter) {
     EchoSocket socket;
-    EXPECT_EQ(textOf(gatherGatewayEcho(loopback(), socket, patience())), "lo has no default route (code 2)");
-    EXPECT_EQ(textOf(gatherOutsideEcho(loopback(), {}, socket, patience())),
+    EXPECT_EQ(textOf(gatherGatewayEcho(
+                  loopback(), socket, [] {}, patience())),
               "lo has no default route (code 2)");
-    EXPECT_EQ(textOf(gatherOutsideEcho(notJoined(), {}, socket, patience())),
+    EXPECT_EQ(textOf(gatherOutsideEcho(
+                  loopback(), {}, socket, [] {}, patience())),
+              "lo has no default route (code 2)");
+    EXPECT_EQ(textOf(gatherOutsideEcho(
+                  notJoined(), {}, socket, [] {}, patience())),
               "lo is not joined to a network (code 2)");
+}
+
+/// Who of five echo requests to an address was answered, and how often silence was told meanwhile.
+std::pair<Known<Echo>, int> echoFrom(std::vector<std::uint8_t> address) {
+    EchoSocket socket;
+    int silences = 0;
+    Known<Echo> echo = socket.ask(
+        {Address::Family::ipv4, std::move(address), 0}, "lo", loopback().interfaceIndex, [&] { ++silences; },
+        patience());
+    return {std::move(echo), silences};
+}
+
+TEST(EchoSocket, TellsOfSilenceOnceAndOnlyWhereNothingIsAnswered) {
+    const auto isAnswered = [](const std::optional<double>& each) { return each.has_value(); };
+    // An address of documentation's (RFC 5737): what leaves for it by the loopback interface reaches nobody.
+    auto unanswered = std::async(std::launch::async, [] { return echoFrom({192, 0, 2, 1}); });
+    const auto [echo, silences] = echoFrom({127, 0, 0, 1});
+    const auto [none, silencesOfNone] = unanswered.get();
+
+    ASSERT_TRUE(echo) << echo.error().text();
+    ASSERT_TRUE(none) << none.error().text();
+    EXPECT_TRUE(std::ranges::all_of(echo->roundTrips, isAnswered));
+    EXPECT_EQ(0, silences);
+    EXPECT_TRUE(std::ranges::none_of(none->roundTrips, isAnswered));
+    EXPECT_EQ(1, silencesOfNone);
 }
 
 TEST(GatherReach, WithoutARouterNothingIsSearched) {

@@ -1,6 +1,8 @@
 #include "linux/scan_row.h"
 
 #include <gtest/gtest.h>
+#include <linux/genetlink.h>
+#include <linux/nl80211.h>
 
 #include <chrono>
 #include <string_view>
@@ -148,6 +150,44 @@ TEST(LikelyFirst, PutsTheOwnChannelThenTheUsualOnesAndKeepsEachGroupAsItWas) {
     Frequencies order;
     for (const RadioChannel& each : channels) order.push_back(each.frequency);
     EXPECT_EQ((Frequencies{5500, 2412, 2437, 5180, 5745, 2417, 5260}), order);
+}
+
+/// What a request for a scan of this order says to the kernel, attribute by attribute.
+class Request {
+  public:
+    explicit Request(const ScanOrder& order) : request_(16, 0) {
+        request_.header<genlmsghdr>() = {NL80211_CMD_TRIGGER_SCAN, 0, 0};
+        putOrder(request_, order);
+    }
+    Attributes attributes() {
+        const auto* const bytes = reinterpret_cast<const std::uint8_t*>(&request_.message());
+        return Attributes(Bytes(bytes, request_.message().nlmsg_len).subspan(NLMSG_HDRLEN + GENL_HDRLEN));
+    }
+
+  private:
+    NetlinkRequest request_;
+};
+
+TEST(ScanOrder, NamesItsChannelsInTheirOrderAndNoNameWhereItListens) {
+    Request request(listeningOn({2437, 2412}));
+
+    Frequencies named;
+    request.attributes().nested(NL80211_ATTR_SCAN_FREQUENCIES).forEach([&](std::uint16_t, Bytes content) {
+        named.push_back(Attributes::numberIn<std::uint32_t>(content).value_or(0));
+    });
+    EXPECT_EQ((Frequencies{2437, 2412}), named);
+    EXPECT_FALSE(request.attributes().has(NL80211_ATTR_SCAN_SSIDS));
+    EXPECT_FALSE(request.attributes().has(NL80211_ATTR_SCAN_FLAGS));
+}
+
+TEST(ScanOrder, LeavesItToTheKernelWhichChannelsOf6GHzAnnounceNetworks) {
+    for (const std::uint32_t frequency : {5955, 7115}) {
+        const auto flags = Request(listeningOn({2412, frequency}))
+                               .attributes()
+                               .number<std::uint32_t>(NL80211_ATTR_SCAN_FLAGS);
+        EXPECT_EQ(NL80211_SCAN_FLAG_COLOCATED_6GHZ, flags) << frequency;
+    }
+    EXPECT_FALSE(Request(listeningOn({5885})).attributes().has(NL80211_ATTR_SCAN_FLAGS));
 }
 
 }  // namespace
