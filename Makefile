@@ -8,9 +8,10 @@ MONKEY_SEED ?= 2
 
 PROGRAM := wifi-profile wifi-profile-service wifi-profile-extension
 
-.PHONY: help run test build build-all bench lab fuzz monkey
+.PHONY: help run tv test build build-all bench lab fuzz monkey
 help:
 	@echo "make run      build, and profile this machine's Wi-Fi (without a radio: replay the demo recording)"
+	@echo "make tv       build, and choose a network on the television screen: in a window, or on a console's whole screen"
 	@echo "make build    build/wifi-profile"
 	@echo "make test     all tests but those of the lab"
 	@echo "make lab      system tests in a virtual machine with simulated radios"
@@ -27,11 +28,17 @@ build-all:
 	@cmake --preset dev > /dev/null
 	@cmake --build build -j $(JOBS)
 
+tv: GROUP := tv
+tv: MODULE := wifi-profile-screen-tv
+tv: OPTIONS := --list --screen tv
+# On a desktop a window, so that the rest of it stays in sight.
+tv: export WIFI_PROFILE_TV_SIZE ?= $(if $(DISPLAY)$(WAYLAND_DISPLAY),1280x720)
 # Standard output is the result's alone.
-run:
-	@{ verification/install_packages build test && $(MAKE) -s build; } >&2
-	@if compgen -G '/sys/class/ieee80211/*' > /dev/null; then exec build/wifi-profile run; \
-	else echo "No Wi-Fi radio here: replaying the demo recording 'home'." >&2; exec build/wifi-profile run --demo home; fi
+run tv:
+	@{ verification/install_packages build test $(GROUP) && $(MAKE) -s build PROGRAM="$(PROGRAM) $(MODULE)"; } >&2
+	@if compgen -G '/sys/class/ieee80211/*' > /dev/null; then exec build/wifi-profile run $(OPTIONS); \
+	else echo "No Wi-Fi radio here: replaying the demo recording 'home'." >&2; \
+	exec build/wifi-profile run --demo home $(OPTIONS); fi
 
 test:
 	@verification/run_tests
