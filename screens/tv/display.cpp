@@ -162,6 +162,8 @@ void Display::makeApplication() {
     // The scene has its own unit, so that it fits screens coarser than its points too; the toolkit's scaling only
     // makes finer. With 72 dots to the inch a font's size is in dots, with fractions.
     qputenv("QT_ENABLE_HIGHDPI_SCALING", "0");
+    // A desktop's factors would come on top: texts would be measured in one size and drawn in another.
+    for (const char* factor : {"QT_SCALE_FACTOR", "QT_SCREEN_SCALE_FACTORS"}) qunsetenv(factor);
     qputenv("QT_FONT_DPI", "72");
     application_ = std::make_unique<QGuiApplication>(count, arguments);
     // The application takes over the environment's locale; numbers in documents keep their point.

@@ -59,6 +59,18 @@ Rectangle {
             font.hintingPreference: Font.PreferNoHinting
             color: "#6a7281"
         }
+        // The text goes on beyond this edge.
+        Rectangle {
+            visible: typed.x < 0
+            y: 8 * field.u
+            width: 72 * field.u
+            height: parent.height - 2 * y
+            gradient: Gradient {
+                orientation: Gradient.Horizontal
+                GradientStop { position: 0; color: field.color }
+                GradientStop { position: 1; color: "#00f1f3f7" }
+            }
+        }
         Rectangle {
             objectName: "cursor"
             x: typed.x + field.cursorX

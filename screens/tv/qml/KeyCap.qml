@@ -14,7 +14,7 @@ Item {
 
     readonly property bool isMuted: look ? !look.isEnabled : false
     // Signs are drawn larger than words, which share their key with more letters.
-    readonly property int fontSize: !look || !look.isFunction ? 34 : look.label.length > 2 ? 27 : 40
+    readonly property int fontSize: !look || !look.isFunction ? 34 : look.label.length > 1 ? 27 : 40
     readonly property real wantedFocus: look && look.isFocused ? 1 : 0
     readonly property bool isMoving: focusLook.opacity !== wantedFocus
 

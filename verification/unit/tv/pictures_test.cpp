@@ -444,6 +444,15 @@ TEST_F(HostPictures, ClosingPageOfThreeProblems) {
     expectPicture("closing_end");
 }
 
+TEST_F(HostPictures, ClosingPageWithTheDesktopsScaleFactors) {
+    setenv("QT_SCALE_FACTOR", "2", 1);
+    setenv("QT_SCREEN_SCALE_FACTORS", "1.5", 1);
+    showClosingPage("en", threeProblems());
+
+    QImage good(QString::fromStdString((kGood / "closing.png").string()));
+    EXPECT_EQ(compare(good, picture("scaled")).what, "");
+}
+
 TEST_F(HostPictures, ClosingPageInGerman) {
     showClosingPage("de", threeProblems());
 
