@@ -203,10 +203,7 @@ std::optional<std::string> Run::drive() {
     isUnderWay_ = true;
     if (!isBrokenOff()) controller_->start();
     remote::RemoteControl remote({screen_, *frontEnd_, mainQueue_, activity_, [this] { return isOver(); },
-                                  [this](std::string_view line) { transcript_->add(line); },
-                                  [this](std::string_view line) {
-                                      if (!interruption_->exitStatus()) log_.note(line);
-                                  }});
+                                  [this](std::string_view line) { transcript_->add(line); }});
     return remote.play(prepared_.script);
 }
 

@@ -1,6 +1,5 @@
 #include "screens/remote/remote_control.h"
 
-#include <algorithm>
 #include <chrono>
 
 #include "screens/remote/snapshot.h"
@@ -45,24 +44,12 @@ class WakeWhenIdle {
 
 std::optional<std::string> RemoteControl::play(const Script& script) {
     WakeWhenIdle wakeWhenIdle(parts_.activity, parts_.queue);
-    for (Steps left = script.steps; !left.empty(); left = left.subspan(1)) {
+    for (const Step& step : script.steps) {
         parts_.queue.runPending();
-        if (parts_.isOver()) {
-            noteIgnored(left);
-            return std::nullopt;
-        }
-        const Step& step = left.front();
+        if (parts_.isOver()) return std::nullopt;
         if (auto reason = perform(step)) return step.place + ": " + *reason;
     }
     return waitForEnd();
-}
-
-void RemoteControl::noteIgnored(Steps left) {
-    // Whoever only waited has missed nothing.
-    auto first = std::ranges::find_if(
-        left, [](const Step& step) { return step.action != Action::wait && step.action != Action::sleep; });
-    if (first == left.end()) return;
-    parts_.note(first->place + ": ignored with what follows it, for the run was over");
 }
 
 std::optional<std::string> RemoteControl::perform(const Step& step) {

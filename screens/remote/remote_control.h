@@ -2,7 +2,6 @@
 
 #include <functional>
 #include <optional>
-#include <span>
 #include <string>
 #include <string_view>
 
@@ -17,8 +16,8 @@ namespace wp::remote {
 /// Drives one run to its end: plays a script on any front end, then leaves the run to whoever holds the
 /// remote. *Main*.
 ///
-/// Before each step the main queue runs empty. Steps left when the run is over are ignored, and it is told
-/// which was the first of them. While the script plays it is the activity's idle handler.
+/// Before each step the main queue runs empty. Steps left when the run is over are ignored. While the script
+/// plays it is the activity's idle handler.
 class RemoteControl {
   public:
     struct Parts {
@@ -30,8 +29,6 @@ class RemoteControl {
         std::function<bool()> isOver;
         /// Takes one snapshot, a line without its newline.
         std::function<void(std::string_view)> transcript;
-        /// Takes one line about something that its author would not expect of the script.
-        std::function<void(std::string_view)> note;
     };
 
     explicit RemoteControl(Parts parts) : parts_(std::move(parts)) {}
@@ -42,10 +39,7 @@ class RemoteControl {
     std::optional<std::string> play(const Script& script);
 
   private:
-    using Steps = std::span<const Step>;
-
     std::optional<std::string> perform(const Step& step);
-    void noteIgnored(Steps left);
     std::optional<std::string> edit(const Step& step);
     bool isAtRest() const;
     void waitForRest();

@@ -26,8 +26,7 @@ class RemoteControlTest : public testing::Test {
         Script script = readScript(text, Pictures::refused);
         EXPECT_EQ(script.error, std::nullopt);
         return RemoteControl({screen, frontEnd, queue, activity, [this] { return isOver; },
-                              [this](std::string_view line) { transcript.emplace_back(line); },
-                              [this](std::string_view line) { notes.emplace_back(line); }})
+                              [this](std::string_view line) { transcript.emplace_back(line); }})
             .play(script);
     }
 
@@ -36,7 +35,7 @@ class RemoteControlTest : public testing::Test {
     std::shared_ptr<SampleController> controller = std::make_shared<SampleController>();
     ui::Screen screen;
     headless::HeadlessScreen frontEnd{screen, queue};
-    std::vector<std::string> transcript, notes;
+    std::vector<std::string> transcript;
     bool isOver = false;
 };
 
@@ -49,18 +48,10 @@ TEST_F(RemoteControlTest, PressesKeysUntilTheRunIsOver) {
 }
 
 TEST_F(RemoteControlTest, IgnoresStepsThatAreLeftWhenTheRunIsOver) {
-    auto reason = play("back wait screen type:x");
+    auto reason = play("back screen type:x");
 
     EXPECT_EQ(reason, std::nullopt);
     EXPECT_TRUE(transcript.empty());
-    EXPECT_EQ(notes, std::vector<std::string>{
-                         "token 3 \"screen\": ignored with what follows it, for the run was over"});
-}
-
-TEST_F(RemoteControlTest, NotesNothingWhereOnlyWaitsAreLeft) {
-    play("back wait sleep:1");
-
-    EXPECT_TRUE(notes.empty());
 }
 
 TEST_F(RemoteControlTest, TypesIntoTheFocusedField) {
