@@ -9,7 +9,7 @@
 
 namespace wp {
 
-/// Called when a whole row of echo requests seems to be lost.
+/// Called when a whole row of echo requests seems to be lost, at most once a row, on the thread that asks.
 using WhenSilent = std::function<void()>;
 
 /// Sends echo requests. It is opened while the program still has its privileges; sending needs none. One row of

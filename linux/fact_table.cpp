@@ -201,7 +201,7 @@ constexpr Fact kWhileQuiet[] = {Fact::gatewayEcho, Fact::outsideEcho, Fact::airt
 constexpr FactRow kRows[] = {
     // fact                     name                   needs          after          most  gather               loss
     {Fact::link,                "link",                 {},            {},            3s,   link,                "anything about Wi-Fi"},
-    // The slowest radios listen through two bands in 16 s.
+    // The slowest radios listen through two bands in 12 s.
     {Fact::nearby,              "nearby",               kLink,         kOnChannel,    30s,  nearby,              "which networks are near"},
     {Fact::listened,            "listened",             kLink,         kWhileQuiet,   20s,  listened,            "which networks hide"},
     {Fact::station,             "station",              kLink,         {},            3s,   station,             "how strong the signal is"},

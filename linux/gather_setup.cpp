@@ -103,7 +103,9 @@ LinkSetup setupFromNetworkManager(Known<Bus>& bus, const Link& link, const Netwo
     setup.nameServers = managedNameServers(bus, link, managed, until);
     setup.portalApi = portalApiIn(managed.lease4);
     if (setup.portalApi.empty()) setup.portalApi = portalApiIn(managed.lease6);
-    setup.leaseText = failure(Reason::unavailable, "NetworkManager has no lease of IPv4");
+    setup.leaseText =
+        failure(Reason::unavailable, managed.offerRead ? "NetworkManager has no lease of IPv4"
+                                                       : "NetworkManager's lease could not be read");
     if (!managed.lease4.empty())
         setup.leaseText = plainText(optionOf(managed.lease4, "vendor_encapsulated_options") + " " +
                                     optionOf(managed.lease4, "vendor_class_identifier"));
@@ -157,7 +159,8 @@ ClientLeases readClientLeases(const Link& link, const std::vector<AssignedAddres
     const std::time_t now = std::time(nullptr);
     DhcpcdLeases kept = findDhcpcdLeases(link.interfaceName, addresses, now);
     auto ofDhclient = findLease(link.interfaceName, now);
-    return {ofDhclient ? std::move(ofDhclient) : std::move(kept.ipv4), std::move(kept.ipv6)};
+    // Only dhcpcd's was held against the interface's addresses.
+    return {kept.ipv4 ? std::move(kept.ipv4) : std::move(ofDhclient), std::move(kept.ipv6)};
 }
 
 /// The name servers where no manager tells: by the leases, else by who can have named them at all.
@@ -186,7 +189,8 @@ Known<LinkSetup> setupFromKernel(Known<Bus>& bus, const Link& link, const Until&
     const DhcpClients clients = dhcpClientsOf(link.interfaceName);
     const bool client = leases.ipv4 || clients.any;
     KernelIPv6 switches = kernelSwitches(link.interfaceName);
-    switches.acceptsAdvertisements |= clients.askRouters || iwdManages(bus, link, until);
+    switches.setByClient = clients.asksRouters;
+    switches.acceptsAdvertisements |= clients.asksRouters || iwdManages(bus, link, until);
     LinkSetup setup;
     setup.toldBy = "addresses";
     setup.methods = {methodFromIPv4Addresses(assigned, client), methodFromIPv6Addresses(assigned, switches)};

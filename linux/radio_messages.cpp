@@ -138,6 +138,11 @@ bool RadioChannel::carriesNetworks() const {
     return (frequency - kChannel149) % 20 == 0;
 }
 
+bool RadioChannel::isForScanning() const {
+    constexpr std::uint32_t k6GHzFrom = 5945, kChannel5 = 5975;
+    return frequency < k6GHzFrom || (frequency >= kChannel5 && (frequency - kChannel5) % 80 == 0);
+}
+
 std::optional<RadioFamily> readFamily(Bytes buffer) {
     std::optional<RadioFamily> family;
     forEachOf(CTRL_CMD_NEWFAMILY, buffer, [&](const Attributes& message) {

@@ -55,6 +55,9 @@ struct RadioChannel {
     /// Whether a network of a home can be there. From 5850 MHz on kernels also list the channels of vehicles, 5 and
     /// 10 MHz wide, between those of 20 MHz (IEEE 802.11, operating class 125), and below 1 GHz those of meters.
     bool carriesNetworks() const;
+    /// Whether it is to be looked at when networks are looked for: of 6 GHz those channels alone on which networks of that
+    /// band announce themselves, every fourth one of 20 MHz from channel 5 on (IEEE 802.11ax, 26.17.2.3).
+    bool isForScanning() const;
 };
 
 /// What a radio can do.

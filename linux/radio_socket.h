@@ -16,7 +16,7 @@ struct ScanOrder {
     // With neither names nor `probeForAll` the scan only listens.
 };
 
-/// Puts the order's names, channels and flags into a request for a scan.
+/// Puts the order's names, channels and flags into a request for a scan. *Any* thread.
 void putOrder(NetlinkRequest& request, const ScanOrder& order);
 
 /// Questions about radios to the kernel. One thread at a time; every question blocks until its answer or the end

@@ -49,12 +49,19 @@ void ScanRow::ended(Whose whose, const ScanEvent& event) {
     const bool own = whose == Whose::own;
     wasAway_ = slicing_.wanted && !(own && asked.front() == slicing_.home);
     ++starts_;
+    wasHeard_ |= own && event.kind == ScanEvent::Kind::finished;
     if (event.kind != ScanEvent::Kind::finished)
         aborts_ += own ? 1 : 0;
     else if (own)
         leaveOut(asked);
     else if (isAsGood(event))
         leaveOut(event.frequencies);
+}
+
+bool ScanRow::skip() {
+    const bool isSkipped = slicing_.wanted && wasHeard_;
+    if (isSkipped) leaveOut(next().frequencies);
+    return isSkipped;
 }
 
 void ScanRow::leaveOut(std::span<const std::uint32_t> visited) {

@@ -10,7 +10,7 @@
 namespace wp {
 
 /// The order in which channels are visited: where a scan is cut short, most that is near has been heard. The own
-/// channel, then those on which most homes are, then the rest, each group as it was.
+/// channel, then those on which most homes are, then the rest, each group as it was. *Any* thread.
 /// @param home MHz, of the joined network
 void putLikelyFirst(std::vector<RadioChannel>& channels, std::optional<std::uint32_t> home);
 
@@ -39,6 +39,9 @@ class ScanRow {
     enum class Whose { own, others };
     /// The scan that was asked for, or the one of others that was in its way, came to an end.
     void ended(Whose whose, const ScanEvent& event);
+    /// Goes on without the request's channel, which the kernel refuses though it took others before: what a radio may use
+    /// can change between two requests. False where nothing tells that it is the channel.
+    bool skip();
 
   private:
     static constexpr int kStarts = 4;
@@ -51,7 +54,7 @@ class ScanRow {
     ScanSlicing slicing_;
     std::vector<std::uint32_t> remaining_;  ///< MHz
     int starts_ = 0, aborts_ = 0;           ///< of the present request
-    bool wasAway_ = false, isComplete_ = false;
+    bool wasAway_ = false, wasHeard_ = false, isComplete_ = false;
 };
 
 }  // namespace wp

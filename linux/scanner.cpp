@@ -37,6 +37,10 @@ class ScanRun {
                       [](const RadioChannel& each) { return each.disabled || !each.carriesNetworks(); });
         slicing_.home = homeOfRadio();
         slicing_.wanted = slicing_.home && abilities_.scansInSoftware;
+        // A radio that scans by itself is told so by a flag instead.
+        if (slicing_.wanted)
+            std::erase_if(abilities_.channels,
+                          [](const RadioChannel& each) { return !each.isForScanning(); });
         putLikelyFirst(abilities_.channels, slicing_.home);
     }
 
@@ -153,6 +157,7 @@ class ScanRun {
     /// Makes the row's next request and waits until the scan, or the one that is in its way, has ended.
     std::optional<Error> visit(ScanRow& row) {
         const int error = radio_.startScan(wish_.interfaceIndex, row.next(), until_);
+        if (error == EINVAL && row.skip()) return std::nullopt;
         if (error != 0 && error != EBUSY) return startFailure(error);
         if (error == EBUSY && slicing_.wanted) keepHeard();
         const Known<ScanEvent> event = radio_.nextScanEnd(wish_.interfaceIndex, until_);

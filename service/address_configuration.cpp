@@ -33,7 +33,11 @@ Known<std::string> methodFromIPv6Addresses(const std::vector<AssignedAddress>& a
     bool dynamic = false;
     for (const AssignedAddress& each : addresses) {
         if (each.address.isIPv4() || each.address.linkLocal() || each.address.loopback()) continue;
-        if (each.permanent && !each.byAdvertisement) return std::string("static");
+        const bool withoutEnd = each.permanent && !each.byAdvertisement;
+        if (withoutEnd && kernel.setByClient)
+            return failure(Reason::unavailable,
+                           "a client sets addresses of IPv6 itself and does not tell whence it has them");
+        if (withoutEnd) return std::string("static");
         dynamic = true;
     }
     if (dynamic || kernel.acceptsAdvertisements) return std::string("dynamic");

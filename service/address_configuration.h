@@ -27,12 +27,14 @@ struct AssignedAddress {
 struct KernelIPv6 {
     bool disabled = false;
     bool acceptsAdvertisements = true;
+    /// A client looks at advertisements in the kernel's place, and sets what they grant without an end as a person would.
+    bool setByClient = false;
 };
 
 /// The method of IPv4 as the addresses give it away: an address without an end that no lease accounts for was
 /// put there by hand. No address at all tells nothing. *Any* thread.
 Known<std::string> methodFromIPv4Addresses(const std::vector<AssignedAddress>& addresses, bool hasLease);
-/// The same for IPv6. *Any* thread.
+/// The same for IPv6, where a client's address without an end tells nothing. *Any* thread.
 Known<std::string> methodFromIPv6Addresses(const std::vector<AssignedAddress>& addresses,
                                            const KernelIPv6& kernel);
 

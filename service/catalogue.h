@@ -22,7 +22,7 @@ struct NumberedTest {
     Subject subject;
     std::span<const Fact> needs;
     Outcome (*verdict)(const Facts& facts);  ///< null while the test is not measured yet
-    Details (*details)(const Facts& facts);  ///< what was measured beyond it
+    Details (*details)(const Facts& facts);  ///< what was measured beyond it; never null
 };
 
 /// All tests, ordered by number. *Any* thread.

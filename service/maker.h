@@ -67,6 +67,7 @@ struct HotspotMatches {
     bool leaseText = false;
     bool any() const { return element || addressPrefix || leaseText; }
 };
+/// Which of the vendor's rules match. *Any* thread.
 /// \param leaseText the vendor's text in the lease, for the joined network only; else why there is none
 HotspotMatches hotspotMatches(const AccessPoint& accessPoint, const Known<std::string>& leaseText,
                               const Vendors::Hotspot& vendor);

@@ -62,8 +62,9 @@ const Client* clientIn(const std::vector<std::string>& words) {
 DhcpClients dhcpClientsOf(const std::string& interfaceName, const std::string& root) {
     DhcpClients clients;
     std::error_code failed;
-    for (const auto& entry : std::filesystem::directory_iterator(root + "/proc", failed)) {
-        const std::string folder = entry.path().string(), name = entry.path().filename().string();
+    std::filesystem::directory_iterator entry(root + "/proc", failed);
+    for (; !failed && entry != std::filesystem::directory_iterator(); entry.increment(failed)) {
+        const std::string folder = entry->path().string(), name = entry->path().filename().string();
         if (name.find_first_not_of("0123456789") != name.npos) continue;
         const auto command = readSmallFile(folder + "/cmdline", 4096);
         if (!command) continue;
@@ -71,7 +72,7 @@ DhcpClients dhcpClientsOf(const std::string& interfaceName, const std::string& r
         const Client* client = clientIn(words);
         if (client == nullptr || !looksAfter(words, interfaceName)) continue;
         clients.any = true;
-        clients.askRouters |= client->asksRouters;
+        clients.asksRouters |= client->asksRouters;
     }
     return clients;
 }

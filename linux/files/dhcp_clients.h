@@ -8,9 +8,9 @@ namespace wp {
 /// an automatic address from one that was entered.
 struct DhcpClients {
     bool any = false;
-    bool askRouters =
-        false;  ///< one looks at routers' advertisements itself, and has the kernel leave them alone
+    bool asksRouters = false;  ///< one looks at advertisements itself, and has the kernel leave them alone
 };
+/// The clients among the processes that this user sees. *Any* thread.
 /// \param root a root folder
 DhcpClients dhcpClientsOf(const std::string& interfaceName, const std::string& root = "");
 

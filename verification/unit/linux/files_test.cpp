@@ -194,10 +194,10 @@ TEST_F(Root, HasADhcpClientThatShowsATitleInPlaceOfItsCommandLine) {
 
 TEST_F(Root, HasADhcpClientThatLooksAtAdvertisementsItself) {
     write("/proc/12/cmdline", commandOf({"udhcpc", "-i", "wlan0"}));
-    EXPECT_FALSE(dhcpClientsOf("wlan0", root_).askRouters);
+    EXPECT_FALSE(dhcpClientsOf("wlan0", root_).asksRouters);
     write("/proc/13/cmdline", commandOf({"/usr/sbin/dhcpcd", "wlan0"}));
-    EXPECT_TRUE(dhcpClientsOf("wlan0", root_).askRouters);
-    EXPECT_FALSE(dhcpClientsOf("wlan1", root_).askRouters);
+    EXPECT_TRUE(dhcpClientsOf("wlan0", root_).asksRouters);
+    EXPECT_FALSE(dhcpClientsOf("wlan1", root_).asksRouters);
 }
 
 TEST_F(Root, FilesThatAreTooLongOrNoFilesAreNotRead) {

@@ -166,6 +166,18 @@ TEST(RadioMessages, KnowTheChannelsOfVehiclesFromThoseOfNetworks) {
     EXPECT_LT(leftOut.back(), 5955U);
 }
 
+TEST(RadioMessages, KnowTheFifteenChannelsOf6GHzOnWhichNetworksAnnounceThemselves) {
+    std::vector<std::uint32_t> announcing;
+    for (std::uint32_t frequency = 5955; frequency <= 7115; frequency += 20)
+        if (RadioChannel{frequency, false, false, false}.isForScanning()) announcing.push_back(frequency);
+
+    EXPECT_EQ(announcing.size(), 15U);
+    EXPECT_EQ(announcing.front(), 5975U);  // channel 5
+    EXPECT_EQ(announcing.back(), 7095U);   // channel 229
+    for (const std::uint32_t below : {2412, 2484, 5180, 5885})
+        EXPECT_TRUE((RadioChannel{below, false, false, false}.isForScanning())) << below;
+}
+
 TEST(RadioMessages, TellStartAndEndOfScans) {
     const auto events = readScanEvents(captured("good-home-scan_events"));
 

@@ -55,6 +55,22 @@ TEST(ScanRow, IsOneRequestWhereTheRadioScansByItselfOrIsNotJoined) {
     EXPECT_EQ(expected, requestsOf({listeningOn({2437, 2412, 5180}), {}}));
 }
 
+TEST(ScanRow, GoesOnWithoutAChannelThatIsRefusedAfterOthers) {
+    ScanRow row(listeningOn({2437, 2412, 5180}), kJoinedInSoftware);
+    EXPECT_FALSE(row.skip());
+    row.ended(ScanRow::Whose::own, finished());
+
+    EXPECT_TRUE(row.skip());
+    EXPECT_EQ(Frequencies{5180}, row.next().frequencies);
+    row.ended(ScanRow::Whose::own, finished());
+    EXPECT_TRUE(row.isComplete());
+}
+
+TEST(ScanRow, BlamesNoChannelWhereAllAreAskedForAtOnce) {
+    ScanRow row(listeningOn({2437, 2412}), {});
+    EXPECT_FALSE(row.skip());
+}
+
 TEST(ScanRow, IsOneRequestForAllChannelsWhereNoneIsNamed) {
     for (const ScanSlicing& slicing : {ScanSlicing{}, kJoinedInSoftware})
         EXPECT_EQ(std::vector<Frequencies>{{}}, requestsOf({listeningOn({}), slicing}));

@@ -66,6 +66,16 @@ TEST(AddressConfiguration, IPv6OfARoutersAdvertisementIsDynamicEvenWithoutAnEnd)
     EXPECT_EQ(*methodFromIPv6Addresses({byHand}, {true, false}), "disabled");
 }
 
+TEST(AddressConfiguration, IPv6WithoutAnEndThatAClientMayHaveSetTellsNothing) {
+    const AssignedAddress withoutEnd{address("2001:db8::6"), true, false},
+        granted{address("2001:db8::7"), false, false};
+    const KernelIPv6 kernel{.setByClient = true};
+
+    EXPECT_EQ(methodFromIPv6Addresses({granted, withoutEnd}, kernel).error().code,
+              static_cast<int>(Reason::unavailable));
+    EXPECT_EQ(*methodFromIPv6Addresses({granted}, kernel), "dynamic");
+}
+
 NameServers servers(std::vector<IPAddress> manual, std::vector<IPAddress> effective,
                     std::vector<IPAddress> offered) {
     return {std::move(manual), std::move(effective), std::move(offered), true, {}};
