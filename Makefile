@@ -7,6 +7,10 @@ MONKEY_EVENTS ?= 1000000
 MONKEY_SEED ?= 2
 
 PROGRAM := wifi-profile wifi-profile-service wifi-profile-extension
+# What `tv` adds to `run`.
+GROUP :=
+MODULE :=
+OPTIONS :=
 
 .PHONY: help run tv test build build-all bench lab fuzz monkey
 help:

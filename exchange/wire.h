@@ -13,8 +13,8 @@ namespace wp {
 
 // The wire between the host and the service that it started: one JSON object a line, both ways, in UTF-8. The
 // service inherits its end of the socket pair as file descriptor `kWireDescriptor`, and speaks first: a greeting.
-// Every request but the cancelling carries a number of its own, and its answer carries the same; answers come in any order. Every
-// `…Line` function gives the whole line with its newline; every `read…` takes one line without it. *Any*
+// Every request but the cancelling carries a number of its own, and its answer carries the same; answers come in any
+// order. Every `…Line` function gives the whole line with its newline; every `read…` takes one line without it. *Any*
 // thread.
 
 constexpr int kWireDescriptor = 3;

@@ -3,9 +3,11 @@
 #include <filesystem>
 #include <variant>
 
+#include "exchange/json_reader.h"
 #include "exchange/wire.h"
 #include "host/exit.h"
 #include "host/modules/module_entry.h"
+#include "platform/json_writer.h"
 
 namespace wp::host {
 namespace {
@@ -32,6 +34,14 @@ Greeting greetingOf(ServiceProcess& process, const std::string& program) {
     if (const Refusal* refusal = std::get_if<Refusal>(&greeting))
         fail(program + ": tells the configuration in a form of its own: " + refusal->text());
     return std::get<Greeting>(std::move(greeting));
+}
+
+/// A file's name as the service's line carries it: what is no UTF-8 is replaced there.
+std::string asTold(const std::string& file) {
+    const std::variant<Value, Refusal> told = readJSON(jsonText(Value(file), JSONStyle::compact));
+    const Value* value = std::get_if<Value>(&told);
+    const std::string* text = value ? value->as<std::string>() : nullptr;
+    return text ? *text : file;
 }
 
 DictionaryPointer readDictionary(ObjectReader& object, std::string_view key) {
@@ -61,8 +71,10 @@ StartedService startService(const std::optional<std::string>& named,
     ServiceProcess process = startedProcess(program, arguments);
     const Greeting greeting = greetingOf(process, program);
     if (!greeting.configuration) {
-        const bool isNamed = named && greeting.refused.starts_with(*named + ": ");
-        refuse((isNamed ? "--config: " : "configuration: ") + greeting.refused);
+        const std::string told = named ? asTold(*named) : "";
+        const bool isNamed = named && greeting.refused.starts_with(told + ": ");
+        refuse(isNamed ? "--config: " + *named + greeting.refused.substr(told.size())
+                       : "configuration: " + greeting.refused);
     }
     try {
         return {std::move(process), configurationFrom(greeting.configuration)};

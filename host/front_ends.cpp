@@ -29,7 +29,7 @@ std::atomic<const terminal::Module*> terminalModule = nullptr;
 
 const terminal::Module& loadedTerminalModule() {
     const auto entry = moduleEntry(terminal::kModuleFileName, terminal::kEntryName);
-    if (const std::string* why = std::get_if<std::string>(&entry)) refuse("--screen: terminal: " + *why);
+    if (const std::string* why = std::get_if<std::string>(&entry)) fail("--screen: terminal: " + *why);
     terminalModule = reinterpret_cast<terminal::Entry*>(std::get<void*>(entry))();
     return *terminalModule;
 }

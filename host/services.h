@@ -29,8 +29,8 @@ class Services {
     virtual void writeRecording() {}
 };
 
-/// The services that the options ask for; a live run's take over the process that was prepared. The queue and the log, which takes the service's notes, must outlive
-/// them.
+/// The services that the options ask for; a live run's take over the process that was prepared. The queue and the log,
+/// which takes the service's notes, must outlive them.
 std::unique_ptr<Services> makeServices(const RunOptions& options, Preparation& prepared, MainQueue& mainQueue,
                                        DiagnosticsLog& log);
 

@@ -16,9 +16,11 @@ namespace wp::terminal {
 inline constexpr const char* kModuleFileName = "wifi-profile-screen-terminal.so";
 inline constexpr const char* kEntryName = "wifiProfileTerminalScreen";
 
+/// What the module does. *Main*, but for `restoreNow`.
 struct Module {
-    /// As `TerminalScreen` has both.
+    /// As `TerminalScreen::open`; the text says in one line why there is no screen.
     std::variant<std::unique_ptr<ui::FrontEnd>, std::string> (*open)(ui::Screen&, MainQueue&, Texts);
+    /// As `TerminalScreen::restoreNow`: leaves the terminal as it was. In a signal handler too.
     void (*restoreNow)();
 };
 

@@ -102,7 +102,7 @@ class TvScreen::Loop : private ui::ScreenObserver {
     std::optional<std::string> savePicture(const std::string& file) {
         update();
         QBuffer picture;
-        window_.grabWindow().save(&picture, "PNG");
+        if (!window_.grabWindow().save(&picture, "PNG")) return "there is no picture of the window";
         QFile target(QString::fromStdString(file));
         if (target.open(QIODevice::WriteOnly) && target.write(picture.data()) == picture.size() &&
             target.flush())
