@@ -75,6 +75,7 @@ PortalAnswer portalAnswer(const WebAnswer& answer, const WebRequest& request) {
     if (!portal.server && !request.addresses.empty()) portal.server = request.addresses.front();
     portal.why = answer.why;
     portal.clockOffset = answer.clockOffset;
+    portal.bodyIsWhole = answer.bodyCame == WebAnswer::Body::whole;
     return portal;
 }
 
@@ -117,7 +118,9 @@ ServiceContact contactOf(const WebAnswer& answer) {
     contact.clockOffset = answer.clockOffset;
     switch (answer.end) {
         case WebAnswer::End::answered:
-            contact.end = ServiceContact::End::reached;
+            // Content that comes slowly is judged by its beginning; what breaks off has not been handed over.
+            contact.end = answer.bodyCame == WebAnswer::Body::cutOff ? ServiceContact::End::failed
+                                                                     : ServiceContact::End::reached;
             break;
         case WebAnswer::End::badCertificate:
             contact.end = ServiceContact::End::badCertificate;

@@ -17,6 +17,16 @@ bool isRedirect(int status) {
     return status >= 300 && status <= 399 && status != 304;
 }
 
+// One byte is what some proxies add to an empty page.
+bool isEmptyPage(const PortalAnswer& plain) {
+    return plain.status == 200 && plain.bodySize <= 1;
+}
+
+/// Whether it tells anything; a page of which nothing came is not an empty one.
+bool isAnswer(const PortalAnswer& plain) {
+    return plain.end == End::answered && (plain.bodyIsWhole || !isEmptyPage(plain));
+}
+
 bool opens(const PortalAnswer& secure) {
     return secure.end == End::answered && secure.status >= 200 && secure.status <= 299;
 }
@@ -29,8 +39,7 @@ Known<PortalVerdict> judgePlain(const PortalAnswer& plain, const PortalAnswer& s
         return portal(PortalKind::redirect, plain.location.empty()
                                                 ? "suspected: status " + status + " to nowhere"
                                                 : "redirected with status " + status);
-    // One byte is what some proxies add to an empty page.
-    if (plain.status == 200 && plain.bodySize <= 1) {
+    if (isEmptyPage(plain)) {
         if (opens(secure)) return open("open: an empty page, and the secure probe got through");
         return failure(Reason::timeout, "an empty page over HTTP and no answer over HTTPS");
     }
@@ -57,8 +66,11 @@ Known<PortalVerdict> judgePortal(const PortalEvidence& evidence) {
         const std::string why = "the network's own API says so";
         return *evidence.declared.captive ? portal(PortalKind::declared, why) : open(why);
     }
-    if (evidence.plain.end == End::answered) return judgePlain(evidence.plain, evidence.secure);
+    if (isAnswer(evidence.plain)) return judgePlain(evidence.plain, evidence.secure);
     if (opens(evidence.secure)) return open("partial: HTTPS got through, HTTP did not");
+    if (evidence.plain.end == End::answered)
+        return failure(Reason::timeout,
+                       "the page over HTTP never came, and HTTPS did not get through: " + evidence.plain.why);
     if (evidence.plain.server && evidence.plain.server->privateUse())
         return open("no Internet: the probe's name has the private address " + evidence.plain.server->text() +
                     ", and nothing answers there");
@@ -70,9 +82,9 @@ std::optional<Connectivity> connectivityOf(const PortalEvidence& evidence) {
     if (judged && judged->captive) return Connectivity::portal;
     const PortalAnswer& plain = evidence.plain;
     const bool secure = opens(evidence.secure);
-    if (plain.end != End::answered) return secure ? Connectivity::partial : Connectivity::none;
+    if (!isAnswer(plain)) return secure ? Connectivity::partial : Connectivity::none;
     if (plain.status == 204) return Connectivity::full;
-    const bool empty = plain.status == 200 && plain.bodySize <= 1;
+    const bool empty = isEmptyPage(plain);
     if (secure) return empty ? Connectivity::full : Connectivity::partial;
     return empty ? std::optional(Connectivity::partial) : std::nullopt;
 }

@@ -14,11 +14,12 @@ struct PortalAnswer {
     enum class End { answered, noAnswer };
     End end = End::noAnswer;
     int status = 0;
-    std::uint64_t bodySize = 0;                 ///< as announced, or else as far as it was read
+    std::uint64_t bodySize = 0;                 ///< as announced, or else as far as it came
     std::string location;                       ///< of a redirect
     std::optional<IPAddress> server;            ///< who answered
-    std::string why;                            ///< of no answer
+    std::string why;                            ///< of no answer, or of a body that is not whole
     std::optional<std::int64_t> clockOffset{};  ///< s by which this device is ahead of the answer's date
+    bool bodyIsWhole = true;                    ///< where it is read: with status 200
 };
 
 /// What the network says of itself at the address that it names by DHCP or in its advertisements (RFC 8910).
@@ -50,8 +51,9 @@ struct PortalVerdict {
 enum class Connectivity { full, partial, portal, none };
 
 /// The network's own word comes first. Then the plain answer: 204 is open; a redirect or 511 is a portal; any
-/// other page in place of the expected emptiness is one too. An empty page with status 200 is open where the
-/// secure request got through, else it tells nothing. Without a plain answer, a secure one means partial
+/// other page in place of the expected emptiness is one too, for which its beginning suffices. An empty page with
+/// status 200 is open where the secure request got through, else it tells nothing; one that broke off before it began
+/// is neither page nor emptiness, and thus no answer. Without a plain answer, a secure one means partial
 /// connectivity, not a portal. Where nothing answered the test cannot tell, which is not the same as "no
 /// portal". A probe host that suddenly has a private address and does not answer is no portal but no
 /// Internet. (The union of what two television and desktop systems and a connection manager do.)

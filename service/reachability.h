@@ -56,7 +56,7 @@ enum class CertificateFault {
 struct ServiceContact {
     enum class End {
         reached,         ///< connected and, over TLS, with a certificate that holds
-        failed,          ///< no address, no connection, or another one than the vendor's at the other end
+        failed,          ///< no address, no connection, or one that broke before the answer's end
         badCertificate,  ///< connected, but the certificate does not hold
     };
     End end = End::failed;

@@ -71,7 +71,12 @@ void HttpAnswer::take(std::string_view bytes) {
 }
 
 void HttpAnswer::close() {
-    if (!ended()) part_ = part_ == Part::untilClosed ? Part::end : Part::broken;
+    if (part_ == Part::untilClosed) part_ = Part::end;
+    breakOff();
+}
+
+void HttpAnswer::breakOff() {
+    if (!ended()) part_ = Part::broken;
 }
 
 std::string_view HttpAnswer::header(std::string_view name) const {

@@ -19,8 +19,10 @@ class HttpAnswer {
 
     /// Takes in what has arrived; whatever follows the end of the answer is left out.
     void take(std::string_view bytes);
-    /// The server has closed the connection.
+    /// The server has ended the connection in order, which ends a body without a length too.
     void close();
+    /// The connection has ended in no order: a body without a length is not known to be whole (RFC 9112, 8).
+    void breakOff();
 
     /// Whether nothing more is waited for: the answer is whole, its body has reached the bound, or it is broken.
     bool ended() const { return part_ == Part::end || part_ == Part::broken; }

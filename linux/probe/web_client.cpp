@@ -154,20 +154,25 @@ class Exchange {
             answer_.steps.firstByte = millisecondsBetween(asked_, Clock::now());
         if (step == StreamStep::done)
             read_.take({buffer.data(), size});
-        else
+        else if (step == StreamStep::closed)
             read_.close();
+        else
+            read_.breakOff();
         if (!read_.ended() && (!read_.hasHead() || read_.status() == kWithBody)) return true;
         return conclude(step == StreamStep::failed   ? stream_->why()
-                        : step == StreamStep::closed ? "the connection was closed before an answer"
+                        : step == StreamStep::closed ? "the connection was closed before the answer's end"
                                                      : "the answer is none of HTTP/1");
     }
 
-    /// A body that is too long, or breaks off, comes after an answer all the same; one of which nothing came and
-    /// nothing is known could be taken for an empty page. \param missing why there is no answer, if there is none
+    /// A body that is too long, or breaks off, comes after an answer all the same. \param missing why there is no
+    /// answer, or no more of it, if that is so
     bool conclude(const std::string& missing) {
-        const bool isUnknown = read_.status() == kWithBody && !read_.isWhole() && read_.bodySize() == 0;
-        if (!read_.hasHead() || isUnknown) return fail(missing);
+        if (!read_.hasHead()) return fail(missing);
         answer_.status = read_.status();
+        if (answer_.status == kWithBody && !read_.isWhole()) {
+            answer_.bodyCame = read_.ended() ? WebAnswer::Body::cutOff : WebAnswer::Body::late;
+            answer_.why = missing;
+        }
         answer_.body = read_.body();
         answer_.bodySize = read_.bodySize();
         const bool redirects = answer_.status >= 300 && answer_.status <= 399;

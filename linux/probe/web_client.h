@@ -33,9 +33,16 @@ struct WebAnswer {
         badCertificate,
         noAuthorities,  ///< there was nobody on this device to judge a certificate by
     };
+    /// How far the body came.
+    enum class Body {
+        whole,   ///< to its end, or to the request's bound
+        late,    ///< the deadline came before its end
+        cutOff,  ///< the connection ended before it, or made no sense
+    };
     End end = End::failed;
-    std::string why;
+    std::string why;  ///< of a failure, or of a body that is not whole
     int status = 0;
+    Body bodyCame = Body::whole;
     std::string body;            ///< up to the request's bound
     std::uint64_t bodySize = 0;  ///< as announced, or else as far as it came
     std::string location;  ///< where a redirect leads, as a whole URL of http or https; empty for any other
@@ -48,8 +55,8 @@ struct WebAnswer {
 /// Called after each answer with all answers so far; true ends the others at once, as failed.
 using Conclusive = std::function<bool(const std::vector<std::optional<WebAnswer>>& answers)>;
 
-/// Runs the requests at once. At the deadline an answer counts with as much of its body as has come, and what has none
-/// has failed. An error is only that all was stopped. *Any* thread.
+/// Runs the requests at once. An answer whose head has come counts with as much of its body as has come by the deadline,
+/// or before the connection broke. An error is only that all was stopped. *Any* thread.
 Known<std::vector<WebAnswer>> runWebRequests(const std::vector<WebRequest>& requests, const Until& until,
                                              const Conclusive& conclusive = nullptr);
 

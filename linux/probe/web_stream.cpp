@@ -17,6 +17,7 @@ namespace {
 
 /// The folder lets the few authorities that are needed be read, a file would all be read.
 const std::string kSystemsAuthorities = "/etc/ssl/certs";
+constexpr const char* kClosed = "the connection was closed";
 
 struct Release {
     void operator()(SSL_CTX* context) const { SSL_CTX_free(context); }
@@ -100,8 +101,7 @@ struct WebStream::Secure {
         SSL_CTX_set_verify(context.get(), SSL_VERIFY_PEER, nullptr);
         // An authority that the configuration names need not be the last of its chain.
         X509_VERIFY_PARAM_set_flags(SSL_CTX_get0_param(context.get()), X509_V_FLAG_PARTIAL_CHAIN);
-        // Many servers end a connection without a word; a body that breaks off is seen by its own length.
-        SSL_CTX_set_options(context.get(), SSL_OP_IGNORE_UNEXPECTED_EOF | SSL_OP_NO_RENEGOTIATION);
+        SSL_CTX_set_options(context.get(), SSL_OP_NO_RENEGOTIATION);
         // A step ends with each record: one with no data in it, of which a server may send any number, must not keep
         // the library from coming back to whoever watches the deadline.
         SSL_CTX_clear_mode(context.get(), SSL_MODE_AUTO_RETRY);
@@ -205,10 +205,12 @@ StreamStep WebStream::outcomeOf(int result) {
         case SSL_ERROR_ZERO_RETURN:
             return StreamStep::closed;
         case SSL_ERROR_SYSCALL:
-            why_ = systems != 0 ? std::strerror(systems) : "the connection was closed";
+            why_ = systems != 0 ? std::strerror(systems) : kClosed;
             return StreamStep::failed;
         default:
-            why_ = lastReason();
+            // A connection that ends without the word that ends a secure one may have been cut (RFC 9112, 9.8).
+            why_ = ERR_GET_REASON(ERR_peek_last_error()) == SSL_R_UNEXPECTED_EOF_WHILE_READING ? kClosed
+                                                                                               : lastReason();
             return StreamStep::failed;
     }
 }

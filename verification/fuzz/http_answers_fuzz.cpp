@@ -38,6 +38,11 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     if (whole.bodySize() < whole.body().size()) std::abort();
     for (const char* name : {"Location", "Date", "Content-Length"})
         if (whole.header(name) != cut.header(name)) std::abort();
+    HttpAnswer broken(kRoom);
+    broken.take(bytes);
+    broken.breakOff();
+    if (!broken.ended() || (broken.isWhole() && !whole.isWhole()) || broken.body() != whole.body())
+        std::abort();
     httpDate(whole.header("Date"));
     checkTarget(resolveReference("http://r.example/a/b?c", whole.header("Location")));
     // The same bytes as two lines: an address, and a reference in what lies there.

@@ -255,6 +255,32 @@ TEST_F(GatherWeb, ADeviceWithoutAuthoritiesSaysSoInPlaceOfAVerdict) {
     EXPECT_EQ(portal(alone).plain.status, 204);
 }
 
+TEST_F(GatherWeb, APageThatIsResetBeforeItBeganIsNoAnswer) {
+    Endpoints broken = endpoints();
+    broken.portalPlain = server_->plain("/until-reset/");
+    const PortalEvidence evidence = portal(broken);
+    EXPECT_EQ(evidence.plain.status, 200);
+    EXPECT_FALSE(evidence.plain.bodyIsWhole);
+    EXPECT_EQ(evidence.secure.status, 204);
+    const auto judged = judgePortal(evidence);
+    ASSERT_TRUE(judged);
+    EXPECT_EQ(judged->why, "partial: HTTPS got through, HTTP did not");
+}
+
+TEST_F(GatherWeb, ContentThatBreaksOffHasNotBeenHandedOver) {
+    for (const char* path : {"/until-cut/<html>", "/until-reset/<html>", "/until-closed"}) {
+        Endpoints each = endpoints();
+        each.vendorUrl = server_->secure(path);
+        const auto contacts = gatherVendorService(loopback(), {}, each, patience());
+        ASSERT_TRUE(contacts && contacts->retrieve) << path;
+        const bool isWhole = path == std::string("/until-closed");
+        EXPECT_EQ(contacts->retrieve->end,
+                  isWhole ? ServiceContact::End::reached : ServiceContact::End::failed)
+            << path;
+        EXPECT_EQ(contacts->retrieve->why.empty(), isWhole) << path;
+    }
+}
+
 TEST_F(GatherWeb, APageWithoutAnEndIsTakenAtItsBeginning) {
     Endpoints endless = endpoints();
     endless.portalPlain = server_->plain("/endless-page");

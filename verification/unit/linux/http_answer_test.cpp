@@ -116,6 +116,25 @@ TEST(HttpAnswer, TellsAnEmptyPageFromOneThatDidNotCome) {
     }
 }
 
+TEST(HttpAnswer, WithoutALengthIsWholeOnlyWhereTheConnectionEndsInOrder) {
+    const auto brokenOff = [](const char* rest) {
+        HttpAnswer answer(kRoom);
+        answer.take(std::string("HTTP/1.1 200 OK\r\n") + rest);
+        answer.breakOff();
+        return answer;
+    };
+    for (const char* rest : {"\r\n", "\r\nabc", "Content-Length: 4\r\n\r\nabc",
+                             "Transfer-Encoding: chunked\r\n\r\n3\r\nabc\r\n"}) {
+        EXPECT_TRUE(brokenOff(rest).ended()) << rest;
+        EXPECT_TRUE(brokenOff(rest).hasHead()) << rest;
+        EXPECT_FALSE(brokenOff(rest).isWhole()) << rest;
+    }
+    for (const char* rest :
+         {"Content-Length: 3\r\n\r\nabc", "Transfer-Encoding: chunked\r\n\r\n3\r\nabc\r\n0\r\n\r\n"})
+        EXPECT_TRUE(brokenOff(rest).isWhole()) << rest;
+    EXPECT_EQ(brokenOff("\r\nabc").body(), "abc");
+}
+
 TEST(HttpAnswer, FindsAHeaderWhateverItsCaseTheFirstOfSeveral) {
     const HttpAnswer answer = answerTo(
         "HTTP/1.1 302 Found\r\nLOCATION :\t http://a/b \r\nLocation: /c\r\nX-Long: one\r\n\t "

@@ -15,6 +15,7 @@ namespace {
 
 using namespace std::chrono_literals;
 using End = WebAnswer::End;
+using Body = WebAnswer::Body;
 
 /// A server on loopback for all tests of this kind.
 class WebClient : public ::testing::Test {
@@ -83,17 +84,43 @@ TEST_F(WebClient, AtTheDeadlineAPageCountsAsFarAsItCame) {
     EXPECT_EQ(answer.status, 200);
     EXPECT_EQ(answer.body, "<html>");
     EXPECT_EQ(answer.bodySize, 500U);
+    EXPECT_EQ(answer.bodyCame, Body::late);
+    EXPECT_EQ(answer.why, "no answer in time");
 }
 
 TEST_F(WebClient, APageThatNeverCameIsNotAnEmptyOne) {
     const WebAnswer announced = ask(plain("/page-that-never-comes")),
                     unknown = ask(plain("/chunks-that-never-come")), empty = ask(plain("/empty"));
-    EXPECT_EQ(announced.end, End::answered);
     EXPECT_EQ(announced.bodySize, 500U);
-    EXPECT_EQ(unknown.end, End::failed);
-    EXPECT_EQ(unknown.why, "the connection was closed before an answer");
+    EXPECT_EQ(announced.bodyCame, Body::cutOff);
+    EXPECT_EQ(unknown.bodySize, 0U);
+    EXPECT_EQ(unknown.bodyCame, Body::cutOff);
+    EXPECT_EQ(unknown.why, "the connection was closed before the answer's end");
     EXPECT_EQ(empty.end, End::answered);
     EXPECT_EQ(empty.bodySize, 0U);
+    EXPECT_EQ(empty.bodyCame, Body::whole);
+}
+
+TEST_F(WebClient, ABodyWithoutALengthIsWholeOnlyWhereTheConnectionEndsInOrder) {
+    for (const char* body : {"", "x", "<html>"}) {
+        const std::string path = std::string("/until-reset/") + body, cut = std::string("/until-cut/") + body;
+        for (const WebRequest& request : {plain(path), secure(path), secure(cut)}) {
+            const WebAnswer answer = ask(request);
+            EXPECT_EQ(answer.end, End::answered) << request.url << ": " << answer.why;
+            EXPECT_EQ(answer.body, body) << request.url;
+            EXPECT_EQ(answer.bodyCame, Body::cutOff) << request.url;
+            EXPECT_NE(answer.why, "") << request.url;
+        }
+        EXPECT_EQ(ask(plain(cut)).bodyCame, Body::whole);
+    }
+    EXPECT_EQ(ask(plain("/until-reset/x")).why, "Connection reset by peer");
+    EXPECT_EQ(ask(secure("/until-cut/x")).why, "the connection was closed");
+}
+
+TEST_F(WebClient, ABodyWithALengthIsWholeHoweverItsConnectionEnds) {
+    const WebAnswer answer = ask(secure("/page-and-cut"));
+    EXPECT_EQ(answer.body, "<html>please log in</html>");
+    EXPECT_EQ(answer.bodyCame, Body::whole);
 }
 
 TEST_F(WebClient, AServerThatNeverPausesIsNotHeardBeyondTheDeadline) {
@@ -146,6 +173,7 @@ TEST_F(WebClient, ABodyMayComeInChunksOrLastUntilTheConnectionEnds) {
         const WebAnswer answer = ask(request);
         EXPECT_EQ(answer.end, End::answered) << request.url;
         EXPECT_EQ(answer.body, "<html>please log in</html>") << request.url;
+        EXPECT_EQ(answer.bodyCame, Body::whole) << request.url;
     }
 }
 

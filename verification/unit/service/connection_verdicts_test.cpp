@@ -111,6 +111,13 @@ PortalAnswer answered(int status, std::size_t size = 0, std::string location = {
     return {PortalAnswer::End::answered, status, size, std::move(location), std::nullopt, {}};
 }
 
+PortalAnswer brokenOff(std::size_t size) {
+    PortalAnswer answer = answered(200, size);
+    answer.bodyIsWhole = false;
+    answer.why = "Connection reset by peer";
+    return answer;
+}
+
 struct PortalCase {
     PortalAnswer plain, secure;
     char verdict;  ///< 'c' captive, 'o' not, '?' cannot tell
@@ -133,6 +140,11 @@ TEST(CaptivePortal, EveryRowOfTheDecisionHolds) {
         {answered(304), ok, 'c'},
         {answered(404, 9), ok, 'o'},
         {answered(502, 9), none, '?'},
+        {brokenOff(0), ok, 'o'},
+        {brokenOff(0), none, '?'},
+        {brokenOff(1), none, '?'},
+        {brokenOff(2), ok, 'c'},
+        {answered(200), brokenOff(0), 'o'},
         {none, ok, 'o'},
         {none, answered(302), '?'},
         {none, none, '?'},
@@ -161,6 +173,21 @@ TEST(CaptivePortal, AProbeHostWithAPrivateAddressThatIsSilentIsNoInternetRatherT
     const auto judged = judgePortal(evidence);
     ASSERT_TRUE(judged);
     EXPECT_FALSE(judged->captive);
+    evidence.plain = brokenOff(0);
+    evidence.plain.server = address("10.0.0.1");
+    EXPECT_FALSE(judgePortal(evidence)) << "it is not silent";
+}
+
+TEST(CaptivePortal, APageThatBrokeOffBeforeItBeganIsNoAnswer) {
+    const auto partial = judgePortal({{}, brokenOff(0), answered(204)}),
+               none = judgePortal({{}, brokenOff(0), {}});
+    ASSERT_TRUE(partial);
+    EXPECT_EQ(partial->why, "partial: HTTPS got through, HTTP did not");
+    EXPECT_EQ(connectivityOf({{}, brokenOff(0), answered(204)}), Connectivity::partial);
+    ASSERT_FALSE(none);
+    EXPECT_EQ(none.error().message,
+              "the page over HTTP never came, and HTTPS did not get through: Connection reset by peer");
+    EXPECT_EQ(connectivityOf({{}, brokenOff(0), {}}), Connectivity::none);
 }
 
 TEST(CaptivePortal, TheJoinedNetworksRecordComesWithTheVerdict) {

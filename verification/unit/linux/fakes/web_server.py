@@ -5,7 +5,9 @@ Usage: web_server.py CERTIFICATE KEY
 """
 import email.utils
 import http.server
+import socket
 import ssl
+import struct
 import sys
 import threading
 import time
@@ -22,6 +24,7 @@ forever = threading.Event()
 
 class Handler(http.server.BaseHTTPRequestHandler):
     protocol_version = "HTTP/1.1"
+    disable_nagle_algorithm = True  # what was written is on its way before a reset
 
     def answer(self, status, body=b"", **headers):
         self.send_response(status)
@@ -54,6 +57,17 @@ class Handler(http.server.BaseHTTPRequestHandler):
             self.end_headers()
             self.wfile.write(b"<html>please log in</html>")
             self.close_connection = True
+            if isinstance(self.connection, ssl.SSLSocket):
+                self.connection.unwrap()
+        elif path.startswith("/until-reset/"):
+            self.wfile.write(b"HTTP/1.1 200 OK\r\n\r\n" + path.removeprefix("/until-reset/").encode())
+            self.reset()
+        elif path.startswith("/until-cut/"):
+            self.wfile.write(b"HTTP/1.1 200 OK\r\n\r\n" + path.removeprefix("/until-cut/").encode())
+            self.cut()
+        elif path == "/page-and-cut":
+            self.answer(200, b"<html>please log in</html>")
+            self.cut()
         elif path == "/other-protocol":
             self.wfile.write(b"220 mail.example ESMTP\r\n")
             self.close_connection = True
@@ -102,6 +116,16 @@ class Handler(http.server.BaseHTTPRequestHandler):
             forever.wait()
         else:
             self.answer(404)
+
+    def reset(self):
+        self.connection.setsockopt(socket.SOL_SOCKET, socket.SO_LINGER, struct.pack("ii", 1, 0))
+        self.cut()
+
+    def cut(self):
+        """Ends the connection without a word, where it is a secure one."""
+        self.close_connection = True
+        with socket.socket(fileno=self.connection.detach()):
+            pass
 
     def do_POST(self):
         body = self.rfile.read(int(self.headers.get("Content-Length", 0)))
