@@ -1,16 +1,20 @@
 #include "host/extension_module.h"
 
-#include <dlfcn.h>
-
 #include "host/exit.h"
 #include "host/modules/module_entry.h"
 
 namespace wp::host {
 namespace {
 
-std::string loaderReason() {
-    const char* reason = dlerror();
-    return reason ? reason : "no reason given";
+std::string described(const ModuleFault& fault) {
+    switch (fault.kind) {
+        case ModuleFault::Kind::absent:
+            return "not found; give the path of the diagnostic's module";
+        case ModuleFault::Kind::notLoadable:
+            return "cannot be loaded: " + fault.reason;
+        default:
+            return std::string("lacks the entry ") + kExtensionEntryName + "; it is no diagnostic";
+    }
 }
 
 }  // namespace
@@ -18,14 +22,9 @@ std::string loaderReason() {
 ExtensionModule::ExtensionModule(const std::optional<std::string>& path)
     : path_(path ? std::filesystem::path(*path) : programFolder() / kExtensionFileName) {
     std::string name = "--extension: " + path_.string();
-    std::error_code error;
-    if (!std::filesystem::exists(path_, error))
-        refuse(name + ": not found; give the path of the diagnostic's module");
-    // With a folder before it, the loader takes the name for a file and searches nowhere else.
-    void* handle = dlopen(std::filesystem::absolute(path_).c_str(), RTLD_NOW | RTLD_LOCAL | RTLD_NODELETE);
-    if (!handle) refuse(name + ": cannot be loaded: " + loaderReason());
-    entry_ = reinterpret_cast<ExtensionEntry*>(dlsym(handle, kExtensionEntryName));
-    if (!entry_) refuse(name + ": lacks the entry " + kExtensionEntryName + "; it is no diagnostic");
+    const auto entry = moduleEntry(std::filesystem::absolute(path_), kExtensionEntryName);
+    if (const ModuleFault* fault = std::get_if<ModuleFault>(&entry)) refuse(name + ": " + described(*fault));
+    entry_ = reinterpret_cast<ExtensionEntry*>(std::get<void*>(entry));
     int version = registeredExtensionVersion();
     if (version == 0) refuse(name + ": registers no diagnostic");
     if (version != kExtensionInterfaceVersion)

@@ -28,8 +28,9 @@ class NoScreen final : public ui::FrontEnd {
 std::atomic<const terminal::Module*> terminalModule = nullptr;
 
 const terminal::Module& loadedTerminalModule() {
-    const auto entry = moduleEntry(terminal::kModuleFileName, terminal::kEntryName);
-    if (const std::string* why = std::get_if<std::string>(&entry)) fail("--screen: terminal: " + *why);
+    const auto entry = moduleEntry(programFolder() / terminal::kModuleFileName, terminal::kEntryName);
+    if (const ModuleFault* fault = std::get_if<ModuleFault>(&entry))
+        fail("--screen: terminal: " + fault->text());
     terminalModule = reinterpret_cast<terminal::Entry*>(std::get<void*>(entry))();
     return *terminalModule;
 }

@@ -1,6 +1,5 @@
 #include "host/tv_screen.h"
 
-#include <dlfcn.h>
 #include <unistd.h>
 
 #include <atomic>
@@ -11,9 +10,16 @@
 namespace wp::host {
 namespace {
 
-std::string loaderReason() {
-    const char* reason = dlerror();
-    return reason ? reason : "no reason given";
+std::string described(const ModuleFault& fault, const std::filesystem::path& file) {
+    switch (fault.kind) {
+        case ModuleFault::Kind::absent:
+            return "this build has no television screen (there is no " + std::string(tv::kModuleFileName) +
+                   " beside the program)";
+        case ModuleFault::Kind::notLoadable:
+            return "the television screen cannot be loaded: " + fault.reason;
+        default:
+            return file.string() + ": is no television screen";
+    }
 }
 
 tv::Texts textsOf(const Localization& localization) {
@@ -26,16 +32,10 @@ tv::Texts textsOf(const Localization& localization) {
 }  // namespace
 
 TvModule::Loaded TvModule::load() {
-    std::filesystem::path file = programFolder() / tv::kModuleFileName;
-    std::error_code error;
-    if (!std::filesystem::exists(file, error))
-        return "this build has no television screen (there is no " + std::string(tv::kModuleFileName) +
-               " beside the program)";
-    void* handle = dlopen(file.c_str(), RTLD_NOW | RTLD_LOCAL | RTLD_NODELETE);
-    if (!handle) return "the television screen cannot be loaded: " + loaderReason();
-    auto* open = reinterpret_cast<tv::Open*>(dlsym(handle, tv::kOpenName));
-    if (!open) return file.string() + ": is no television screen";
-    return TvModule(open);
+    const std::filesystem::path file = programFolder() / tv::kModuleFileName;
+    const auto entry = moduleEntry(file, tv::kOpenName);
+    if (const ModuleFault* fault = std::get_if<ModuleFault>(&entry)) return described(*fault, file);
+    return TvModule(reinterpret_cast<tv::Open*>(std::get<void*>(entry)));
 }
 
 std::unique_ptr<ui::FrontEnd> TvModule::open(ui::Screen& screen, MainQueue& queue,

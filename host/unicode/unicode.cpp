@@ -10,8 +10,9 @@ namespace {
 
 const UnicodeModule& loadedModule() {
     static const UnicodeModule* const module = [] {
-        const auto entry = moduleEntry(kUnicodeModuleFileName, kUnicodeEntryName);
-        if (const std::string* why = std::get_if<std::string>(&entry)) throw std::runtime_error(*why);
+        const auto entry = moduleEntry(programFolder() / kUnicodeModuleFileName, kUnicodeEntryName);
+        if (const ModuleFault* fault = std::get_if<ModuleFault>(&entry))
+            throw std::runtime_error(fault->text());
         return reinterpret_cast<UnicodeEntry*>(std::get<void*>(entry))();
     }();
     return *module;
