@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include "verification/unit/linux/fakes/loopback_socket.h"
+
 namespace wp {
 namespace {
 
@@ -14,20 +16,14 @@ IPAddress at(const char* text) {
 /// A place on loopback where connections are taken in, or, once its queue is full, are left without an answer.
 class Place {
   public:
-    explicit Place(const IPAddress& address, std::uint16_t port = 0)
-        : socket_(::socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0)) {
-        SocketAddress place = SocketAddress::of(address, port);
-        EXPECT_EQ(::bind(socket_.number(), place.raw(), place.size), 0);
-        EXPECT_EQ(::listen(socket_.number(), 0), 0);
-        ::getsockname(socket_.number(), reinterpret_cast<sockaddr*>(&place.storage), &place.size);
-        place_ = place;
-    }
-    std::uint16_t port() const { return place_.port(); }
+    explicit Place(const char* address, std::uint16_t port = 0)
+        : socket_(LoopbackSocket::listening(address, port, 0)) {}
+    std::uint16_t port() const { return socket_.port(); }
     /// Fills the queue, so that whoever comes next hears nothing.
     void fill() {
         while (true) {
             Descriptor guest(::socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC | SOCK_NONBLOCK, 0));
-            const bool isIn = ::connect(guest.number(), place_.raw(), place_.size) == 0;
+            const bool isIn = ::connect(guest.number(), socket_.place().raw(), socket_.place().size) == 0;
             pollfd entry{guest.number(), POLLOUT, 0};
             const bool isSoonIn = isIn || ::poll(&entry, 1, 100) > 0;
             guests_.push_back(std::move(guest));
@@ -36,8 +32,7 @@ class Place {
     }
 
   private:
-    Descriptor socket_;
-    SocketAddress place_;
+    LoopbackSocket socket_;
     std::vector<Descriptor> guests_;
 };
 
@@ -56,8 +51,8 @@ bool advanceAt(ConnectRace& race, Clock::time_point moment, int times = kOften) 
 }
 
 TEST(ConnectRace, TheNextAddressHasItsTurnAQuarterOfASecondLater) {
-    Place silent(at("127.0.0.1"));
-    const Place good(at("127.0.0.2"), silent.port());
+    Place silent("127.0.0.1");
+    const Place good("127.0.0.2", silent.port());
     silent.fill();
     ConnectRace race({at("127.0.0.1"), at("127.0.0.2")}, silent.port(), "");
     const auto begin = Clock::now();
@@ -68,8 +63,8 @@ TEST(ConnectRace, TheNextAddressHasItsTurnAQuarterOfASecondLater) {
 }
 
 TEST(ConnectRace, TheNextAddressHasItsTurnAtOnceWhereOneFailsBesideAnotherThatIsSilent) {
-    Place silent(at("127.0.0.1"));
-    const Place good(at("127.0.0.4"), silent.port());
+    Place silent("127.0.0.1");
+    const Place good("127.0.0.4", silent.port());
     silent.fill();
     // Nobody listens at the second and third.
     ConnectRace race({at("127.0.0.1"), at("127.0.0.2"), at("127.0.0.3"), at("127.0.0.4")}, silent.port(), "");
@@ -80,7 +75,7 @@ TEST(ConnectRace, TheNextAddressHasItsTurnAtOnceWhereOneFailsBesideAnotherThatIs
 }
 
 TEST(ConnectRace, FamiliesHaveTheirTurnsOneAfterTheOther) {
-    const Place good(at("127.0.0.1"));
+    const Place good("127.0.0.1");
     // Nobody listens on IPv6; with the families in turns the third attempt is the first on IPv4 that can succeed.
     ConnectRace race({at("::1"), at("::1"), at("127.0.0.1")}, good.port(), "");
     EXPECT_TRUE(advanceAt(race, Clock::now()));

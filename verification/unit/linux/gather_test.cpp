@@ -2,8 +2,8 @@
 
 #include <gtest/gtest.h>
 #include <net/if.h>
+#include <poll.h>
 #include <stdlib.h>
-#include <sys/socket.h>
 
 #include <algorithm>
 #include <filesystem>
@@ -13,6 +13,7 @@
 #include "linux/fact_table.h"
 #include "linux/gather_reach.h"
 #include "linux/gather_setup.h"
+#include "verification/unit/linux/fakes/loopback_socket.h"
 #include "verification/unit/linux/fakes/udp_server.h"
 #include "verification/unit/linux/fakes/web_server.h"
 #include "verification/unit/linux/stop.h"
@@ -42,15 +43,7 @@ std::string textOf(const Known<T>& known) {
 /// decides when.
 class SilentPlace {
   public:
-    SilentPlace() : listening_(::socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0)) {
-        sockaddr_in place{};
-        place.sin_family = AF_INET;
-        place.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
-        socklen_t size = sizeof place;
-        ::bind(listening_.number(), reinterpret_cast<sockaddr*>(&place), size);
-        ::listen(listening_.number(), 8);
-        ::getsockname(listening_.number(), reinterpret_cast<sockaddr*>(&place), &size);
-        port_ = ntohs(place.sin_port);
+    SilentPlace() {
         thread_ = std::thread([this] {
             pollfd entries[] = {{listening_.number(), POLLIN, 0}, {over_.descriptor(), POLLIN, 0}};
             ::poll(entries, 2, -1);
@@ -61,14 +54,13 @@ class SilentPlace {
         over_.raise();
         thread_.join();
     }
-    std::string hostAndPort() const { return "127.0.0.1:" + std::to_string(port_); }
+    std::string hostAndPort() const { return "127.0.0.1:" + std::to_string(listening_.port()); }
 
     const std::shared_ptr<StopSignal> stop = std::make_shared<StopSignal>();
 
   private:
-    Descriptor listening_;
+    const LoopbackSocket listening_ = LoopbackSocket::listening();
     StopSignal over_;
-    std::uint16_t port_ = 0;
     std::thread thread_;
 };
 

@@ -1,7 +1,8 @@
 #include <gtest/gtest.h>
+#include <poll.h>
 
-#include "linux/probe/ip_socket.h"
 #include "linux/probe/ssdp_probe.h"
+#include "verification/unit/linux/fakes/loopback_socket.h"
 #include "verification/unit/linux/fakes/udp_server.h"
 #include "verification/unit/linux/fakes/web_server.h"
 #include "verification/unit/linux/stop.h"
@@ -59,19 +60,16 @@ TEST_F(RouterProbe, NothingIsFetchedThatLiesElsewhereThanOnTheRouter) {
 }
 
 TEST_F(RouterProbe, ADescriptionLeadsNowhereElse) {
-    const Descriptor elsewhere(::socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC | SOCK_NONBLOCK, 0));
-    SocketAddress place = SocketAddress::of(*IPAddress::fromText("127.0.0.2"), 0);
-    ASSERT_EQ(::bind(elsewhere.number(), place.raw(), place.size), 0);
-    ASSERT_EQ(::listen(elsewhere.number(), 1), 0);
-    ::getsockname(elsewhere.number(), reinterpret_cast<sockaddr*>(&place.storage), &place.size);
-    const std::string control = "http://127.0.0.2:" + std::to_string(place.port()) + "/control";
+    const LoopbackSocket elsewhere = LoopbackSocket::listening("127.0.0.2");
+    const std::string control = "http://127.0.0.2:" + std::to_string(elsewhere.port()) + "/control";
 
     const UdpServer server([&](const auto&) { return answerWith(web_->plain("/control-at/" + control)); });
     const auto router = askRouter(routerAt(server), patience());
     ASSERT_TRUE(router);
     EXPECT_EQ(router->description.modelName, "Base 5");
     EXPECT_FALSE(router->external);
-    EXPECT_LT(::accept(elsewhere.number(), nullptr, nullptr), 0) << "somebody asked there";
+    pollfd entry{elsewhere.number(), POLLIN, 0};
+    EXPECT_EQ(::poll(&entry, 1, 0), 0) << "somebody asked there";
 }
 
 TEST_F(RouterProbe, OnlyTheRouterItselfIsBelieved) {

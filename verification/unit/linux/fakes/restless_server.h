@@ -1,7 +1,6 @@
 #pragma once
 
 #include <gtest/gtest.h>
-#include <netinet/in.h>
 #include <openssl/ssl.h>
 #include <signal.h>
 #include <sys/socket.h>
@@ -11,6 +10,7 @@
 #include <thread>
 
 #include "exchange/descriptor.h"
+#include "verification/unit/linux/fakes/loopback_socket.h"
 
 namespace wp {
 
@@ -19,19 +19,10 @@ namespace wp {
 class RestlessServer {
   public:
     RestlessServer(const std::string& certificate, const std::string& key)
-        : listener_(::socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0)),
-          context_(SSL_CTX_new(TLS_server_method()), SSL_CTX_free) {
+        : context_(SSL_CTX_new(TLS_server_method()), SSL_CTX_free) {
         ::signal(SIGPIPE, SIG_IGN);  // the client goes whenever it wants
         EXPECT_EQ(SSL_CTX_use_certificate_file(context_.get(), certificate.c_str(), SSL_FILETYPE_PEM), 1);
         EXPECT_EQ(SSL_CTX_use_PrivateKey_file(context_.get(), key.c_str(), SSL_FILETYPE_PEM), 1);
-        sockaddr_in place{};
-        place.sin_family = AF_INET;
-        place.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
-        socklen_t size = sizeof place;
-        ::bind(listener_.number(), reinterpret_cast<sockaddr*>(&place), size);
-        ::listen(listener_.number(), 1);
-        ::getsockname(listener_.number(), reinterpret_cast<sockaddr*>(&place), &size);
-        port_ = ntohs(place.sin_port);
         thread_ = std::thread([this] { run(); });
     }
     ~RestlessServer() {
@@ -39,7 +30,7 @@ class RestlessServer {
         thread_.join();
     }
 
-    std::uint16_t port() const { return port_; }
+    std::uint16_t port() const { return listener_.port(); }
 
   private:
     void run() {
@@ -54,9 +45,8 @@ class RestlessServer {
                 return;
     }
 
-    Descriptor listener_;
+    const LoopbackSocket listener_ = LoopbackSocket::listening();
     std::unique_ptr<SSL_CTX, decltype(&SSL_CTX_free)> context_;
-    std::uint16_t port_ = 0;
     std::thread thread_;
 };
 

@@ -9,8 +9,8 @@
 #include <thread>
 #include <vector>
 
-#include "exchange/descriptor.h"
 #include "linux/stop_signal.h"
+#include "verification/unit/linux/fakes/loopback_socket.h"
 
 namespace wp {
 
@@ -24,17 +24,7 @@ class UdpServer {
     enum class Sender { itself, stranger };
 
     explicit UdpServer(Answer answer, Sender sender = Sender::itself)
-        : socket_(::socket(AF_INET, SOCK_DGRAM | SOCK_CLOEXEC, 0)),
-          other_(::socket(AF_INET, SOCK_DGRAM | SOCK_CLOEXEC, 0)),
-          sender_(sender),
-          answer_(std::move(answer)) {
-        sockaddr_in place{};
-        place.sin_family = AF_INET;
-        place.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
-        socklen_t size = sizeof place;
-        ::bind(socket_.number(), reinterpret_cast<sockaddr*>(&place), size);
-        ::getsockname(socket_.number(), reinterpret_cast<sockaddr*>(&place), &size);
-        port_ = ntohs(place.sin_port);
+        : sender_(sender), answer_(std::move(answer)) {
         thread_ = std::thread([this] { run(); });
     }
     ~UdpServer() {
@@ -42,7 +32,7 @@ class UdpServer {
         thread_.join();
     }
 
-    std::uint16_t port() const { return port_; }
+    std::uint16_t port() const { return socket_.port(); }
 
   private:
     void run() {
@@ -64,11 +54,11 @@ class UdpServer {
         }
     }
 
-    Descriptor socket_, other_;
+    const LoopbackSocket socket_ = LoopbackSocket::forDatagrams();
+    const LoopbackSocket other_ = LoopbackSocket::forDatagrams();
     Sender sender_;
     Answer answer_;
     StopSignal stop_;
-    std::uint16_t port_ = 0;
     std::thread thread_;
 };
 
