@@ -10,6 +10,9 @@ import time
 # Only a failure takes as long.
 PATIENCE = 30
 
+# What ends a terminal and clears up after it, once whoever holds the other end of its standard input has gone.
+KEEPER = 'read -r line; tmux -S "$0/socket" kill-server 2> /dev/null; rm -rf "$0"'
+
 
 def holds(found, wanted):
     if callable(wanted):
@@ -18,15 +21,18 @@ def holds(found, wanted):
 
 
 class Terminal:
-    """A terminal with a shell script in it; gone with the test, and everything in it."""
+    """A terminal with a shell script in it; gone with the test, even one that is killed, and everything in it."""
 
     def __init__(self, script, columns=100, rows=30, environment=None):
-        self.directory = tempfile.TemporaryDirectory()
-        self.socket = os.path.join(self.directory.name, "socket")
+        self.directory = tempfile.mkdtemp()
+        self.socket = os.path.join(self.directory, "socket")
+        # A process of nobody's: what kills the test with all its children does not reach it.
+        self.keeper = subprocess.Popen(["setsid", "--fork", "sh", "-c", KEEPER, self.directory],
+                                       stdin=subprocess.PIPE, stdout=subprocess.PIPE)
         variables = {"LC_ALL": "C.UTF-8", **(environment or {})}
         exports = "".join(f"export {name}={shlex.quote(value)}; " for name, value in variables.items())
         self.tmux("-f", "/dev/null", "new-session", "-d", "-x", str(columns), "-y", str(rows),
-                  "cd " + shlex.quote(self.directory.name) + "; " + exports + script)
+                  "cd " + shlex.quote(self.directory) + "; " + exports + script)
 
     def tmux(self, *words):
         run = subprocess.run(["tmux", "-u", "-S", self.socket, *words], stdout=subprocess.PIPE,
@@ -51,7 +57,7 @@ class Terminal:
         self.tmux("resize-window", "-x", str(columns), "-y", str(rows))
 
     def path(self, name):
-        return pathlib.Path(self.directory.name, name)
+        return pathlib.Path(self.directory, name)
 
     def waitFor(self, *wanted, get=None):
         """Waits for a picture (or what `get` returns) that holds each text, matches each pattern and fulfils each function.
@@ -80,8 +86,7 @@ class Terminal:
         return self.waitFor(lambda text: text.endswith(end), get=content).strip()
 
     def close(self):
-        subprocess.run(["tmux", "-S", self.socket, "kill-server"], stderr=subprocess.DEVNULL, check=False)
-        self.directory.cleanup()
+        self.keeper.communicate()
 
     def child(self):
         """The program that the terminal's shell runs."""
