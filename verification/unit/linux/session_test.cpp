@@ -201,7 +201,6 @@ class SilentBus {
         ::unlink(path_.c_str());
     }
 
-    /// Until somebody asks.
     void waitForACaller() const {
         pollfd entry{listening_.number(), POLLIN, 0};
         ::poll(&entry, 1, -1);
@@ -212,18 +211,36 @@ class SilentBus {
     std::string path_;
 };
 
-TEST(Session, AnswersWhatWaitsForSomebodySilentAtOnceWhenItIsCancelled) {
+constexpr const char* kAskBluetoothTwice =
+    "{\"id\":1,\"request\":\"test\",\"test\":18}\n{\"id\":2,\"request\":\"test\",\"test\":19}\n";
+constexpr const char* kCancelAndAskOnce =
+    "{\"request\":\"cancel\"}\n{\"id\":3,\"request\":\"test\",\"test\":5}\n";
+
+TEST(Session, AnswersAllThatWaitsBeforeItReadsOnWhenItIsCancelled) {
     const SilentBus bus;
     Conversation conversation;
 
-    conversation.say(
-        "{\"id\":1,\"request\":\"test\",\"test\":18}\n{\"id\":2,\"request\":\"test\",\"test\":19}\n");
-    bus.waitForACaller();
-    conversation.say("{\"request\":\"cancel\"}\n");
+    // In one piece: however long the service takes, nothing that it finds out is told before it has read all of this.
+    conversation.say(std::string(kAskBluetoothTwice) + kCancelAndAskOnce);
 
-    // Unless it is cancelled each of them ends otherwise, once the silence has lasted its 2 s.
-    EXPECT_EQ(kCancelledCode, testAnswer(conversation.answer(1)).error.value_or(Error()).code);
-    EXPECT_EQ(kCancelledCode, testAnswer(conversation.answer(2)).error.value_or(Error()).code);
+    for (const std::uint64_t id : {1, 2}) {
+        const auto answer = std::get<WireAnswer>(readMessage(conversation.hear()));
+        EXPECT_EQ(id, answer.id);
+        EXPECT_EQ(kCancelledCode, testAnswer(answer).error.value_or(Error()).code);
+    }
+    EXPECT_EQ(3u, std::get<WireAnswer>(readMessage(conversation.hear())).id);
+}
+
+TEST(Session, AnswersWhatIsBeingAskedOfSomebodySilentBeforeItReadsOnWhenItIsCancelled) {
+    const SilentBus bus;
+    Conversation conversation;
+
+    conversation.say(kAskBluetoothTwice);
+    bus.waitForACaller();
+    conversation.say(kCancelAndAskOnce);
+
+    for (int i = 0; i < 2; ++i) EXPECT_NE(3u, std::get<WireAnswer>(readMessage(conversation.hear())).id);
+    EXPECT_EQ(3u, std::get<WireAnswer>(readMessage(conversation.hear())).id);
 }
 
 TEST(Session, EndsInTheMiddleOfItsWorkWhenTheWireIsClosed) {
