@@ -131,7 +131,7 @@ Wait turn(std::span<const ares_channel> channels, const Until& until) {
     std::vector<pollfd> descriptors;
     std::vector<std::size_t> ends;
     std::chrono::microseconds patience = 1s;
-    for (const ares_channel each : channels) {
+    for (ares_channel each : channels) {
         std::ranges::copy(socketsOf(each), std::back_inserter(descriptors));
         ends.push_back(descriptors.size());
         patience = std::min(patience, patienceOf(each));
@@ -260,7 +260,7 @@ Known<std::vector<NameServerAnswer>> askEachServer(const std::string& name, cons
         if (wait == Wait::stopped) return waitFailure(wait, "the name server");
         if (wait == Wait::timeout) break;
     }
-    for (const ares_channel each : channels) ares_cancel(each);
+    for (ares_channel each : channels) ares_cancel(each);
     std::vector<NameServerAnswer> answers;
     for (const auto& each : all) answers.push_back(each->answer);
     return answers;
