@@ -39,8 +39,8 @@ PingStatistics statisticsOf(const Echo& echo) {
         if (time) times.push_back(*time);
     }
     if (!echo.roundTrips.empty()) {
-        statistics.packetLoss =
-            1.0 - static_cast<double>(times.size()) / static_cast<double>(echo.roundTrips.size());
+        const std::size_t lost = echo.roundTrips.size() - times.size();
+        statistics.packetLoss = static_cast<double>(lost) / static_cast<double>(echo.roundTrips.size());
     }
     if (times.empty()) return statistics;
     const double count = static_cast<double>(times.size());

@@ -131,6 +131,13 @@ TEST(ConnectivityTests, AskForAJoinedNetwork) {
     EXPECT_EQ(2, errorOf(13, facts));
 }
 
+/// 1 - 4.0 / 5 is not the number that is written 0.2.
+TEST(ConnectivityTests, TellALossOfOneInFiveWithoutARestOfRounding) {
+    Facts facts;
+    facts.gatewayEcho = Echo{"wlan0", "10.0.0.1", {1.0, 1.0, std::nullopt, 1.0, 1.0}, 0};
+    EXPECT_EQ(0.2, infoOf(3, facts, "PingResult").asRecord<PingStatistics>()->packetLoss);
+}
+
 TEST(ConnectivityTests, PassThePingWithOneAnswer) {
     Facts facts;
     facts.gatewayEcho = Echo{"wlan0", "10.0.0.1", {std::nullopt, 4.0, std::nullopt, 2.0, 6.0}, 1000.5};
