@@ -69,15 +69,15 @@ std::uint16_t randomIdentifier() {
 /// One row of requests and the answers to it.
 class EchoRow {
   public:
-    EchoRow(int descriptor, bool raw, const Gateway& target, std::uint32_t interfaceIndex)
-        : descriptor_(descriptor), raw_(raw), target_(target), address_(addressOf(target, interfaceIndex)) {}
+    EchoRow(int descriptor, bool raw, const Gateway& target, SocketAddress address, HomeChannel::Stay& stay)
+        : descriptor_(descriptor), raw_(raw), target_(target), address_(address), stay_(stay) {}
 
     /// Nothing, or why the row could not be completed.
-    std::optional<Error> run(const WhenSilent& whenSilent, const Until& until) {
+    std::optional<Error> run(const Until& until) {
         drain();
         if (!sendAll(until) || !receiveUntil(sent_.back() + kSilence, until))
             return waitFailure(Wait::stopped, "echo");
-        if (std::ranges::none_of(answered_, [](auto& each) { return each.has_value(); })) whenSilent();
+        if (std::ranges::none_of(answered_, [](auto& each) { return each.has_value(); })) stay_.end();
         if (!receiveUntil(sent_.back() + kWait, until)) return waitFailure(Wait::stopped, "echo");
         return std::nullopt;
     }
@@ -88,6 +88,8 @@ class EchoRow {
     /// Takes what is answered between the requests too. False when stopped.
     bool sendAll(const Until& until) {
         for (std::size_t i = 0; i < kEchoRequests; ++i) {
+            // Somebody else's scan may last longer than it is worth waiting for.
+            if (stay_.begin(until.within(kWait)) == Wait::stopped) return false;
             sent_[i] = Clock::now();
             const std::vector<std::uint8_t> request =
                 echoRequest(target_.family, {identifier_, static_cast<std::uint16_t>(firstSequence_ + i)});
@@ -101,9 +103,15 @@ class EchoRow {
         return true;
     }
 
+    bool isWaitingForAnswers() const {
+        return std::any_of(answered_.begin(), answered_.begin() + static_cast<std::ptrdiff_t>(asked_),
+                           [](auto& each) { return !each; });
+    }
+
     /// Takes answers until the time is over, or, after the last request, until all are there. False when stopped.
     bool receiveUntil(Clock::time_point time, const Until& until) {
-        while (asked_ < kEchoRequests || std::ranges::any_of(answered_, [](auto& each) { return !each; })) {
+        while (asked_ < kEchoRequests || isWaitingForAnswers()) {
+            if (!isWaitingForAnswers()) stay_.pauseUntil(time);
             const Wait wait = waitReadable(descriptor_, {until.stop, std::min(time, until.deadline)});
             if (wait == Wait::stopped) return false;
             if (wait == Wait::timeout) return true;
@@ -142,6 +150,7 @@ class EchoRow {
     bool raw_;
     const Gateway& target_;
     SocketAddress address_;
+    HomeChannel::Stay& stay_;
     std::uint16_t identifier_ = randomIdentifier();
     std::uint16_t firstSequence_ = randomIdentifier();
     std::array<Clock::time_point, kEchoRequests> sent_{};
@@ -181,7 +190,7 @@ EchoSocket::End EchoSocket::open(Address::Family family) {
 }
 
 Known<Echo> EchoSocket::ask(const Gateway& target, const std::string& interfaceName,
-                            std::uint32_t interfaceIndex, const WhenSilent& whenSilent, const Until& until) {
+                            std::uint32_t interfaceIndex, HomeChannel::Stay& stay, const Until& until) {
     const std::lock_guard lock(asking_);
     const End& end = this->end(target.family);
     if (!end.descriptor) {
@@ -195,8 +204,8 @@ Known<Echo> EchoSocket::ask(const Gateway& target, const std::string& interfaceN
         return failure(Reason::noInterface, interfaceName + " is gone");
     }
     const double startedAt = secondsSinceReference();
-    EchoRow row(end.descriptor.number(), end.raw, target, interfaceIndex);
-    if (std::optional<Error> error = row.run(whenSilent, until)) return *error;
+    EchoRow row(end.descriptor.number(), end.raw, target, addressOf(target, interfaceIndex), stay);
+    if (std::optional<Error> error = row.run(until)) return *error;
     return Echo{interfaceName, textOf(target.family, target.bytes), row.roundTrips(), startedAt};
 }
 

@@ -1,16 +1,13 @@
 #pragma once
 
-#include <functional>
 #include <mutex>
 
 #include "linux/echo_message.h"
+#include "linux/home_channel.h"
 #include "linux/route_messages.h"
 #include "linux/stop_signal.h"
 
 namespace wp {
-
-/// Called when a whole row of echo requests seems to be lost, at most once a row, on the thread that asks.
-using WhenSilent = std::function<void()>;
 
 /// Sends echo requests. It is opened while the program still has its privileges; sending needs none. One row of
 /// requests at a time, *any* thread.
@@ -20,10 +17,11 @@ class EchoSocket {
     EchoSocket();
 
     /// Sends 5 requests 200 ms apart out of the interface and waits up to 1 s for each answer, all at once. Every
-    /// peer waits about that long, and a home network answers within a few milliseconds. Where nothing at all has come
-    /// 300 ms after the last request, more than a second after the first, it says so and waits on.
+    /// peer waits about that long, and a home network answers within a few milliseconds. The radio may leave the channel
+    /// between an answer and the next request. Where nothing at all has come 300 ms after the last request, more than a
+    /// second after the first, the row seems to be lost: it ends its stay and waits on.
     Known<Echo> ask(const Gateway& target, const std::string& interfaceName, std::uint32_t interfaceIndex,
-                    const WhenSilent& whenSilent, const Until& until);
+                    HomeChannel::Stay& stay, const Until& until);
 
   private:
     struct End {

@@ -101,7 +101,7 @@ Store addresses(const Gathering& g) {
 
 Store gatewayEcho(const Gathering& g) {
     return fromLink(g, &Facts::gatewayEcho, [&](const Link& found) {
-        Known<Echo> echo = gatherGatewayEcho(found, g.sources.gatewayEcho, g.yield, g.until);
+        Known<Echo> echo = gatherGatewayEcho(found, g.sources.gatewayEcho, *g.stay, g.until);
         const bool isSilent =
             echo && std::ranges::none_of(echo->roundTrips, [](auto& each) { return each.has_value(); });
         if (isSilent && answersAsNeighbour(found, echo->target, g.until))
@@ -138,7 +138,7 @@ Store peerLinks(const Gathering& g) {
 Store airtime(const Gathering& g) {
     return fromLink(g, &Facts::airtime, [&](const Link& found) -> Known<Airtime> {
         if (g.topic.named) return Airtime();
-        return gatherAirtime(found, g.until);
+        return gatherAirtime(found, *g.stay, g.until);
     });
 }
 
@@ -149,7 +149,7 @@ Store allowedChannels(const Gathering& g) {
 
 Store outsideEcho(const Gathering& g) {
     return fromLink(g, &Facts::outsideEcho, [&](const Link& found) {
-        return gatherOutsideEcho(found, g.sources.config.endpoints, g.sources.outsideEcho, g.yield, g.until);
+        return gatherOutsideEcho(found, g.sources.config.endpoints, g.sources.outsideEcho, *g.stay, g.until);
     });
 }
 
@@ -191,41 +191,46 @@ Store translation(const Gathering& g) {
 }
 
 constexpr Fact kLink[] = {Fact::link};
-// A scan leaves the channel for a while: echo requests would be lost and delayed, and other channels counted.
-constexpr Fact kOnChannel[] = {Fact::gatewayEcho, Fact::outsideEcho, Fact::airtime};
 constexpr Fact kSetup[] = {Fact::link, Fact::setup};
 constexpr Fact kTranslation[] = {Fact::link, Fact::setup, Fact::router};
-constexpr Fact kWhileQuiet[] = {Fact::gatewayEcho, Fact::outsideEcho, Fact::airtime, Fact::nearby};
+constexpr Fact kNearby[] = {Fact::nearby};
+// While a scan visits other channels echo requests would be lost and delayed, and other channels counted.
+constexpr HomeUse kAny = HomeUse::none, kHome = HomeUse::needed, kAway = HomeUse::left;
 
 // clang-format off
 constexpr FactRow kRows[] = {
-    // fact                     name                   needs          after          most  gather               loss
-    {Fact::link,                "link",                 {},            {},            3s,   link,                "anything about Wi-Fi"},
+    // fact                       name                    needs          after     home    most           gather                loss
+    {Fact::link,                 "link",                 {},            {},       kAny,   3s,            link,                 "anything about Wi-Fi"},
+    // What takes longest comes first.
+    {Fact::gatewayEcho,          "gatewayEcho",          kLink,         {},       kHome,  4s,            gatewayEcho,          "whether the router and others answer"},
+    {Fact::outsideEcho,          "outsideEcho",          kLink,         {},       kHome,  4s,            outsideEcho,          "whether the router and others answer"},
+    {Fact::airtime,              "airtime",              kLink,         {},       kHome,  10s,           airtime,              "how busy the channels are"},
     // The slowest radios listen through two bands in 12 s.
-    {Fact::nearby,              "nearby",               kLink,         kOnChannel,    30s,  nearby,              "which networks are near"},
-    {Fact::listened,            "listened",             kLink,         kWhileQuiet,   20s,  listened,            "which networks hide"},
-    {Fact::station,             "station",              kLink,         {},            3s,   station,             "how strong the signal is"},
-    {Fact::survey,              "survey",               kLink,         {},            3s,   survey,              "how loud the noise is"},
-    {Fact::regulation,          "regulation",           kLink,         {},            3s,   regulation,          "the radio's country"},
-    {Fact::addresses,           "addresses",            kLink,         {},            3s,   addresses,           "the addresses"},
-    {Fact::gatewayEcho,         "gatewayEcho",          kLink,         {},            4s,   gatewayEcho,         "whether the router and others answer"},
-    {Fact::setup,               "setup",                kLink,         {},            4s,   setup,               "how the device is set up"},
-    {Fact::saved,               "saved",                kLink,         {},            4s,   saved,               "the remembered networks"},
-    {Fact::bluetooth,           "bluetooth",            {},            {},            3s,   bluetooth,           "the Bluetooth devices"},
-    {Fact::driverSharesAirtime, "driverSharesAirtime",  kLink,         {},            1s,   driverSharesAirtime, "how Bluetooth shares airtime"},
-    {Fact::peerLinks,           "peerLinks",            kLink,         {},            3s,   peerLinks,           "the peer-to-peer links"},
-    {Fact::airtime,             "airtime",              kLink,         {},            4s,   airtime,             "how busy the channels are"},
-    {Fact::allowedChannels,     "allowedChannels",      kLink,         {},            3s,   allowedChannels,     "the channels to choose from"},
-    {Fact::outsideEcho,         "outsideEcho",          kLink,         {},            4s,   outsideEcho,         "whether the router and others answer"},
-    {Fact::nameAnswer,          "nameAnswer",           kSetup,        {},            4s,   nameAnswer,          "whether names resolve"},
-    {Fact::portal,              "portal",               kSetup,        {},            5s,   portal,              "whether there is a portal"},
-    {Fact::vendorService,       "vendorService",        kSetup,        {},            kServiceTime, vendorService,       "whether the vendor is reached"},
-    {Fact::router,              "router",               kLink,         {},            4s,   router,              "who made the router"},
-    {Fact::translation,         "translation",          kTranslation,  {},            3s,   translation,         "how often addresses are translated"},
+    {Fact::nearby,               "nearby",               kLink,         {},       kAway,  30s,           nearby,               "which networks are near"},
+    {Fact::listened,             "listened",             kLink,         kNearby,  kAway,  20s,           listened,             "which networks hide"},
+    {Fact::station,              "station",              kLink,         {},       kAny,   3s,            station,              "how strong the signal is"},
+    {Fact::survey,               "survey",               kLink,         {},       kAny,   3s,            survey,               "how loud the noise is"},
+    {Fact::regulation,           "regulation",           kLink,         {},       kAny,   3s,            regulation,           "the radio's country"},
+    {Fact::addresses,            "addresses",            kLink,         {},       kAny,   3s,            addresses,            "the addresses"},
+    {Fact::setup,                "setup",                kLink,         {},       kAny,   4s,            setup,                "how the device is set up"},
+    {Fact::saved,                "saved",                kLink,         {},       kAny,   4s,            saved,                "the remembered networks"},
+    {Fact::bluetooth,            "bluetooth",            {},            {},       kAny,   3s,            bluetooth,            "the Bluetooth devices"},
+    {Fact::driverSharesAirtime,  "driverSharesAirtime",  kLink,         {},       kAny,   1s,            driverSharesAirtime,  "how Bluetooth shares airtime"},
+    {Fact::peerLinks,            "peerLinks",            kLink,         {},       kAny,   3s,            peerLinks,            "the peer-to-peer links"},
+    {Fact::allowedChannels,      "allowedChannels",      kLink,         {},       kAny,   3s,            allowedChannels,      "the channels to choose from"},
+    {Fact::nameAnswer,           "nameAnswer",           kSetup,        {},       kAny,   4s,            nameAnswer,           "whether names resolve"},
+    {Fact::portal,               "portal",               kSetup,        {},       kAny,   5s,            portal,               "whether there is a portal"},
+    {Fact::vendorService,        "vendorService",        kSetup,        {},       kAny,   kServiceTime,  vendorService,        "whether the vendor is reached"},
+    {Fact::router,               "router",               kLink,         {},       kAny,   4s,            router,               "who made the router"},
+    {Fact::translation,          "translation",          kTranslation,  {},       kAny,   3s,            translation,          "how often addresses are translated"},
 };
 // clang-format on
 
 }  // namespace
+
+std::span<const FactRow> factRows() {
+    return kRows;
+}
 
 const FactRow& rowOf(Fact fact) {
     return *std::ranges::find(kRows, fact, &FactRow::fact);

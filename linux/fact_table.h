@@ -17,9 +17,15 @@ struct Gathering {
     std::int64_t startOfPhase;  ///< ms on the clock that counts suspended time too
     Sources& sources;
     Until until;
-    const char* loss;  ///< of the row
-    /// To be called where the fact no longer minds what is kept waiting for it (`FactRow::after`). *Any* thread.
-    std::function<void()> yield = {};
+    const char* loss;                   ///< of the row
+    HomeChannel::Stay* stay = nullptr;  ///< of a fact that needs the home channel, and null for the others
+};
+
+/// What becomes of the channel that the radio is joined on while a fact is gathered.
+enum class HomeUse {
+    none,  ///< it does not matter
+    needed,  ///< from when the fact is wanted until it is there, or its gathering says that it is not needed any more
+    left,  ///< the radio visits other channels
 };
 
 /// How one fact is had.
@@ -27,12 +33,15 @@ struct FactRow {
     Fact fact;
     const char* name;             ///< in a trace
     std::span<const Fact> needs;  ///< facts that it builds on
-    std::span<const Fact> after;  ///< facts that it must not disturb: it waits until each is there or yields
+    std::span<const Fact> after;  ///< facts that may spare it its work: it waits until each is there
+    HomeUse home;
     std::chrono::milliseconds most;               ///< how long it may take
     Store (*gather)(const Gathering& gathering);  ///< on a worker's thread
     const char* loss;                             ///< what nobody can tell without it
 };
 
+/// All rows, in the order in which they are begun where several can be. *Any* thread.
+std::span<const FactRow> factRows();
 /// The row of a fact. *Any* thread.
 const FactRow& rowOf(Fact fact);
 

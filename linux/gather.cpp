@@ -19,7 +19,11 @@ using std::chrono::milliseconds;
 
 constexpr int kSignalSamples = 5;
 constexpr milliseconds kBetweenSamples{250};
+// Counters have steps of about 10 ms: within a second that is one in a hundred.
 constexpr milliseconds kCountedTime{1000};
+// While a scan goes on the radio is at home for a fifth of the time. Should that be less, what it counted has to do.
+constexpr milliseconds kLongestCount{8000};
+constexpr milliseconds kBetweenCounts{20};
 
 bool isUp(const std::string& interfaceName) {
     const Descriptor any(socket(AF_INET, SOCK_DGRAM | SOCK_CLOEXEC, 0));
@@ -60,6 +64,17 @@ Known<std::vector<std::uint8_t>> routeDump(std::uint16_t type, const std::string
     const NetlinkAnswer answer = socket->ask(request, until);
     if (answer.error != 0) return failureOf(answer.error, what);
     return answer.messages;
+}
+
+/// Waits until the radio has been at home for so long from now on.
+Wait waitAtHome(milliseconds wanted, const HomeChannel::Stay& stay, const Until& until) {
+    const Clock::duration goal = stay.timeAtHome() + wanted;
+    for (;;) {
+        const Clock::duration left = goal - stay.timeAtHome();
+        if (left <= Clock::duration::zero()) return Wait::ready;
+        const Wait wait = waitReadable(-1, until.within(std::max<Clock::duration>(left, kBetweenCounts)));
+        if (wait == Wait::stopped || Clock::now() >= until.deadline) return wait;
+    }
 }
 
 Error notJoined(const Link& link) {
@@ -124,17 +139,22 @@ Known<Survey> gatherSurvey(const Link& link, const Until& until) {
     return radio->survey(link.interfaceIndex, until);
 }
 
-Known<Airtime> gatherAirtime(const Link& link, const Until& until) {
+Known<Airtime> gatherAirtime(const Link& link, HomeChannel::Stay& stay, const Until& until) {
     Known<RadioSocket> radio = RadioSocket::open(until);
     if (!radio) return radio.error();
     const Known<Airtime> before = radio->airtime(link.interfaceIndex, until);
     if (!before) return before.error();
-    // Counters have steps of about 10 ms: within a second that is one in a hundred.
-    if (waitReadable(-1, until.within(kCountedTime)) == Wait::stopped)
-        return waitFailure(Wait::stopped, "airtime");
+    stay.allowBriefVisits();
+    const Wait wait = waitAtHome(kCountedTime, stay, until.within(kLongestCount));
+    if (wait == Wait::stopped) return waitFailure(wait, "airtime");
     const Known<Airtime> after = radio->airtime(link.interfaceIndex, until);
     if (!after) return after.error();
-    return airtimeBetween(*before, *after);
+    Airtime counted = airtimeBetween(*before, *after);
+    // On the others there was a brief visit at most. Some radios do not tell which one is in use.
+    std::erase_if(counted, [&](const ChannelTime& each) {
+        return !each.inUse && !(link.joined && each.frequency == link.joined->frequency);
+    });
+    return counted;
 }
 
 Known<AllowedChannels> gatherAllowedChannels(const Link& link, const Until& until) {
@@ -167,14 +187,14 @@ bool answersAsNeighbour(const Link& link, const std::string& address, const Unti
     return dump && wanted && isReachable(*dump, link.interfaceIndex, wanted->bytes());
 }
 
-Known<Echo> gatherGatewayEcho(const Link& link, EchoSocket& socket, const WhenSilent& whenSilent,
+Known<Echo> gatherGatewayEcho(const Link& link, EchoSocket& socket, HomeChannel::Stay& stay,
                               const Until& until) {
     if (!link.joined) return notJoined(link);
     const auto dump = routeDump<rtmsg>(RTM_GETROUTE, "routes", until);
     if (!dump) return dump.error();
     const std::vector<Gateway> gateways = readGateways(*dump, link.interfaceIndex);
     if (gateways.empty()) return failure(Reason::notJoined, link.interfaceName + " has no default route");
-    return socket.ask(gateways.front(), link.interfaceName, link.interfaceIndex, whenSilent, until);
+    return socket.ask(gateways.front(), link.interfaceName, link.interfaceIndex, stay, until);
 }
 
 }  // namespace wp

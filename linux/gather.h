@@ -22,14 +22,14 @@ Known<Station> gatherStation(const Link& link, const Until& until);
 Known<Survey> gatherSurvey(const Link& link, const Until& until);
 Known<Regulation> gatherRegulation(const Link& link, const Until& until);
 Known<Addresses> gatherAddresses(const Link& link, const Until& until);
-Known<Echo> gatherGatewayEcho(const Link& link, EchoSocket& socket, const WhenSilent& whenSilent,
+Known<Echo> gatherGatewayEcho(const Link& link, EchoSocket& socket, HomeChannel::Stay& stay,
                               const Until& until);
 
 /// Whether the kernel has lately heard from this address on the link, as from a router that ignores echo requests.
 bool answersAsNeighbour(const Link& link, const std::string& address, const Until& until);
 
-/// What the radio counted on each channel within one second.
-Known<Airtime> gatherAirtime(const Link& link, const Until& until);
+/// What the radio counted on the channel in use within one second. Visits to other channels in between only make it longer.
+Known<Airtime> gatherAirtime(const Link& link, HomeChannel::Stay& stay, const Until& until);
 /// The channels that the radio and the regulatory domain allow.
 Known<AllowedChannels> gatherAllowedChannels(const Link& link, const Until& until);
 

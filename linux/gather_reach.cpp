@@ -180,7 +180,7 @@ Known<IPAddress> askStun(const Link& link, const LinkSetup& setup, const Endpoin
 }  // namespace
 
 Known<Echo> gatherOutsideEcho(const Link& link, const Endpoints& endpoints, EchoSocket& socket,
-                              const WhenSilent& whenSilent, const Until& until) {
+                              HomeChannel::Stay& stay, const Until& until) {
     if (!link.joined) return notJoined(link);
     const auto gateways = gatherGatewayAddresses(link.interfaceIndex, until);
     if (!gateways) return gateways.error();
@@ -190,7 +190,7 @@ Known<Echo> gatherOutsideEcho(const Link& link, const Endpoints& endpoints, Echo
         const bool hasRoute =
             std::ranges::any_of(*gateways, [ipv4](const IPAddress& each) { return each.isIPv4() == ipv4; });
         if (target && hasRoute)
-            return socket.ask(asTarget(*target), link.interfaceName, link.interfaceIndex, whenSilent, until);
+            return socket.ask(asTarget(*target), link.interfaceName, link.interfaceIndex, stay, until);
     }
     return notConfigured("the ping beyond the router");
 }

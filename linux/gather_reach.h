@@ -12,7 +12,7 @@ namespace wp {
 
 /// Echo requests to the configured address of a family that has a default route, IPv4 first.
 Known<Echo> gatherOutsideEcho(const Link& link, const Endpoints& endpoints, EchoSocket& socket,
-                              const WhenSilent& whenSilent, const Until& until);
+                              HomeChannel::Stay& stay, const Until& until);
 
 /// A name outside, asked of the link's own servers.
 Known<NameAnswer> gatherNameAnswer(const Link& link, const LinkSetup& setup, const Endpoints& endpoints,

@@ -49,6 +49,8 @@ void Phase::want(Fact fact) {
     const std::optional<Fact> meant = resolved(fact);
     if (!meant || state(*meant) != State::idle) return;
     state(*meant) = State::wanted;
+    if (rowOf(*meant).home == HomeUse::needed)
+        stay(*meant) = std::make_shared<HomeChannel::Stay>(sources_.home);
     for (const Fact need : rowOf(*meant).needs) want(need);
 }
 
@@ -75,44 +77,36 @@ bool Phase::isReady(const NumberedTest& test) const {
 }
 
 void Phase::launchWhatCan() {
-    for (std::size_t i = 0; i < states_.size(); ++i) {
-        const Fact fact = static_cast<Fact>(i);
-        if (state(fact) != State::wanted) continue;
-        const FactRow& row = rowOf(fact);
+    for (const FactRow& row : factRows()) {
+        if (state(row.fact) != State::wanted) continue;
         const auto isDone = [&](Fact other) { return state(other) == State::done; };
-        const auto isOver = [&](Fact other) {
-            const State of = state(other);
-            return of == State::done || of == State::idle || of == State::yielding;
-        };
-        if (std::ranges::all_of(row.needs, isDone) && std::ranges::all_of(row.after, isOver)) launch(fact);
+        const auto isOver = [&](Fact other) { return isDone(other) || state(other) == State::idle; };
+        if (std::ranges::all_of(row.needs, isDone) && std::ranges::all_of(row.after, isOver)) launch(row);
     }
 }
 
-void Phase::yield(Fact fact) {
-    if (state(fact) != State::running) return;
-    state(fact) = State::yielding;
-    launchWhatCan();
-}
-
-void Phase::trace(const char* fact, Clock::time_point begin) const {
-    const auto since = [](Clock::time_point from, Clock::time_point to) {
-        return std::to_string(std::chrono::duration_cast<std::chrono::milliseconds>(to - from).count());
+void Phase::trace(const FactRow& row, Clock::time_point begin, Clock::duration waited) const {
+    const auto inMilliseconds = [](Clock::duration time) {
+        return std::to_string(std::chrono::duration_cast<std::chrono::milliseconds>(time).count()) + " ms";
     };
     const char* const kind = topic_.subject == Subject::device ? "device" : topic_.named ? "named" : "joined";
-    sources_.notes.once(std::string("trace: ") + kind + " " + fact + " began at " +
-                        since(traceStart_, begin) + " ms, took " + since(begin, Clock::now()) + " ms");
+    std::string text = std::string("trace: ") + kind + " " + row.name + " began at " +
+                       inMilliseconds(begin - traceStart_) + ", took " + inMilliseconds(Clock::now() - begin);
+    if (row.home == HomeUse::left) text += ", waited " + inMilliseconds(waited) + " of it for the channel";
+    sources_.notes.once(text);
 }
 
-void Phase::launch(Fact fact) {
-    state(fact) = State::running;
-    const FactRow& row = rowOf(fact);
-    workers_.start([self = shared_from_this(), &row]() -> Workers::Publication {
+void Phase::launch(const FactRow& row) {
+    state(row.fact) = State::running;
+    workers_.start([self = shared_from_this(), &row,
+                    stay = std::move(stay(row.fact))]() mutable -> Workers::Publication {
         const Clock::time_point begin = Clock::now();
+        const Clock::duration waited = self->sources_.home.timeWaited();
         const Until until{self->stop_, begin + row.most};
-        const auto yield = [self, &row] { self->workers_.post([self, &row] { self->yield(row.fact); }); };
         Store store = row.gather(
-            {self->facts_, self->topic_, self->startedAt_, self->sources_, until, row.loss, yield});
-        if (self->sources_.traced) self->trace(row.name, begin);
+            {self->facts_, self->topic_, self->startedAt_, self->sources_, until, row.loss, stay.get()});
+        stay.reset();
+        if (self->sources_.traced) self->trace(row, begin, self->sources_.home.timeWaited() - waited);
         return [self, &row, store = std::move(store)] {
             store(self->facts_);
             self->state(row.fact) = State::done;

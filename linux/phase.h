@@ -16,7 +16,8 @@ namespace wp {
 struct Sources {
     std::optional<std::string> interfaceName;  ///< as the user named it
     Notes notes;
-    Scanner scanner{notes};
+    HomeChannel home;
+    Scanner scanner{notes, home};
     EchoSocket gatewayEcho;
     EchoSocket outsideEcho;
     Config config = Config::defaults();
@@ -30,6 +31,8 @@ struct PhaseTopic {
     std::chrono::milliseconds oldestScan{0};
     friend bool operator==(const PhaseTopic&, const PhaseTopic&) = default;
 };
+
+struct FactRow;
 
 /// The facts of a row of requests with the same configuration. Each fact is gathered once, on a thread of its own
 /// as soon as what it builds on is there; requests wait for their facts. Owner's thread; workers read only facts
@@ -49,18 +52,17 @@ class Phase : public std::enable_shared_from_this<Phase> {
     bool isReady(const NumberedTest& test) const;
 
   private:
-    enum class State { idle, wanted, running, yielding, done };
+    enum class State { idle, wanted, running, done };
 
     State& state(Fact fact) { return states_[static_cast<std::size_t>(fact)]; }
     State state(Fact fact) const { return states_[static_cast<std::size_t>(fact)]; }
+    std::shared_ptr<HomeChannel::Stay>& stay(Fact fact) { return stays_[static_cast<std::size_t>(fact)]; }
     /// The fact that stands for this one in this phase; nothing when the phase needs none.
     std::optional<Fact> resolved(Fact fact) const;
     void want(Fact fact);
     void launchWhatCan();
-    void launch(Fact fact);
-    /// Lets those begin that wait for a fact which is still being gathered.
-    void yield(Fact fact);
-    void trace(const char* fact, Clock::time_point begin) const;
+    void launch(const FactRow& row);
+    void trace(const FactRow& row, Clock::time_point begin, Clock::duration waited) const;
 
     PhaseTopic topic_;
     std::int64_t startedAt_ = bootMilliseconds();
@@ -71,6 +73,8 @@ class Phase : public std::enable_shared_from_this<Phase> {
     std::function<void()> onProgress_;
     Facts facts_;
     std::array<State, kFactCount> states_{};
+    /// Of the facts that need the home channel, from when they are wanted until they are there.
+    std::array<std::shared_ptr<HomeChannel::Stay>, kFactCount> stays_;
 };
 
 }  // namespace wp

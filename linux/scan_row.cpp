@@ -6,10 +6,6 @@
 namespace wp {
 namespace {
 
-// Long enough that an access point hands over what it kept meanwhile, and that a short exchange goes to and fro. The
-// kernel itself stays for a fifth of a second (mac80211, HZ / 5).
-constexpr std::chrono::milliseconds kAtHome{30};
-
 /// Channels 1, 6 and 11, which alone do not overlap; then those of 5 GHz on which no radar must be waited for.
 constexpr std::array<std::uint32_t, 12> kLikely = {2412, 2437, 2462, 5180, 5200, 5220,
                                                    5240, 5745, 5765, 5785, 5805, 5825};
@@ -33,6 +29,12 @@ ScanOrder ScanRow::next() const {
     next.frequencies = remaining_;
     if (slicing_.wanted) next.frequencies.resize(1);
     return next;
+}
+
+std::optional<HomeChannel::Visit> ScanRow::visit() const {
+    if (!slicing_.wanted) return HomeChannel::Visit::lengthy;
+    if (remaining_.front() == slicing_.home) return std::nullopt;
+    return HomeChannel::Visit::brief;
 }
 
 std::chrono::milliseconds ScanRow::pause() const {

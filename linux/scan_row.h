@@ -5,6 +5,7 @@
 #include <span>
 #include <vector>
 
+#include "linux/home_channel.h"
 #include "linux/radio_socket.h"
 
 namespace wp {
@@ -33,6 +34,8 @@ class ScanRow {
     bool isGivenUp() const { return starts_ == kStarts || aborts_ == kAborts; }
     /// The request to make now. Not when it is complete.
     ScanOrder next() const;
+    /// How the request takes the radio away from the channel it is joined on; nothing where it does not.
+    std::optional<HomeChannel::Visit> visit() const;
     /// How long the radio stays at home before it.
     std::chrono::milliseconds pause() const;
 

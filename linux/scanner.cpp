@@ -26,11 +26,31 @@ bool hearsOthers(const std::vector<AccessPoint>& found) {
     return std::ranges::any_of(found, [](const AccessPoint& each) { return !each.joined; });
 }
 
+/// Keeps the radio away from its home channel for as long as it lives, beginning when nobody minds.
+class Away {
+  public:
+    Away(HomeChannel& home, std::optional<HomeChannel::Visit> visit, const Until& until)
+        : home_(home), leaves_(visit), wait_(visit ? home.leave(*visit, until) : Wait::ready) {}
+    ~Away() {
+        if (leaves_ && !failed()) home_.returned();
+    }
+    Away(const Away&) = delete;
+    Away& operator=(const Away&) = delete;
+
+    bool failed() const { return wait_ != Wait::ready; }
+    Error error() const { return waitFailure(wait_, "scan"); }
+
+  private:
+    HomeChannel& home_;
+    bool leaves_;
+    Wait wait_;
+};
+
 /// One row of scans for one wish.
 class ScanRun {
   public:
-    ScanRun(RadioSocket& radio, const ScanWish& wish, const Until& until)
-        : radio_(radio), wish_(wish), until_(until), startedAt_(bootMilliseconds()) {
+    ScanRun(RadioSocket& radio, HomeChannel& home, const ScanWish& wish, const Until& until)
+        : radio_(radio), home_(home), wish_(wish), until_(until), startedAt_(bootMilliseconds()) {
         if (const Known<RadioAbilities> abilities = radio_.abilities(wish_.radio, until_))
             abilities_ = *abilities;
         std::erase_if(abilities_.channels,
@@ -62,6 +82,8 @@ class ScanRun {
 
     /// What a scan found that whatever manages the interface was asked for, and who that was.
     Known<ScanReport> runByManager(bool listening, AskedManager& manager) {
+        const Away away(home_, HomeChannel::Visit::lengthy, until_);
+        if (away.failed()) return away.error();
         Known<Bus> bus = Bus::system();
         const auto asked = askManagerForScan(bus, {wish_.interfaceName, wish_.named, listening}, until_);
         if (!asked) return asked.error();
@@ -154,8 +176,11 @@ class ScanRun {
         return std::nullopt;
     }
 
-    /// Makes the row's next request and waits until the scan, or the one that is in its way, has ended.
+    /// Makes the row's next request as soon as nobody minds, and waits until the scan, or the one that is in its way, has
+    /// ended.
     std::optional<Error> visit(ScanRow& row) {
+        const Away away(home_, row.visit(), until_);
+        if (away.failed()) return away.error();
         const int error = radio_.startScan(wish_.interfaceIndex, row.next(), until_);
         if (error == EINVAL && row.skip()) return std::nullopt;
         if (error != 0 && error != EBUSY) return startFailure(error);
@@ -221,6 +246,7 @@ class ScanRun {
     }
 
     RadioSocket& radio_;
+    HomeChannel& home_;
     const ScanWish& wish_;
     const Until& until_;
     RadioAbilities abilities_;  ///< with only the channels that may be used and that carry networks
@@ -275,7 +301,7 @@ const ScanReport* ScanMemory::serving(const ScanWish& wish) const {
 }
 
 Known<ScanReport> Scanner::scanNow(RadioSocket& radio, const ScanWish& wish, const Until& until) {
-    Known<ScanReport> report = ScanRun(radio, wish, until).run();
+    Known<ScanReport> report = ScanRun(radio, home_, wish, until).run();
     if (isNotPermitted(report)) return scanWithoutPermission(radio, wish, until);
     if (report && !report->completedAt)
         notes_.once("scans were cut short: other networks are judged by what was heard until then");
@@ -289,7 +315,7 @@ Known<ScanReport> Scanner::scanWithoutPermission(RadioSocket& radio, const ScanW
                                                  const Until& until) {
     AskedManager manager;
     const bool listening = wish.manner == ScanWish::Manner::listening && !wish.named;
-    Known<ScanReport> report = ScanRun(radio, wish, until).runByManager(listening, manager);
+    Known<ScanReport> report = ScanRun(radio, home_, wish, until).runByManager(listening, manager);
     if (report) {
         if (manager.listens) listened_.keep(wish.interfaceIndex, *report);
         notes_.once("no permission to scan (CAP_NET_ADMIN): " + manager.name + " was asked to scan instead" +
@@ -320,7 +346,7 @@ Known<std::vector<AccessPoint>> Scanner::listen(const ScanWish& wish, const Unti
     if (const ScanReport* const kept = listened_.serving(wish)) return kept->accessPoints;
     Known<RadioSocket> radio = openRadio(until);
     if (!radio) return radio.error();
-    const Known<ScanReport> report = ScanRun(*radio, wish, until).listen();
+    const Known<ScanReport> report = ScanRun(*radio, home_, wish, until).listen();
     if (isNotPermitted(report))
         return failure(Reason::notPermitted,
                        "no permission to listen (CAP_NET_ADMIN), and no connection manager that could");

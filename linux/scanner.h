@@ -3,6 +3,7 @@
 #include <mutex>
 #include <string>
 
+#include "linux/home_channel.h"
 #include "linux/notes.h"
 #include "linux/radio_socket.h"
 
@@ -44,10 +45,11 @@ class ScanMemory {
 };
 
 /// Scans, and remembers the last scan longer than the kernel does. Without the permission to scan it asks whatever
-/// manages the interface, and what that costs is told once. *Any* thread; one scan at a time.
+/// manages the interface, and what that costs is told once. A scan leaves the channel only while nobody needs it.
+/// *Any* thread; one scan at a time.
 class Scanner {
   public:
-    explicit Scanner(Notes& notes) : notes_(notes) {}
+    Scanner(Notes& notes, HomeChannel& home) : notes_(notes), home_(home) {}
 
     /// What the latest scan that is fresh enough found, or a new scan. A scan that somebody else has started is
     /// joined when it covers the radio's channels. An error says why there can be none.
@@ -62,6 +64,7 @@ class Scanner {
     Known<ScanReport> scanWithoutPermission(RadioSocket& radio, const ScanWish& wish, const Until& until);
 
     Notes& notes_;
+    HomeChannel& home_;
     std::mutex scanning_;
     ScanMemory scanned_, listened_;
 };

@@ -74,9 +74,10 @@ TEST(GatherRadio, WithoutTheInterfaceSaysWhatIsMissing) {
 
 TEST(GatherRadio, OfALinkThatHasJoinedNothingNothingIsAsked) {
     EchoSocket socket;
+    HomeChannel home;
+    HomeChannel::Stay stay(home);
     EXPECT_EQ(textOf(gatherStation(notJoined(), patience())), "lo is not joined to a network (code 2)");
-    EXPECT_EQ(textOf(gatherGatewayEcho(
-                  notJoined(), socket, [] {}, patience())),
+    EXPECT_EQ(textOf(gatherGatewayEcho(notJoined(), socket, stay, patience())),
               "lo is not joined to a network (code 2)");
     Link down = notJoined();
     down.up = false;
@@ -87,9 +88,11 @@ TEST(GatherRadio, BeingStoppedCountsBeforeEverythingElse) {
     const auto stop = std::make_shared<StopSignal>();
     stop->raise();
     const Until over = patience(std::chrono::seconds(20), stop);
+    HomeChannel home;
+    HomeChannel::Stay stay(home);
     for (const std::string& text :
          {textOf(gatherLink(std::nullopt, over)), textOf(gatherStationInterfaces(over)),
-          textOf(gatherAirtime(loopback(), over)), textOf(gatherSurvey(loopback(), over)),
+          textOf(gatherAirtime(loopback(), stay, over)), textOf(gatherSurvey(loopback(), over)),
           textOf(gatherRegulation(loopback(), over)), textOf(gatherAllowedChannels(loopback(), over)),
           textOf(gatherAddresses(loopback(), over)), textOf(gatherPeerLinks(loopback(), "", over))})
         EXPECT_EQ(text, "cancelled (code 8)");
@@ -104,40 +107,68 @@ TEST(GatherAddresses, OfLoopbackReachNobody) {
 
 TEST(GatherEcho, NeedsARouter) {
     EchoSocket socket;
-    EXPECT_EQ(textOf(gatherGatewayEcho(
-                  loopback(), socket, [] {}, patience())),
+    HomeChannel home;
+    HomeChannel::Stay stay(home);
+    EXPECT_EQ(textOf(gatherGatewayEcho(loopback(), socket, stay, patience())),
               "lo has no default route (code 2)");
-    EXPECT_EQ(textOf(gatherOutsideEcho(
-                  loopback(), {}, socket, [] {}, patience())),
+    EXPECT_EQ(textOf(gatherOutsideEcho(loopback(), {}, socket, stay, patience())),
               "lo has no default route (code 2)");
-    EXPECT_EQ(textOf(gatherOutsideEcho(
-                  notJoined(), {}, socket, [] {}, patience())),
+    EXPECT_EQ(textOf(gatherOutsideEcho(notJoined(), {}, socket, stay, patience())),
               "lo is not joined to a network (code 2)");
 }
 
-/// Who of five echo requests to an address was answered, and how often silence was told meanwhile.
-std::pair<Known<Echo>, int> echoFrom(std::vector<std::uint8_t> address) {
+/// Who of five echo requests to an address was answered.
+Known<Echo> echoFrom(std::vector<std::uint8_t> address, HomeChannel::Stay& stay) {
     EchoSocket socket;
-    int silences = 0;
-    Known<Echo> echo = socket.ask(
-        {Address::Family::ipv4, std::move(address), 0}, "lo", loopback().interfaceIndex, [&] { ++silences; },
-        patience());
-    return {std::move(echo), silences};
+    return socket.ask({Address::Family::ipv4, std::move(address), 0}, "lo", loopback().interfaceIndex, stay,
+                      patience());
 }
 
-TEST(EchoSocket, TellsOfSilenceOnceAndOnlyWhereNothingIsAnswered) {
-    const auto isAnswered = [](const std::optional<double>& each) { return each.has_value(); };
-    // An address of documentation's (RFC 5737): what leaves for it by the loopback interface reaches nobody.
-    auto unanswered = std::async(std::launch::async, [] { return echoFrom({192, 0, 2, 1}); });
-    const auto [echo, silences] = echoFrom({127, 0, 0, 1});
-    const auto [none, silencesOfNone] = unanswered.get();
+const std::vector<std::uint8_t> kAnswering = {127, 0, 0, 1};
+// Of documentation (RFC 5737): what leaves for it by the loopback interface reaches nobody.
+const std::vector<std::uint8_t> kSilent = {192, 0, 2, 1};
 
+bool isAnswered(const std::optional<double>& roundTrip) {
+    return roundTrip.has_value();
+}
+
+TEST(EchoSocket, GivesTheChannelUpWhereNothingIsAnswered) {
+    HomeChannel home;
+    HomeChannel::Stay stay(home);
+    const Known<Echo> echo = echoFrom(kSilent, stay);
     ASSERT_TRUE(echo) << echo.error().text();
-    ASSERT_TRUE(none) << none.error().text();
+    EXPECT_TRUE(std::ranges::none_of(echo->roundTrips, isAnswered));
+    EXPECT_EQ(Wait::ready, home.leave(HomeChannel::Visit::lengthy, patience(std::chrono::milliseconds(0))));
+}
+
+TEST(EchoSocket, KeepsTheChannelToItsEndWhereItIsAnswered) {
+    HomeChannel home;
+    HomeChannel::Stay stay(home);
+    const Known<Echo> echo = echoFrom(kAnswering, stay);
+    ASSERT_TRUE(echo) << echo.error().text();
     EXPECT_TRUE(std::ranges::all_of(echo->roundTrips, isAnswered));
-    EXPECT_EQ(0, silences);
-    EXPECT_TRUE(std::ranges::none_of(none->roundTrips, isAnswered));
-    EXPECT_EQ(1, silencesOfNone);
+    EXPECT_EQ(Wait::timeout, home.leave(HomeChannel::Visit::lengthy, patience(std::chrono::milliseconds(0))));
+}
+
+/// A busy machine may miss all pauses of a row, but not of every row.
+TEST(EchoSocket, LetsVisitsHappenBetweenAnAnswerAndTheNextRequest) {
+    HomeChannel home;
+    bool wasVisited = false;
+    for (int row = 0; row < 20 && !wasVisited; ++row) {
+        HomeChannel::Stay stay(home);
+        const auto over = std::make_shared<StopSignal>();
+        auto visitor = std::async(std::launch::async, [&] {
+            const Wait wait = home.leave(HomeChannel::Visit::brief, patience(std::chrono::seconds(20), over));
+            if (wait == Wait::ready) home.returned();
+            return wait == Wait::ready;
+        });
+        const Known<Echo> echo = echoFrom(kAnswering, stay);
+        over->raise();
+        wasVisited = visitor.get();
+        ASSERT_TRUE(echo) << echo.error().text();
+        EXPECT_TRUE(std::ranges::all_of(echo->roundTrips, isAnswered));
+    }
+    EXPECT_TRUE(wasVisited);
 }
 
 TEST(GatherReach, WithoutARouterNothingIsSearched) {

@@ -55,6 +55,18 @@ TEST(ScanRow, IsOneRequestWhereTheRadioScansByItselfOrIsNotJoined) {
     EXPECT_EQ(expected, requestsOf({listeningOn({2437, 2412, 5180}), {}}));
 }
 
+TEST(ScanRow, LeavesHomeBrieflyForEachChannelButItsOwn) {
+    ScanRow row(listeningOn({2437, 2412}), kJoinedInSoftware);
+    EXPECT_EQ(std::nullopt, row.visit());
+    row.ended(ScanRow::Whose::own, finished());
+    EXPECT_EQ(HomeChannel::Visit::brief, row.visit());
+}
+
+TEST(ScanRow, LeavesHomeForLongWhereTheRadioVisitsAllChannelsInOneGo) {
+    EXPECT_EQ(HomeChannel::Visit::lengthy, ScanRow(listeningOn({2437, 2412}), {}).visit());
+    EXPECT_EQ(HomeChannel::Visit::lengthy, ScanRow(listeningOn({}), kJoinedInSoftware).visit());
+}
+
 TEST(ScanRow, GoesOnWithoutAChannelThatIsRefusedAfterOthers) {
     ScanRow row(listeningOn({2437, 2412, 5180}), kJoinedInSoftware);
     EXPECT_FALSE(row.skip());

@@ -1,0 +1,104 @@
+#include "linux/home_channel.h"
+
+#include <sys/eventfd.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <cstdint>
+
+namespace wp {
+namespace {
+
+// A scan listens for 0.11 s on a channel, a little more than the time between two beacons (mac80211, HZ / 9).
+constexpr std::chrono::milliseconds kBriefVisit{125};
+// Who comes while the radio is away looks this often whether it is back.
+constexpr std::chrono::milliseconds kBetweenLooks{5};
+
+}  // namespace
+
+HomeChannel::HomeChannel() : changed_(eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK)) {}
+
+Wait HomeChannel::leave(Visit visit, const Until& until) {
+    const Clock::time_point begin = Clock::now();
+    for (;;) {
+        {
+            const std::lock_guard lock(mutex_);
+            std::uint64_t changes = 0;
+            [[maybe_unused]] const ssize_t size = read(changed_.number(), &changes, sizeof changes);
+            if (mayLeave(visit)) {
+                isAway_ = true;
+                leftAt_ = Clock::now();
+                timeWaited_ += leftAt_ - begin;
+                return Wait::ready;
+            }
+        }
+        if (const Wait wait = waitReadable(changed_.number(), until); wait != Wait::ready) return wait;
+    }
+}
+
+void HomeChannel::returned() {
+    const std::lock_guard lock(mutex_);
+    isAway_ = false;
+    returnedAt_ = Clock::now();
+    timeAway_ += returnedAt_ - leftAt_;
+}
+
+Clock::duration HomeChannel::timeWaited() const {
+    const std::lock_guard lock(mutex_);
+    return timeWaited_;
+}
+
+bool HomeChannel::mayLeave(Visit visit) const {
+    if (visit == Visit::lengthy) return needs_.empty();
+    const Clock::time_point settled = Clock::now() + kBriefVisit + kAtHome;
+    return std::ranges::all_of(needs_, [&](Clock::time_point needed) { return settled <= needed; });
+}
+
+bool HomeChannel::isSettled() const {
+    const std::lock_guard lock(mutex_);
+    return !isAway_ && Clock::now() >= returnedAt_ + kAtHome;
+}
+
+void HomeChannel::tellVisitor() {
+    const std::uint64_t one = 1;
+    [[maybe_unused]] const ssize_t written = write(changed_.number(), &one, sizeof one);
+}
+
+HomeChannel::Stay::Stay(HomeChannel& channel) : channel_(channel) {
+    const std::lock_guard lock(channel_.mutex_);
+    need_ = channel_.needs_.insert(channel_.needs_.end(), Clock::time_point::min());
+}
+
+Wait HomeChannel::Stay::begin(const Until& until) {
+    {
+        const std::lock_guard lock(channel_.mutex_);
+        if (!hasEnded_) *need_ = Clock::time_point::min();
+    }
+    while (!channel_.isSettled()) {
+        if (waitReadable(-1, until.within(kBetweenLooks)) == Wait::stopped) return Wait::stopped;
+        if (Clock::now() >= until.deadline) return Wait::timeout;
+    }
+    return Wait::ready;
+}
+
+void HomeChannel::Stay::pauseUntil(Clock::time_point time) {
+    const std::lock_guard lock(channel_.mutex_);
+    if (hasEnded_) return;
+    *need_ = time;
+    channel_.tellVisitor();
+}
+
+void HomeChannel::Stay::end() {
+    const std::lock_guard lock(channel_.mutex_);
+    if (std::exchange(hasEnded_, true)) return;
+    channel_.needs_.erase(need_);
+    channel_.tellVisitor();
+}
+
+Clock::duration HomeChannel::Stay::timeAtHome() const {
+    const std::lock_guard lock(channel_.mutex_);
+    const Clock::time_point now = channel_.isAway_ ? channel_.leftAt_ : Clock::now();
+    return now - channel_.startedAt_ - channel_.timeAway_;
+}
+
+}  // namespace wp
