@@ -97,8 +97,7 @@ class EchoRow {
             [[maybe_unused]] const ssize_t size =
                 sendto(descriptor_, request.data(), request.size(), 0, address_.get(), address_.size);
             asked_ = i + 1;
-            const Clock::time_point next = sent_[0] + kApart * static_cast<int>(i + 1);
-            if (asked_ < kEchoRequests && !receiveUntil(next, until)) return false;
+            if (asked_ < kEchoRequests && !receiveUntil(sent_[i] + kApart, until)) return false;
         }
         return true;
     }
@@ -111,7 +110,7 @@ class EchoRow {
     /// Takes answers until the time is over, or, after the last request, until all are there. False when stopped.
     bool receiveUntil(Clock::time_point time, const Until& until) {
         while (asked_ < kEchoRequests || isWaitingForAnswers()) {
-            if (!isWaitingForAnswers()) stay_.pauseUntil(time);
+            if (!isWaitingForAnswers()) stay_.pause();
             const Wait wait = waitReadable(descriptor_, {until.stop, std::min(time, until.deadline)});
             if (wait == Wait::stopped) return false;
             if (wait == Wait::timeout) return true;

@@ -144,7 +144,7 @@ Known<Airtime> gatherAirtime(const Link& link, HomeChannel::Stay& stay, const Un
     if (!radio) return radio.error();
     const Known<Airtime> before = radio->airtime(link.interfaceIndex, until);
     if (!before) return before.error();
-    stay.allowBriefVisits();
+    stay.pause();
     const Wait wait = waitAtHome(kCountedTime, stay, until.within(kLongestCount));
     if (wait == Wait::stopped) return waitFailure(wait, "airtime");
     const Known<Airtime> after = radio->airtime(link.interfaceIndex, until);

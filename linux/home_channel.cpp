@@ -3,14 +3,12 @@
 #include <sys/eventfd.h>
 #include <unistd.h>
 
-#include <algorithm>
 #include <cstdint>
+#include <utility>
 
 namespace wp {
 namespace {
 
-// A scan listens for 0.11 s on a channel, a little more than the time between two beacons (mac80211, HZ / 9).
-constexpr std::chrono::milliseconds kBriefVisit{125};
 // Who comes while the radio is away looks this often whether it is back.
 constexpr std::chrono::milliseconds kBetweenLooks{5};
 
@@ -48,12 +46,6 @@ Clock::duration HomeChannel::timeWaited() const {
     return timeWaited_;
 }
 
-bool HomeChannel::mayLeave(Visit visit) const {
-    if (visit == Visit::lengthy) return needs_.empty();
-    const Clock::time_point settled = Clock::now() + kBriefVisit + kAtHome;
-    return std::ranges::all_of(needs_, [&](Clock::time_point needed) { return settled <= needed; });
-}
-
 bool HomeChannel::isSettled() const {
     const std::lock_guard lock(mutex_);
     return !isAway_ && Clock::now() >= returnedAt_ + kAtHome;
@@ -66,13 +58,14 @@ void HomeChannel::tellVisitor() {
 
 HomeChannel::Stay::Stay(HomeChannel& channel) : channel_(channel) {
     const std::lock_guard lock(channel_.mutex_);
-    need_ = channel_.needs_.insert(channel_.needs_.end(), Clock::time_point::min());
+    ++channel_.stays_;
+    ++channel_.needing_;
 }
 
 Wait HomeChannel::Stay::begin(const Until& until) {
     {
         const std::lock_guard lock(channel_.mutex_);
-        if (!hasEnded_) *need_ = Clock::time_point::min();
+        if (!hasEnded_ && !std::exchange(isNeeding_, true)) ++channel_.needing_;
     }
     while (!channel_.isSettled()) {
         if (waitReadable(-1, until.within(kBetweenLooks)) == Wait::stopped) return Wait::stopped;
@@ -81,17 +74,18 @@ Wait HomeChannel::Stay::begin(const Until& until) {
     return Wait::ready;
 }
 
-void HomeChannel::Stay::pauseUntil(Clock::time_point time) {
+void HomeChannel::Stay::pause() {
     const std::lock_guard lock(channel_.mutex_);
-    if (hasEnded_) return;
-    *need_ = time;
+    if (!std::exchange(isNeeding_, false)) return;
+    --channel_.needing_;
     channel_.tellVisitor();
 }
 
 void HomeChannel::Stay::end() {
+    pause();
     const std::lock_guard lock(channel_.mutex_);
     if (std::exchange(hasEnded_, true)) return;
-    channel_.needs_.erase(need_);
+    --channel_.stays_;
     channel_.tellVisitor();
 }
 

@@ -1,7 +1,6 @@
 #pragma once
 
 #include <chrono>
-#include <list>
 #include <mutex>
 
 #include "linux/stop_signal.h"
@@ -16,9 +15,6 @@ inline constexpr std::chrono::milliseconds kAtHome{30};
 /// Shares the radio between those who need it on the channel of the joined network, such as echo requests, and a scan that
 /// visits other channels, so that neither falls into the other. *Any* thread; one visitor at a time.
 class HomeChannel {
-    /// From when on each of those who need the channel needs it.
-    using Needs = std::list<Clock::time_point>;
-
   public:
     /// Somebody who needs the channel, from the beginning on and for as long as this lives. One thread at a time; the
     /// channel outlives it.
@@ -31,10 +27,8 @@ class HomeChannel {
 
         /// Needs the channel from now on. Where the radio is away this waits until it is back and has settled.
         Wait begin(const Until& until);
-        /// Needs the channel again from that time on: a brief visit that is over by then is welcome.
-        void pauseUntil(Clock::time_point time);
-        /// Brief visits are welcome at any time, others are not.
-        void allowBriefVisits() { pauseUntil(Clock::time_point::max()); }
+        /// Until the next `begin` brief visits are welcome, others are not.
+        void pause();
         /// Needs the channel no more, nor again. Calling it again changes nothing.
         void end();
         /// How long the radio has been at home since the channel is looked after.
@@ -42,8 +36,7 @@ class HomeChannel {
 
       private:
         HomeChannel& channel_;
-        Needs::iterator need_;
-        bool hasEnded_ = false;
+        bool isNeeding_ = true, hasEnded_ = false;
     };
 
     HomeChannel();
@@ -57,13 +50,14 @@ class HomeChannel {
     Clock::duration timeWaited() const;
 
   private:
-    bool mayLeave(Visit visit) const;
+    bool mayLeave(Visit visit) const { return visit == Visit::brief ? needing_ == 0 : stays_ == 0; }
     bool isSettled() const;
     void tellVisitor();
 
     mutable std::mutex mutex_;
     Descriptor changed_;  ///< readable where somebody needs less than when the visitor looked
-    Needs needs_;
+    int stays_ = 0;       ///< that have not ended
+    int needing_ = 0;     ///< of them, those that do not pause
     Clock::time_point startedAt_ = Clock::now();
     Clock::duration timeAway_{0}, timeWaited_{0};
     bool isAway_ = false;
