@@ -21,6 +21,9 @@ std::vector<ReportedFinding> findingsOf(const ReportInput& input);
 /// The tests that could not tell, by reason, without those that a cause explains.
 std::vector<Untold> untoldOf(const ReportInput& input);
 
+/// Whether somebody gave this answer; a replay says so where its recording has none.
+bool isRecorded(const Answer& answer);
+
 /// Why the test could not tell, in a sentence.
 std::string reasonText(const Check& check, bool hasAnswers, const Texts& texts);
 

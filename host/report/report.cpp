@@ -55,6 +55,17 @@ std::string wholeText(const ReportInput& input, const std::vector<ReportedFindin
     return wholeWithoutOutage(input, findings);
 }
 
+std::string unknownText(const ReportInput& input, const Check& check) {
+    if (!check.answer || !check.answer->error) return input.texts.text("ANSWER_UNKNOWN");
+    return input.texts.text("ANSWER_UNKNOWN_WHY",
+                            {{"reason", reasonText(check, input.evidence.hasAnswers, input.texts)}});
+}
+
+std::string serviceWords(const Check& check) {
+    const bool hasWords = check.answer && check.answer->error && isRecorded(*check.answer);
+    return hasWords ? ui::displayForm(check.answer->error->message) : "";
+}
+
 ReportedTest testOf(const ReportInput& input, const Check& check) {
     const Texts& texts = input.texts;
     ReportedTest test;
@@ -66,9 +77,8 @@ ReportedTest testOf(const ReportInput& input, const Check& check) {
     if (check.verdict) test.answer = texts.text(*check.verdict ? "ANSWER_YES" : "ANSWER_NO");
     if (check.verdict) test.measured = measuredText(input.evidence, check, texts);
     if (check.isUntold()) {
-        test.answer = texts.text("ANSWER_UNKNOWN");
-        if (check.answer && check.answer->error)
-            test.measured = ui::displayForm(check.answer->error->message);
+        test.answer = unknownText(input, check);
+        test.detail = serviceWords(check);
     }
     if (test.answer.empty()) test.answer = texts.text("ANSWER_NOT_ASKED");
     return test;

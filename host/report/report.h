@@ -53,6 +53,7 @@ struct ReportedTest {
     std::string question;
     std::string answer;  ///< yes, no, or that it could not be told and why
     std::string measured;
+    std::string detail;  ///< the service's own words for why it could not be told: English, in display form
 };
 
 struct Report {

@@ -153,7 +153,9 @@ class ReportWriter {
             if (!previous || previous->part != test.part)
                 writer_.paragraph(partText(evidence_, test.part, texts_));
             std::string number = std::to_string(test.testID);
-            writer_.bullet(number + " " + test.question + " " + test.answer + texts_.aside(test.measured), 2);
+            writer_.bullet(number + " " + test.question + " " + test.answer + texts_.aside(test.measured) +
+                               texts_.aside(test.detail),
+                           2);
             previous = &test;
         }
     }

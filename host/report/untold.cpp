@@ -22,8 +22,8 @@ bool isToldOnceJoined(const Check& check) {
 std::string reasonKey(const Check& check, bool hasAnswers) {
     if (isToldOnceJoined(check)) return "AFTER_JOINING";
     if (!check.answer) return hasAnswers ? "NOT_RECORDED" : "NOT_STATED";
+    if (!isRecorded(*check.answer)) return "NOT_RECORDED";
     int code = check.answer->error ? check.answer->error->code : 0;
-    if (code == kNoRecordedAnswer) return "NOT_RECORDED";
     bool isKnown = code > 0 && code < static_cast<int>(std::size(kReasons));
     return isKnown ? kReasons[code] : "OTHER";
 }
@@ -46,6 +46,10 @@ Untold optedOut(const char* key, const Texts& texts) {
 }
 
 }  // namespace
+
+bool isRecorded(const Answer& answer) {
+    return !answer.error || answer.error->code != kNoRecordedAnswer;
+}
 
 std::string reasonText(const Check& check, bool hasAnswers, const Texts& texts) {
     return texts.text("REASON_" + reasonKey(check, hasAnswers));

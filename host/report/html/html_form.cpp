@@ -195,7 +195,10 @@ class Page {
             markup_.open("tr");
             markup_.element("td", std::to_string(test.testID), {{"class", "figure"}});
             markup_.element("td", test.question);
-            markup_.element("td", test.answer + texts_.aside(test.measured));
+            markup_.open("td");
+            markup_.text(test.answer + texts_.aside(test.measured));
+            if (!test.detail.empty()) markup_.element("span", texts_.aside(test.detail), {{"lang", "en"}});
+            markup_.close();
             markup_.close();
             previous = &test;
         }

@@ -341,6 +341,35 @@ TEST(Report, TestsThatCouldNotTellAreGroupedByWhatIsMissing) {
     EXPECT_FALSE(testsFor("The recording holds no answer.").empty());
 }
 
+TEST(Report, WhyATestCouldNotTellIsSaidInTheViewersLanguageBesideTheServicesWords) {
+    Evidence evidence = withJoined({});
+    evidence.hasAnswers = true;
+    evidence.answers = {failed(35, 7, "no beacon\x1B"), failed(34, -1, "no recorded answer for test 34")};
+    const auto told = [&](const char* language, int testID) {
+        const Report report = makeReport(evidence, {}, Texts(language));
+        const auto test = std::ranges::find(report.tests, testID, &ReportedTest::testID);
+        return test->answer + "|" + test->detail;
+    };
+
+    EXPECT_EQ(told("en", 35), "could not be told: No answer came in time.|no beacon\\x1B");
+    EXPECT_EQ(told("de", 35), "nicht festzustellen: Es kam keine rechtzeitige Antwort.|no beacon\\x1B");
+    EXPECT_EQ(told("ja", 35), "わかりませんでした。時間内に応答がありませんでした。|no beacon\\x1B");
+    // What a replay says of its recording is all in the reason.
+    EXPECT_EQ(told("de", 34), "nicht festzustellen: Die Aufzeichnung enthält keine Antwort.|");
+}
+
+TEST(Report, OnAPageTheServicesWordsAreMarkedAsEnglish) {
+    Evidence evidence = withJoined({});
+    evidence.hasAnswers = true;
+    evidence.answers = {failed(35, 7, "no beacon <heard>")};
+    const Texts texts("de");
+
+    EXPECT_THAT(
+        reportPage(makeReport(evidence, {}, texts), evidence, TextForm::Tests::all, texts),
+        testing::HasSubstr("<td>nicht festzustellen: Es kam keine rechtzeitige Antwort.<span lang=\"en\"> "
+                           "(no beacon &lt;heard&gt;)</span></td>"));
+}
+
 TEST(Report, ANameFromTheAirCannotSteerATerminal) {
     Evidence evidence = withJoined({{"networkName",
                                      "a\x1B[2J\xE2\x80\xAE"
