@@ -98,9 +98,9 @@ class AirWriter {
     void writeBand(const BandOfAir& band, const std::vector<HeardNetwork>& networks) {
         ChannelPicture picture;
         picture.band = band.pictured;
-        picture.identifier = band.identifier;
-        picture.title = texts_.text("HTML_CHANNELS_TITLE", {{"band", texts_.text(band.name)}});
-        picture.description = describe(networks);
+        picture.words.identifier = band.identifier;
+        picture.words.title = texts_.text("HTML_CHANNELS_TITLE", {{"band", texts_.text(band.name)}});
+        picture.words.description = describe(networks);
         if (band.heard == HeardBand::ghz5) picture.radarChannels = radarChannels(evidence_);
         if (!picture.radarChannels.empty()) picture.radar = texts_.text("HTML_RADAR");
         for (const HeardNetwork& network : networks) picture.networks.push_back(pictured(network));
@@ -108,7 +108,7 @@ class AirWriter {
         markup_.open("figure");
         markup_.element("figcaption", texts_.text(band.name));
         drawChannels(picture, markup_);
-        writeTable(picture.title, networks);
+        writeTable(picture.words.title, networks);
         markup_.close();
     }
 
@@ -158,8 +158,8 @@ class AirWriter {
 
     void writePing(const std::string& title, const char* identifier, const Array& times) {
         PingPicture picture;
-        picture.identifier = identifier;
-        picture.title = title;
+        picture.words.identifier = identifier;
+        picture.words.title = title;
         for (const Value& value : times) {
             const DictionaryPointer one = Dictionary::make({{"time", value}});
             picture.times.push_back(numberIn(one, "time"));
@@ -168,7 +168,7 @@ class AirWriter {
                 time ? texts_.text("HTML_TIME", {{"time", texts_.number(*time, *time < 10 ? 1 : 0)}})
                      : texts_.text("HTML_LOST"));
         }
-        picture.description = texts_.list(picture.labels);
+        picture.words.description = texts_.list(picture.labels);
         markup_.raw("\n");
         markup_.open("figure");
         markup_.element("figcaption", title);

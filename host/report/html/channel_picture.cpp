@@ -99,13 +99,7 @@ class Drawing {
         : picture_(picture), markup_(markup), stretches_(stretchesOf(picture.band)), scale_(stretches_) {}
 
     void draw() {
-        const std::string title = picture_.identifier + "-title", text = picture_.identifier + "-text";
-        markup_.open("svg", {{"viewBox", "0 0 720 320"},
-                             {"role", "img"},
-                             {"class", "channels"},
-                             {"aria-labelledby", title + " " + text}});
-        markup_.element("title", picture_.title, {{"id", title}});
-        markup_.element("desc", picture_.description, {{"id", text}});
+        markup_.openPicture("channels", "0 0 720 320", picture_.words);
         drawHatch();
         drawRadar();
         drawGrid();
@@ -118,7 +112,7 @@ class Drawing {
     }
 
   private:
-    std::string hatch() const { return picture_.identifier + "-hatch"; }
+    std::string hatch() const { return picture_.words.identifier + "-hatch"; }
 
     void drawHatch() {
         markup_.open("defs");

@@ -24,9 +24,7 @@ struct ChannelPicture {
     enum class Band { ghz2, ghz5, ghz6 };
 
     Band band = Band::ghz2;
-    std::string identifier;   ///< of the picture in its page
-    std::string title;        ///< for those who cannot see it
-    std::string description;  ///< the same in a sentence or two
+    PictureWords words;
     std::string radar;  ///< what stands over channels that are shared with radar; empty: none are marked
     std::vector<int> radarChannels;
     std::vector<PicturedNetwork> networks;

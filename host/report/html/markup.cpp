@@ -55,6 +55,14 @@ void Markup::close() {
     open_.pop_back();
 }
 
+void Markup::openPicture(const char* kind, const char* viewBox, const PictureWords& words) {
+    const std::string title = words.identifier + "-title", text = words.identifier + "-text";
+    open("svg",
+         {{"viewBox", viewBox}, {"role", "img"}, {"class", kind}, {"aria-labelledby", title + " " + text}});
+    element("title", words.title, {{"id", title}});
+    element("desc", words.description, {{"id", text}});
+}
+
 void Markup::text(std::string_view text) {
     out_ += withUnitsKept(escaped(text));
 }

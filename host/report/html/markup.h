@@ -7,6 +7,13 @@
 
 namespace wp::host {
 
+/// What a picture says to those who cannot see it.
+struct PictureWords {
+    std::string identifier;  ///< of the picture in its page
+    std::string title;
+    std::string description;  ///< the same in a sentence or two
+};
+
 /// Writes HTML that is well-formed XML too. Every text and every attribute's value passes through here: it is put
 /// into its display form (`platform/ui/display_text.h`), so that no character hides, reorders or commands, and what
 /// HTML would read as markup is escaped. A text's numbers stay beside their units. Not for several threads at once.
@@ -17,6 +24,8 @@ class Markup {
     /// Opens an element, which `close` closes again; elements close in the reverse order.
     void open(std::string_view tag, const Attributes& attributes = {});
     void close();
+    /// Opens a picture in SVG, which `close` closes again, with the words for those who cannot see it.
+    void openPicture(const char* kind, const char* viewBox, const PictureWords& words);
     void text(std::string_view text);
     /// An element with this text.
     void element(std::string_view tag, std::string_view text, const Attributes& attributes = {});

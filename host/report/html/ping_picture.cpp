@@ -35,13 +35,7 @@ void drawAnswer(double middle, double width, double share, Markup& markup) {
 }  // namespace
 
 void drawPings(const PingPicture& picture, Markup& markup) {
-    const std::string title = picture.identifier + "-title", text = picture.identifier + "-text";
-    markup.open("svg", {{"viewBox", "0 0 360 120"},
-                        {"role", "img"},
-                        {"class", "pings"},
-                        {"aria-labelledby", title + " " + text}});
-    markup.element("title", picture.title, {{"id", title}});
-    markup.element("desc", picture.description, {{"id", text}});
+    markup.openPicture("pings", "0 0 360 120", picture.words);
     double longest = kFloor;
     for (const auto& time : picture.times) longest = std::max(longest, time.value_or(0));
     const double step = kWidth / static_cast<double>(std::max<std::size_t>(1, picture.times.size()));

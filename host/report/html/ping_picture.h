@@ -10,9 +10,7 @@ namespace wp::host {
 
 /// The answers to a row of echo requests.
 struct PingPicture {
-    std::string identifier;                    ///< of the picture in its page
-    std::string title;                         ///< for those who cannot see it
-    std::string description;                   ///< the same in a sentence or two
+    PictureWords words;
     std::vector<std::optional<double>> times;  ///< ms; absent: lost
     std::vector<std::string> labels;           ///< one for each, as it is to be read
 };

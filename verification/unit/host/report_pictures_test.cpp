@@ -18,9 +18,7 @@ using Band = ChannelPicture::Band;
 ChannelPicture picture(Band band, std::vector<PicturedNetwork> networks) {
     ChannelPicture picture;
     picture.band = band;
-    picture.identifier = "band";
-    picture.title = "Title";
-    picture.description = "Description";
+    picture.words = {"band", "Title", "Description"};
     picture.networks = std::move(networks);
     return picture;
 }
