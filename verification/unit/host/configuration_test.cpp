@@ -4,10 +4,10 @@
 
 #include <cstdlib>
 #include <filesystem>
-#include <fstream>
 
 #include "exchange/live.h"
 #include "host/exit.h"
+#include "verification/unit/fakes/temporary_folder.h"
 
 namespace wp::host {
 namespace {
@@ -16,19 +16,14 @@ namespace {
 class UsersConfiguration : public testing::Test {
   protected:
     void SetUp() override {
-        std::string pattern = testing::TempDir() + "/wpXXXXXX";
-        folder_ = mkdtemp(pattern.data());
-        std::filesystem::create_directory(folder_ + "/wifi-profile");
-        setenv("XDG_CONFIG_HOME", folder_.c_str(), 1);
+        std::filesystem::create_directory(folder_ / "wifi-profile");
+        setenv("XDG_CONFIG_HOME", folder_.path().c_str(), 1);
     }
-    void TearDown() override {
-        unsetenv("XDG_CONFIG_HOME");
-        std::filesystem::remove_all(folder_);
-    }
+    void TearDown() override { unsetenv("XDG_CONFIG_HOME"); }
 
     std::string write(const std::string& name, const std::string& json) const {
-        std::ofstream(folder_ + "/" + name) << json;
-        return folder_ + "/" + name;
+        folder_.write(name, json);
+        return folder_ / name;
     }
     static std::string refusalOf(const std::optional<std::string>& named) {
         try {
@@ -40,7 +35,7 @@ class UsersConfiguration : public testing::Test {
         return "";
     }
 
-    std::string folder_;
+    fakes::TemporaryFolder folder_;
 };
 
 TEST_F(UsersConfiguration, CountsWithoutAnOptionAndTheNamedFileWins) {
@@ -73,12 +68,12 @@ TEST_F(UsersConfiguration, IsRefusedWithFilePlaceAndReasonWhicheverPartIsWrong) 
     EXPECT_EQ(
         refusalOf(std::nullopt),
         "configuration: " + users + ": thresholds.pairedBluetooth: must be an integer from 0 to 100000");
-    EXPECT_EQ(refusalOf(folder_ + "/none"), refusalOf(std::nullopt));
+    EXPECT_EQ(refusalOf(folder_ / "none"), refusalOf(std::nullopt));
 }
 
 TEST_F(UsersConfiguration, ThatIsNamedMustBeThere) {
-    EXPECT_EQ(refusalOf(folder_ + "/none"),
-              "--config: " + folder_ + "/none: cannot be read: No such file or directory");
+    EXPECT_EQ(refusalOf(folder_ / "none"),
+              "--config: " + folder_ / "none: cannot be read: No such file or directory");
 }
 
 }  // namespace

@@ -10,6 +10,7 @@
 #include <iterator>
 
 #include "host/exit.h"
+#include "verification/unit/fakes/temporary_folder.h"
 
 namespace wp::host {
 namespace {
@@ -18,20 +19,14 @@ namespace fs = std::filesystem;
 
 class OutputFileTest : public testing::Test {
   protected:
-    OutputFileTest() {
-        std::string name = (fs::temp_directory_path() / "wifi-profile-output-XXXXXX").string();
-        folder_ = mkdtemp(name.data());
-    }
-    ~OutputFileTest() override { fs::remove_all(folder_); }
-
-    std::string path(const std::string& name) const { return (folder_ / name).string(); }
+    std::string path(const std::string& name) const { return folder_ / name; }
     static std::string content(const fs::path& file) {
         std::ifstream stream(file);
         return {std::istreambuf_iterator<char>(stream), {}};
     }
-    void put(const std::string& name, const std::string& text) const { std::ofstream(path(name)) << text; }
+    void put(const std::string& name, const std::string& text) const { folder_.write(name, text); }
     std::size_t filesInFolder() const {
-        return static_cast<std::size_t>(std::distance(fs::directory_iterator(folder_), {}));
+        return static_cast<std::size_t>(std::distance(fs::directory_iterator(folder_.path()), {}));
     }
     std::string refusalOf(const std::string& file) const {
         try {
@@ -43,7 +38,7 @@ class OutputFileTest : public testing::Test {
         return "";
     }
 
-    fs::path folder_;
+    fakes::TemporaryFolder folder_;
 };
 
 mode_t modeOf(const std::string& file) {
@@ -138,7 +133,7 @@ TEST_F(OutputFileTest, AFailedWriteLeavesTheOldFileAndNoOther) {
 }
 
 TEST_F(OutputFileTest, APlaceThatCannotBeWrittenIsRefusedBeforeTheRun) {
-    EXPECT_EQ(refusalOf(folder_.string()), "--output: " + folder_.string() + ": is a folder; give a file");
+    EXPECT_EQ(refusalOf(folder_.path()), "--output: " + folder_.path() + ": is a folder; give a file");
     EXPECT_EQ(
         refusalOf(path("no/such/file")),
         "--output: " + path("no/such/file") + ": cannot be written: its folder: No such file or directory");

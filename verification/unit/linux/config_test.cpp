@@ -1,12 +1,12 @@
 #include "linux/config.h"
 
 #include <gtest/gtest.h>
-#include <stdlib.h>
 
 #include <filesystem>
 #include <fstream>
 
 #include "platform/json_writer.h"
+#include "verification/unit/fakes/temporary_folder.h"
 
 namespace wp {
 namespace {
@@ -124,8 +124,8 @@ TEST(Config, TheDataFileForMakersThatShipsSetsWhatHoldsWithoutIt) {
 }
 
 TEST(Config, LaterFilesWinAndOnlyTheNamedOneMustBeThere) {
-    std::string pattern = ::testing::TempDir() + "/wpXXXXXX";
-    const std::string folder = mkdtemp(pattern.data());
+    const fakes::TemporaryFolder temporary;
+    const std::string& folder = temporary.path();
     std::ofstream(folder + "/a") << R"({"endpoints": {"name": "a.example", "nameWildcard": "w.example"}})";
     std::ofstream(folder + "/b") << R"({"endpoints": {"name": "b.example"}})";
     std::ofstream(folder + "/bad") << R"({"endpoints": {"name": 1}})";
@@ -140,12 +140,11 @@ TEST(Config, LaterFilesWinAndOnlyTheNamedOneMustBeThere) {
     EXPECT_EQ(std::get<std::string>(missing), folder + "/none: cannot be read: No such file or directory");
     EXPECT_TRUE(std::get<std::string>(bad).starts_with(folder + "/bad: endpoints.name: "))
         << std::get<std::string>(bad);
-    std::filesystem::remove_all(folder);
 }
 
 TEST(Config, AFileThatIsThereAndCannotBeTakenIsNotPassedOver) {
-    std::string pattern = ::testing::TempDir() + "/wpXXXXXX";
-    const std::string folder = mkdtemp(pattern.data());
+    const fakes::TemporaryFolder temporary;
+    const std::string& folder = temporary.path();
     std::ofstream(folder + "/long") << std::string((1U << 20) + 1, ' ');
     std::filesystem::create_directory(folder + "/config.json");
 
@@ -155,7 +154,6 @@ TEST(Config, AFileThatIsThereAndCannotBeTakenIsNotPassedOver) {
     std::filesystem::create_symlink(folder + "/loop", folder + "/loop");
     EXPECT_EQ(std::get<std::string>(loadConfig({folder + "/loop"}, "")),
               folder + "/loop: cannot be read: Too many levels of symbolic links");
-    std::filesystem::remove_all(folder);
 }
 
 }  // namespace

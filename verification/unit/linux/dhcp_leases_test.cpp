@@ -1,6 +1,5 @@
 #include <fcntl.h>
 #include <gtest/gtest.h>
-#include <stdlib.h>
 #include <sys/stat.h>
 
 #include <filesystem>
@@ -8,6 +7,7 @@
 
 #include "linux/files/dhcp_packet.h"
 #include "linux/files/dhcpcd_leases.h"
+#include "verification/unit/fakes/temporary_folder.h"
 
 namespace wp {
 namespace {
@@ -129,12 +129,7 @@ TEST(Dhcp6Message, WithoutAddressesIsNoLease) {
 /// A folder that stands for the root of a system, with leases in it that came at a moment of the test's choice.
 class DhcpcdLeasesOf : public ::testing::Test {
   protected:
-    DhcpcdLeasesOf() {
-        std::string pattern = ::testing::TempDir() + "/wpXXXXXX";
-        root_ = mkdtemp(pattern.data());
-        std::filesystem::create_directories(root_ + "/var/lib/dhcpcd");
-    }
-    ~DhcpcdLeasesOf() override { std::filesystem::remove_all(root_); }
+    DhcpcdLeasesOf() { std::filesystem::create_directories(root_ + "/var/lib/dhcpcd"); }
 
     void write(const std::string& name, const Frame& content, std::int64_t at) const {
         const std::string path = root_ + "/var/lib/dhcpcd/" + name;
@@ -153,7 +148,8 @@ class DhcpcdLeasesOf : public ::testing::Test {
                (leases.ipv6 ? leases.ipv6->portalApi : "none");
     }
 
-    std::string root_;
+    fakes::TemporaryFolder folder_;
+    const std::string& root_ = folder_.path();
 };
 
 Frame named(const char* portal) {

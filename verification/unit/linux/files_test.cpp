@@ -1,8 +1,4 @@
 #include <gtest/gtest.h>
-#include <stdlib.h>
-
-#include <filesystem>
-#include <fstream>
 
 #include "linux/files/dhcp_clients.h"
 #include "linux/files/leases.h"
@@ -10,6 +6,7 @@
 #include "linux/files/proxy_settings.h"
 #include "linux/files/user_folder.h"
 #include "service/bytes.h"
+#include "verification/unit/fakes/temporary_folder.h"
 
 namespace wp {
 namespace {
@@ -17,18 +14,10 @@ namespace {
 /// A folder that stands for the root of a system, gone with the test.
 class Root : public ::testing::Test {
   protected:
-    Root() {
-        std::string pattern = ::testing::TempDir() + "/wpXXXXXX";
-        root_ = mkdtemp(pattern.data());
-    }
-    ~Root() override { std::filesystem::remove_all(root_); }
+    void write(const std::string& path, const std::string& content) const { folder_.write(path, content); }
 
-    void write(const std::string& path, const std::string& content) const {
-        std::filesystem::create_directories(std::filesystem::path(root_ + path).parent_path());
-        std::ofstream(root_ + path, std::ios::binary) << content;
-    }
-
-    std::string root_;
+    fakes::TemporaryFolder folder_;
+    const std::string& root_ = folder_.path();
 };
 
 std::string textsOf(const std::vector<IPAddress>& addresses) {

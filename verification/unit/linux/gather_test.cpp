@@ -7,12 +7,12 @@
 
 #include <algorithm>
 #include <filesystem>
-#include <fstream>
 #include <future>
 
 #include "linux/fact_table.h"
 #include "linux/gather_reach.h"
 #include "linux/gather_setup.h"
+#include "verification/unit/fakes/temporary_folder.h"
 #include "verification/unit/linux/fakes/loopback_socket.h"
 #include "verification/unit/linux/fakes/udp_server.h"
 #include "verification/unit/linux/fakes/web_server.h"
@@ -358,12 +358,6 @@ TEST(FactRows, WithoutALinkTheReasonIsTheLinks) {
 /// A folder that stands for the root of a system with one driver of a Wi-Fi interface.
 class Driver : public ::testing::Test {
   protected:
-    Driver() {
-        std::string pattern = ::testing::TempDir() + "/wpXXXXXX";
-        root_ = mkdtemp(pattern.data());
-    }
-    ~Driver() override { std::filesystem::remove_all(root_); }
-
     void use(const std::string& driver) const {
         const std::filesystem::path device = root_ + "/sys/class/net/lo/device";
         std::filesystem::create_directories(device);
@@ -373,14 +367,11 @@ class Driver : public ::testing::Test {
     void setParameter(const std::string& path, const std::string& content) const {
         write("/sys/module/" + path, content);
     }
-    void write(const std::string& path, const std::string& content) const {
-        const std::filesystem::path file = root_ + path;
-        std::filesystem::create_directories(file.parent_path());
-        std::ofstream(file) << content;
-    }
+    void write(const std::string& path, const std::string& content) const { folder_.write(path, content); }
     Known<bool> sharing() const { return gatherAirtimeSharing(loopback(), root_); }
 
-    std::string root_;
+    fakes::TemporaryFolder folder_;
+    const std::string& root_ = folder_.path();
 };
 
 TEST_F(Driver, TellsWhetherItSharesAirtimeByItsSwitch) {

@@ -2,7 +2,6 @@
 #include <stdlib.h>
 
 #include <algorithm>
-#include <filesystem>
 #include <thread>
 
 #include "linux/dbus/bluez.h"
@@ -13,6 +12,7 @@
 #include "linux/dbus/supplicant.h"
 #include "linux/gather_setup.h"
 #include "linux/manager_scan.h"
+#include "verification/unit/fakes/temporary_folder.h"
 #include "verification/unit/linux/fakes/child_process.h"
 #include "verification/unit/linux/stop.h"
 
@@ -25,9 +25,8 @@ using namespace std::chrono_literals;
 class MessageBus : public ::testing::Test {
   protected:
     static void SetUpTestSuite() {
-        std::string pattern = ::testing::TempDir() + "/wpXXXXXX";
-        folder_ = mkdtemp(pattern.data());
-        address_ = "unix:path=" + folder_ + "/bus";
+        folder_ = new fakes::TemporaryFolder;
+        address_ = "unix:path=" + *folder_ / "bus";
         daemon_ = new ChildProcess({"dbus-daemon", "--session", "--nofork", "--nopidfile", "--print-address",
                                     "--address=" + address_});
         setenv("DBUS_SYSTEM_BUS_ADDRESS", address_.c_str(), 1);
@@ -39,7 +38,7 @@ class MessageBus : public ::testing::Test {
         unsetenv("DBUS_SYSTEM_BUS_ADDRESS");
         delete services_;
         delete daemon_;
-        std::filesystem::remove_all(folder_);
+        delete folder_;
     }
 
     Bus bus() const {
@@ -48,7 +47,8 @@ class MessageBus : public ::testing::Test {
         return std::move(*known);
     }
 
-    inline static std::string folder_, address_;
+    inline static fakes::TemporaryFolder* folder_ = nullptr;
+    inline static std::string address_;
     inline static ChildProcess *daemon_ = nullptr, *services_ = nullptr;
 };
 
@@ -110,7 +110,7 @@ TEST_F(MessageBus, ErrorsTellWhoIsMissingAndWhoRefuses) {
 }
 
 TEST_F(MessageBus, WithoutABusThereIsNothingToAsk) {
-    auto none = Bus::at("unix:path=" + folder_ + "/none");
+    auto none = Bus::at("unix:path=" + *folder_ / "none");
     if (none) {
         const auto reply = none->call({"a.b", "/"}, "a.b", "C", {}, patience());
         ASSERT_FALSE(reply);

@@ -3,8 +3,7 @@
 #include <stdlib.h>
 #include <unistd.h>
 
-#include <filesystem>
-
+#include "verification/unit/fakes/temporary_folder.h"
 #include "verification/unit/linux/conversation.h"
 #include "verification/unit/linux/fakes/child_process.h"
 
@@ -14,7 +13,7 @@ namespace {
 /// A message bus of the test's own with one service on it, the system's bus as long as it lives.
 class OwnBus {
   public:
-    explicit OwnBus(const char* service) : folder_(newFolder()), address_("unix:path=" + folder_ + "/bus") {
+    explicit OwnBus(const char* service) : address_("unix:path=" + folder_ / "bus") {
         setenv("DBUS_SYSTEM_BUS_ADDRESS", address_.c_str(), 1);
         daemon_.emplace(std::vector<std::string>{"dbus-daemon", "--session", "--nofork", "--nopidfile",
                                                  "--print-address", "--address=" + address_});
@@ -22,18 +21,11 @@ class OwnBus {
             "/usr/bin/python3", WP_SOURCE_DIR "/verification/unit/linux/fakes/bus_services.py", address_,
             service});
     }
-    ~OwnBus() {
-        unsetenv("DBUS_SYSTEM_BUS_ADDRESS");
-        std::filesystem::remove_all(folder_);
-    }
+    ~OwnBus() { unsetenv("DBUS_SYSTEM_BUS_ADDRESS"); }
 
   private:
-    static std::string newFolder() {
-        std::string pattern = ::testing::TempDir() + "/wpXXXXXX";
-        return mkdtemp(pattern.data());
-    }
-
-    std::string folder_, address_;
+    fakes::TemporaryFolder folder_;
+    std::string address_;
     std::optional<ChildProcess> daemon_, service_;
 };
 

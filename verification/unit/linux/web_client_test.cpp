@@ -6,6 +6,7 @@
 #include <filesystem>
 #include <fstream>
 
+#include "verification/unit/fakes/temporary_folder.h"
 #include "verification/unit/linux/fakes/restless_server.h"
 #include "verification/unit/linux/fakes/web_server.h"
 #include "verification/unit/linux/stop.h"
@@ -253,8 +254,8 @@ TEST_F(WebClient, TellsWhatIsWrongWithACertificate) {
 }
 
 TEST_F(WebClient, WithoutAuthoritiesNoCertificateIsJudged) {
-    std::string folder = ::testing::TempDir() + "/wpXXXXXX";
-    ASSERT_NE(mkdtemp(folder.data()), nullptr);
+    const fakes::TemporaryFolder temporary;
+    const std::string& folder = temporary.path();
     WebRequest request = secure("/204");
     for (const std::string& place : {folder, folder + "/none.pem"}) {
         request.authorities = place;
@@ -270,7 +271,6 @@ TEST_F(WebClient, WithoutAuthoritiesNoCertificateIsJudged) {
     EXPECT_EQ(std::system(("openssl rehash " + folder + " 2>/dev/null").c_str()), 0);
     request.authorities = folder;
     EXPECT_EQ(ask(request).status, 204);
-    std::filesystem::remove_all(folder);
 }
 
 TEST_F(WebClient, TellsACertificateOfAnotherTimeFromOneThatNobodyVouchesFor) {

@@ -7,9 +7,9 @@
 #include <unistd.h>
 
 #include <QCoreApplication>
-#include <filesystem>
 
 #include "screens/tv/console.h"
+#include "verification/unit/fakes/temporary_folder.h"
 
 namespace wp::tv {
 namespace {
@@ -17,18 +17,11 @@ namespace {
 class InputDevices : public testing::Test {
   protected:
     void SetUp() override {
-        std::string pattern = testing::TempDir() + "wifi-profile-keys.XXXXXX";
-        ASSERT_NE(mkdtemp(pattern.data()), nullptr);
-        folder_ = pattern;
-        path_ = folder_ + "/event0";
         ASSERT_EQ(mkfifo(path_.c_str(), 0600), 0);
         device_ = open(path_.c_str(), O_RDWR | O_CLOEXEC);
     }
 
-    void TearDown() override {
-        close(device_);
-        std::filesystem::remove_all(folder_);
-    }
+    void TearDown() override { close(device_); }
 
     void send(unsigned short type, unsigned short code, int value) {
         input_event event{};
@@ -38,14 +31,14 @@ class InputDevices : public testing::Test {
         ASSERT_EQ(write(device_, &event, sizeof event), static_cast<ssize_t>(sizeof event));
     }
 
-    std::string folder_;
-    std::string path_;
+    fakes::TemporaryFolder folder_;
+    const std::string path_ = folder_ / "event0";
     int device_ = -1;
 };
 
 TEST_F(InputDevices, OnlyPressesOfTheDroppedKeysAreTaken) {
     std::vector<ui::Key> pressed;
-    DroppedKeys keys({folder_ + "/missing", path_}, [&](ui::Key key) { pressed.push_back(key); });
+    DroppedKeys keys({folder_ / "missing", path_}, [&](ui::Key key) { pressed.push_back(key); });
 
     send(EV_KEY, KEY_OK, 1);
     send(EV_SYN, SYN_REPORT, 0);

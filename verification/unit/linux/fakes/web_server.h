@@ -5,12 +5,12 @@
 #include <openssl/x509.h>
 #include <stdlib.h>
 
-#include <filesystem>
 #include <memory>
 #include <optional>
 #include <sstream>
 #include <string>
 
+#include "verification/unit/fakes/temporary_folder.h"
 #include "verification/unit/linux/fakes/child_process.h"
 
 namespace wp {
@@ -25,8 +25,6 @@ class WebServer {
     };
 
     explicit WebServer(std::optional<Validity> validity = std::nullopt) {
-        std::string pattern = ::testing::TempDir() + "/wpXXXXXX";
-        folder_ = mkdtemp(pattern.data());
         const std::string make =
             "openssl req -x509 -newkey ec -pkeyopt ec_paramgen_curve:P-256 -nodes -days 2 -subj "
             "/CN=host.example "
@@ -39,10 +37,9 @@ class WebServer {
         std::istringstream(server_->firstLine()) >> plainPort_ >> securePort_;
     }
     WebServer(const WebServer&) = delete;
-    ~WebServer() { std::filesystem::remove_all(folder_); }
 
-    std::string certificate() const { return folder_ + "/certificate.pem"; }
-    std::string key() const { return folder_ + "/key.pem"; }
+    std::string certificate() const { return folder_ / "certificate.pem"; }
+    std::string key() const { return folder_ / "key.pem"; }
     const std::string& plainPort() const { return plainPort_; }
     std::string plain(const std::string& path, const std::string& host = "127.0.0.1") const {
         return "http://" + host + ":" + plainPort_ + path;
@@ -70,7 +67,8 @@ class WebServer {
         EVP_PKEY_free(signer);
     }
 
-    std::string folder_, plainPort_, securePort_;
+    fakes::TemporaryFolder folder_;
+    std::string plainPort_, securePort_;
     std::unique_ptr<ChildProcess> server_;
 };
 
