@@ -10,6 +10,7 @@
 #include "platform/activity.h"
 #include "platform/json_writer.h"
 #include "platform/main_queue.h"
+#include "verification/unit/exchange/recordings.h"
 #include "verification/unit/fakes/fake_wifi_manager.h"
 
 namespace wp {
@@ -17,14 +18,6 @@ namespace {
 
 using std::chrono::milliseconds;
 using Clock = std::chrono::steady_clock;
-
-const std::string kFolder = WP_SOURCE_DIR "/verification/unit/exchange/recordings/";
-
-RecordingPointer stated(const std::string& keys) {
-    auto outcome = readRecording(R"({"format": "wifi-profile-recording", "version": 1, )" + keys + "}");
-    if (auto* refusal = std::get_if<Refusal>(&outcome)) ADD_FAILURE() << refusal->text();
-    return std::make_shared<const Recording>(std::get<Recording>(std::move(outcome)));
-}
 
 DictionaryPointer configuration(int age, std::optional<std::string> name = std::nullopt) {
     DictionaryPointer dictionary = Dictionary::make({{"MaxScanCacheAge", age}});
@@ -88,7 +81,7 @@ Recording converse(RecordingPointer recording) {
 }
 
 TEST(Recorder, WritesDownWhatWasAnswered) {
-    Recording original = std::get<Recording>(loadRecording(kFolder + "every_form.json"));
+    Recording original = accepted(loadRecording(kFolder + "every_form.json"));
 
     Recording recording = converse(std::make_shared<const Recording>(original));
 
@@ -252,14 +245,14 @@ TEST(Recorder, LeavesOutAFulfilledWishAlsoBehindAChangeFromOutside) {
 
 TEST(Recorder, SavesForItsOwnerAlone) {
     std::string path = testing::TempDir() + "recorder_test_" + std::to_string(::getpid()) + ".json";
-    Recording original = std::get<Recording>(loadRecording(kFolder + "every_form.json"));
+    Recording original = accepted(loadRecording(kFolder + "every_form.json"));
 
     EXPECT_FALSE(saveRecording(original, path));
 
     struct stat status {};
     ASSERT_EQ(::stat(path.c_str(), &status), 0);
     EXPECT_EQ(status.st_mode & 07777, 0600U);
-    EXPECT_EQ(recordingText(std::get<Recording>(loadRecording(path))), recordingText(original));
+    EXPECT_EQ(recordingText(accepted(loadRecording(path))), recordingText(original));
     std::filesystem::remove(path);
     EXPECT_TRUE(saveRecording(original, "/nonexistent/recording.json"));
 }

@@ -8,31 +8,24 @@
 
 #include "exchange/whole_file.h"
 #include "platform/records.h"
+#include "verification/unit/exchange/recordings.h"
+#include "verification/unit/fakes/temporary_folder.h"
 
 namespace wp {
 namespace {
 
-const std::string kFolder = WP_SOURCE_DIR "/verification/unit/exchange/recordings/";
-
-Recording accepted(std::variant<Recording, Refusal> outcome) {
-    if (auto* refusal = std::get_if<Refusal>(&outcome)) {
-        ADD_FAILURE() << refusal->text();
-        return {};
-    }
-    return std::get<Recording>(std::move(outcome));
+std::string refusalIn(const std::variant<Recording, Refusal>& outcome) {
+    auto* refused = std::get_if<Refusal>(&outcome);
+    return refused ? refused->text() : "accepted";
 }
 
 /// The refusal of a recording with these keys beside format and version.
 std::string refusal(const std::string& keys) {
-    auto outcome = readRecording(R"({"format": "wifi-profile-recording", "version": 1, )" + keys + "}");
-    auto* refused = std::get_if<Refusal>(&outcome);
-    return refused ? refused->text() : "accepted";
+    return refusalIn(readStated(keys));
 }
 
 std::string rawRefusal(const std::string& text) {
-    auto outcome = readRecording(text);
-    auto* refused = std::get_if<Refusal>(&outcome);
-    return refused ? refused->text() : "accepted";
+    return refusalIn(readRecording(text));
 }
 
 TEST(Recording, MayLeaveOutEverythingButFormatAndVersion) {
@@ -165,13 +158,6 @@ TEST(Recording, TakesAScanOfTenThousandNetworks) {
 
 class WholeFile : public testing::Test {
   protected:
-    void SetUp() override {
-        std::string pattern = testing::TempDir() + "whole_file_XXXXXX";
-        ASSERT_TRUE(::mkdtemp(pattern.data()));
-        folder_ = pattern;
-    }
-    void TearDown() override { std::filesystem::remove_all(folder_); }
-
     std::string content(const std::filesystem::path& path) {
         std::ifstream file(path);
         return {std::istreambuf_iterator<char>(file), {}};
@@ -181,7 +167,8 @@ class WholeFile : public testing::Test {
         return static_cast<std::size_t>(std::distance(begin(files), end(files)));
     }
 
-    std::filesystem::path folder_;
+    fakes::TemporaryFolder temporary_;
+    const std::filesystem::path folder_ = temporary_.path();
 };
 
 TEST_F(WholeFile, ReplacesAFileAndSetsItsPermissions) {

@@ -7,6 +7,7 @@
 
 #include "platform/activity.h"
 #include "platform/records.h"
+#include "verification/unit/exchange/recordings.h"
 
 namespace wp {
 namespace {
@@ -14,18 +15,8 @@ namespace {
 using std::chrono::milliseconds;
 using Clock = std::chrono::steady_clock;
 
-const std::string kFolder = WP_SOURCE_DIR "/verification/unit/exchange/recordings/";
-
 RecordingPointer load(const std::string& name) {
-    auto outcome = loadRecording(kFolder + name);
-    if (auto* refusal = std::get_if<Refusal>(&outcome)) ADD_FAILURE() << refusal->text();
-    return std::make_shared<const Recording>(std::get<Recording>(std::move(outcome)));
-}
-
-RecordingPointer stated(const std::string& keys) {
-    auto outcome = readRecording(R"({"format": "wifi-profile-recording", "version": 1, )" + keys + "}");
-    if (auto* refusal = std::get_if<Refusal>(&outcome)) ADD_FAILURE() << refusal->text();
-    return std::make_shared<const Recording>(std::get<Recording>(std::move(outcome)));
+    return std::make_shared<const Recording>(accepted(loadRecording(kFolder + name)));
 }
 
 DictionaryPointer configuration(Value age, std::optional<std::string> name = std::nullopt) {
