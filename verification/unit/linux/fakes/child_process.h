@@ -14,7 +14,7 @@ extern char** environ;
 
 namespace wp {
 
-/// A program that a test starts and that ends with it.
+/// A program that a test starts and that ends with it, even where the test is killed.
 class ChildProcess {
   public:
     /// Starts the program and waits for its first line.
@@ -24,8 +24,10 @@ class ChildProcess {
         posix_spawn_file_actions_t actions;
         posix_spawn_file_actions_init(&actions);
         posix_spawn_file_actions_adddup2(&actions, ends[1], 1);
+        std::vector<std::string> all = {"setpriv", "--pdeathsig", "KILL"};
+        all.insert(all.end(), words.begin(), words.end());
         std::vector<char*> arguments;
-        for (const std::string& word : words) arguments.push_back(const_cast<char*>(word.c_str()));
+        for (std::string& word : all) arguments.push_back(word.data());
         arguments.push_back(nullptr);
         const int failed = posix_spawnp(&pid_, arguments[0], &actions, nullptr, arguments.data(), environ);
         posix_spawn_file_actions_destroy(&actions);
