@@ -5,11 +5,10 @@
 #include "exchange/anonymous_addresses.h"
 #include "exchange/anonymous_names.h"
 #include "platform/json_writer.h"
+#include "verification/unit/exchange/recordings.h"
 
 namespace wp {
 namespace {
-
-const std::string kFolder = WP_SOURCE_DIR "/verification/unit/exchange/recordings/";
 
 TEST(Anonymise, ReplacesNamesAndAddressesThroughoutARecording) {
     Recording original = std::get<Recording>(loadRecording(kFolder + "neighbourhood.json"));

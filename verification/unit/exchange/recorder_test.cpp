@@ -19,12 +19,6 @@ namespace {
 using std::chrono::milliseconds;
 using Clock = std::chrono::steady_clock;
 
-DictionaryPointer configuration(int age, std::optional<std::string> name = std::nullopt) {
-    DictionaryPointer dictionary = Dictionary::make({{"MaxScanCacheAge", age}});
-    if (name) dictionary->setValue("NetworkName", *name);
-    return dictionary;
-}
-
 /// The recording as text, without how long the answers took.
 std::string timeless(Recording recording) {
     for (RecordedAnswer& answer : recording.answers) answer.delay = milliseconds(0);

@@ -20,7 +20,7 @@ std::string refusalIn(const std::variant<Recording, Refusal>& outcome) {
 }
 
 /// The refusal of a recording with these keys beside format and version.
-std::string refusal(const std::string& keys) {
+std::string refusalOfKeys(const std::string& keys) {
     return refusalIn(readStated(keys));
 }
 
@@ -81,47 +81,48 @@ TEST(Recording, RefusesAFileOfAnotherKindOrVersion) {
 }
 
 TEST(Recording, RefusesUnknownKeysOutsideInfo) {
-    EXPECT_EQ(refusal(R"("answer": [])"), "answer: unknown key");
-    EXPECT_EQ(refusal(R"("answers": [{"test": 1, "delay": 3}])"), "answers[0].delay: unknown key");
-    EXPECT_EQ(refusal(R"("status": [{}, {"SSID": "x"}])"), "status[1].SSID: unknown key");
-    EXPECT_EQ(refusal(R"("events": [{"afterMs": 1, "power": true, "why": ""}])"),
+    EXPECT_EQ(refusalOfKeys(R"("answer": [])"), "answer: unknown key");
+    EXPECT_EQ(refusalOfKeys(R"("answers": [{"test": 1, "delay": 3}])"), "answers[0].delay: unknown key");
+    EXPECT_EQ(refusalOfKeys(R"("status": [{}, {"SSID": "x"}])"), "status[1].SSID: unknown key");
+    EXPECT_EQ(refusalOfKeys(R"("events": [{"afterMs": 1, "power": true, "why": ""}])"),
               "events[0].why: unknown key");
-    EXPECT_EQ(refusal(R"("answers": [{"test": 1, "info": {"anything": 1}}])"), "accepted");
+    EXPECT_EQ(refusalOfKeys(R"("answers": [{"test": 1, "info": {"anything": 1}}])"), "accepted");
 }
 
 TEST(Recording, RefusesValuesOfAnotherKindWithTheirPlace) {
-    EXPECT_EQ(refusal(R"("description": 1)"), "description: must be a text");
-    EXPECT_EQ(refusal(R"("capabilities": {"wapi": 1})"), "capabilities.wapi: must be true or false");
-    EXPECT_EQ(refusal(R"("capabilities": [])"), "capabilities: must be an object");
-    EXPECT_EQ(refusal(R"("automation": null)"), "automation: must be true or false");
-    EXPECT_EQ(refusal(R"("wifi": {"power": 1})"), "wifi.power: must be true or false");
-    EXPECT_EQ(refusal(R"("status": {})"), "status: must be an array");
-    EXPECT_EQ(refusal(R"("answers": [[]])"), "answers[0]: must be an object");
-    EXPECT_EQ(refusal(R"("answers": [{}])"), R"(answers[0]: needs the key "test")");
-    EXPECT_EQ(refusal(R"("answers": [{"test": "14"}])"),
+    EXPECT_EQ(refusalOfKeys(R"("description": 1)"), "description: must be a text");
+    EXPECT_EQ(refusalOfKeys(R"("capabilities": {"wapi": 1})"), "capabilities.wapi: must be true or false");
+    EXPECT_EQ(refusalOfKeys(R"("capabilities": [])"), "capabilities: must be an object");
+    EXPECT_EQ(refusalOfKeys(R"("automation": null)"), "automation: must be true or false");
+    EXPECT_EQ(refusalOfKeys(R"("wifi": {"power": 1})"), "wifi.power: must be true or false");
+    EXPECT_EQ(refusalOfKeys(R"("status": {})"), "status: must be an array");
+    EXPECT_EQ(refusalOfKeys(R"("answers": [[]])"), "answers[0]: must be an object");
+    EXPECT_EQ(refusalOfKeys(R"("answers": [{}])"), R"(answers[0]: needs the key "test")");
+    EXPECT_EQ(refusalOfKeys(R"("answers": [{"test": "14"}])"),
               "answers[0].test: must be an integer from 0 to 2147483647");
-    EXPECT_EQ(refusal(R"("answers": [{"test": 1, "networkName": null}])"),
+    EXPECT_EQ(refusalOfKeys(R"("answers": [{"test": 1, "networkName": null}])"),
               "answers[0].networkName: must be a text");
-    EXPECT_EQ(refusal(R"("answers": [{"test": 1, "maxScanCacheAge": "0"}])"),
+    EXPECT_EQ(refusalOfKeys(R"("answers": [{"test": 1, "maxScanCacheAge": "0"}])"),
               "answers[0].maxScanCacheAge: must be a number");
-    EXPECT_EQ(refusal(R"("events": [{"power": true}])"), R"(events[0]: needs the key "afterMs")");
+    EXPECT_EQ(refusalOfKeys(R"("events": [{"power": true}])"), R"(events[0]: needs the key "afterMs")");
 }
 
 TEST(Recording, RefusesDelaysThatAreNoWholeMilliseconds) {
     for (const char* delay : {"-1", "1.5", "2147483648", "\"1\"", "null"})
-        EXPECT_EQ(refusal(R"("answers": [{"test": 1}, {"test": 1, "delayMs": )" + std::string(delay) + "}]"),
-                  "answers[1].delayMs: must be an integer from 0 to 2147483647");
-    EXPECT_EQ(refusal(R"("events": [{"afterMs": -1, "power": true}])"),
+        EXPECT_EQ(
+            refusalOfKeys(R"("answers": [{"test": 1}, {"test": 1, "delayMs": )" + std::string(delay) + "}]"),
+            "answers[1].delayMs: must be an integer from 0 to 2147483647");
+    EXPECT_EQ(refusalOfKeys(R"("events": [{"afterMs": -1, "power": true}])"),
               "events[0].afterMs: must be an integer from 0 to 2147483647");
 }
 
 TEST(Recording, RefusesAnIntegerBeyond64BitsInsideInfo) {
-    EXPECT_EQ(refusal(R"("answers": [{"test": 1, "info": {"a": [18446744073709551616]}}])"),
+    EXPECT_EQ(refusalOfKeys(R"("answers": [{"test": 1, "info": {"a": [18446744073709551616]}}])"),
               "answers[0].info.a[0]: an integer beyond 64 bits");
 }
 
 TEST(Recording, RefusesResultsBesideTheShortForm) {
-    EXPECT_EQ(refusal(R"("answers": [{"test": 1, "results": [], "info": {}}])"),
+    EXPECT_EQ(refusalOfKeys(R"("answers": [{"test": 1, "results": [], "info": {}}])"),
               R"(answers[0].results: cannot stand beside "result", "didPass" or "info")");
 }
 

@@ -19,12 +19,6 @@ RecordingPointer load(const std::string& name) {
     return std::make_shared<const Recording>(accepted(loadRecording(kFolder + name)));
 }
 
-DictionaryPointer configuration(Value age, std::optional<std::string> name = std::nullopt) {
-    DictionaryPointer dictionary = Dictionary::make({{"MaxScanCacheAge", std::move(age)}});
-    if (name) dictionary->setValue("NetworkName", *name);
-    return dictionary;
-}
-
 DiagnosticsTestResponse ask(DiagnosticsClient& client, int test, DictionaryPointer dictionary = nullptr) {
     return client.runTestRequests({{test, std::move(dictionary)}});
 }

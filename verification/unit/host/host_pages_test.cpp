@@ -20,7 +20,7 @@ using testing::ElementsAre;
 using testing::HasSubstr;
 
 /// Evidence of a joined network that works, with these entries in place of its own.
-Evidence withJoined(Dictionary::Entries entries, std::int64_t statusCode = 0) {
+Evidence outcomeWith(Dictionary::Entries entries, std::int64_t statusCode = 0) {
     entries.merge(Dictionary::Entries{{"networkName", "Home"}, {"pingedWAN", true}, {"reachedVantor", true}});
     return evidenceFrom(statusCode,
                         Dictionary::make({{"currentNetwork", Dictionary::make(std::move(entries))}}));
@@ -71,11 +71,11 @@ class Viewer final : public ui::FrontEnd {
 
 TEST(ClosingPage, TellsTheOutcomeAndTheThreeWorstFindingsWithWhatToDo) {
     Viewer viewer;
-    viewer.screen.setRootViewController(pageOf(withJoined({{"isCaptive", true},
-                                                           {"reachedVantor", false},
-                                                           {"hasPoorSignal", true},
-                                                           {"isBeaconIntervalLong", true},
-                                                           {"isIPv6Assigned", false}})));
+    viewer.screen.setRootViewController(pageOf(outcomeWith({{"isCaptive", true},
+                                                            {"reachedVantor", false},
+                                                            {"hasPoorSignal", true},
+                                                            {"isBeaconIntervalLong", true},
+                                                            {"isIPv6Assigned", false}})));
 
     std::vector<std::string> lines = viewer.lines();
 
@@ -97,7 +97,7 @@ TEST(ClosingPage, TellsTheOutcomeAndTheThreeWorstFindingsWithWhatToDo) {
 
 TEST(ClosingPage, WithoutFindingsSaysSoAndOffersToClose) {
     Viewer viewer;
-    viewer.screen.setRootViewController(pageOf(withJoined({})));
+    viewer.screen.setRootViewController(pageOf(outcomeWith({})));
 
     EXPECT_EQ(viewer.text(ui::identifiers::description),
               "As far as this result tells, the network “Home” works, and no problem was found.");
@@ -119,7 +119,7 @@ TEST(ClosingPage, SaysWhyARunEndedEarly) {
 TEST(ClosingPage, ShowsANameThatCouldSteerAScreenHarmlessly) {
     Viewer viewer;
     viewer.screen.setRootViewController(
-        pageOf(withJoined({{"networkName", "a\x1B[2J\xE2\x80\xAE<b>"}, {"hasPoorSignal", true}})));
+        pageOf(outcomeWith({{"networkName", "a\x1B[2J\xE2\x80\xAE<b>"}, {"hasPoorSignal", true}})));
 
     std::string all = viewer.text(ui::identifiers::description);
     for (const std::string& line : viewer.lines()) all += line;
@@ -134,7 +134,7 @@ TEST(ClosingPage, StandsInsideTheSafeAreaInEveryLanguage) {
     for (const char* language : {"en", "de", "ja"}) {
         Viewer viewer;
         viewer.screen.setRootViewController(
-            pageOf(withJoined({{"networkName", std::string(32, 'W')}, {"hasPoorSignal", true}}), language));
+            pageOf(outcomeWith({{"networkName", std::string(32, 'W')}, {"hasPoorSignal", true}}), language));
         viewer.screen.layoutIfNeeded();
 
         ui::View& status = *viewer.screen.view(ui::identifiers::status);
@@ -147,7 +147,7 @@ TEST(ClosingPage, StandsInsideTheSafeAreaInEveryLanguage) {
 TEST(ClosingPage, TheWayOutHasTheFocusAndEachFindingTheRoomThatItTakes) {
     Viewer viewer;
     viewer.screen.setRootViewController(
-        pageOf(withJoined({{"isCaptive", true}, {"reachedVantor", false}, {"hasPoorSignal", true}})));
+        pageOf(outcomeWith({{"isCaptive", true}, {"reachedVantor", false}, {"hasPoorSignal", true}})));
     viewer.screen.layoutIfNeeded();
     viewer.screen.focusPreferredView();
     ui::SettingsTableView& table = *viewer.screen.table();
@@ -162,7 +162,7 @@ TEST(ClosingPage, TheWayOutHasTheFocusAndEachFindingTheRoomThatItTakes) {
 
 TEST(ClosingPage, TellsHowLongItStillStands) {
     Viewer viewer;
-    std::shared_ptr<ClosingPage> page = pageOf(withJoined({}));
+    std::shared_ptr<ClosingPage> page = pageOf(outcomeWith({}));
     viewer.screen.setRootViewController(page);
 
     page->showTimeLeft(15s);
@@ -173,7 +173,7 @@ TEST(ClosingPage, TellsHowLongItStillStands) {
 TEST(ClosingPage, ClosesByOKOnAnyRow) {
     Viewer viewer;
     viewer.keys = {ui::Key::down, ui::Key::select};
-    std::shared_ptr<ClosingPage> page = pageOf(withJoined({{"hasPoorSignal", true}}));
+    std::shared_ptr<ClosingPage> page = pageOf(outcomeWith({{"hasPoorSignal", true}}));
 
     showClosingPage(page, viewer.screen, viewer, 1h, [] { return false; });
 
@@ -184,7 +184,7 @@ TEST(ClosingPage, ClosesByOKOnAnyRow) {
 TEST(ClosingPage, ClosesByBack) {
     Viewer viewer;
     viewer.keys = {ui::Key::back};
-    std::shared_ptr<ClosingPage> page = pageOf(withJoined({}));
+    std::shared_ptr<ClosingPage> page = pageOf(outcomeWith({}));
 
     showClosingPage(page, viewer.screen, viewer, 1h, [] { return false; });
 
@@ -194,7 +194,7 @@ TEST(ClosingPage, ClosesByBack) {
 TEST(ClosingPage, ClosesByItselfWhenTheTimeIsOver) {
     Viewer viewer;
     viewer.keys = {ui::Key::down, ui::Key::up};
-    std::shared_ptr<ClosingPage> page = pageOf(withJoined({}));
+    std::shared_ptr<ClosingPage> page = pageOf(outcomeWith({}));
 
     showClosingPage(page, viewer.screen, viewer, 1ms, [] { return false; });
 
@@ -204,7 +204,7 @@ TEST(ClosingPage, ClosesByItselfWhenTheTimeIsOver) {
 
 TEST(ClosingPage, GoesAtOnceWhenTheRunIsBrokenOffOrNobodyCanPressAKey) {
     Viewer viewer;
-    std::shared_ptr<ClosingPage> page = pageOf(withJoined({}));
+    std::shared_ptr<ClosingPage> page = pageOf(outcomeWith({}));
 
     showClosingPage(page, viewer.screen, viewer, 1h, [] { return true; });
     viewer.isThere = false;

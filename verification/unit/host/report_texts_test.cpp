@@ -9,6 +9,7 @@
 #include "host/report/catalogue.h"
 #include "host/report/limits.h"
 #include "host/report/texts.h"
+#include "verification/unit/places.h"
 
 namespace wp::host {
 namespace {
@@ -122,7 +123,7 @@ TEST(ReportTexts, ARuleNamesExactlyTheThresholdsThatTheServiceGoesBy) {
 }
 
 TEST(ReportTexts, EveryKeyIsUsed) {
-    std::string sources = sourcesOf(WP_SOURCE_DIR "/host");
+    std::string sources = sourcesOf(sourceFolder() + "/host");
     for (const std::string& key : keysOf(reportTable("en"))) {
         if (isOfATest(key)) continue;
         // The words of a cause or a reason, and the plural forms, are put together from a prefix.

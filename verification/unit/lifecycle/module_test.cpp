@@ -3,6 +3,7 @@
 
 #include "verification/unit/fakes/fake_device.h"
 #include "verification/unit/fakes/printing.h"
+#include "verification/unit/places.h"
 
 // The module as its host sees it: loaded, and known by its exported names and the host's interfaces alone.
 
@@ -11,7 +12,8 @@ namespace {
 
 class Module : public ::testing::Test {
   protected:
-    Module() : handle_(dlopen(WP_BINARY_DIR "/wifi-profile-extension.so", RTLD_NOW | RTLD_LOCAL)) {
+    Module()
+        : handle_(dlopen((buildFolder() + "/wifi-profile-extension.so").c_str(), RTLD_NOW | RTLD_LOCAL)) {
         if (!handle_) ADD_FAILURE() << dlerror();
     }
 

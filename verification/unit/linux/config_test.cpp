@@ -7,6 +7,7 @@
 
 #include "platform/json_writer.h"
 #include "verification/unit/fakes/temporary_folder.h"
+#include "verification/unit/places.h"
 
 namespace wp {
 namespace {
@@ -111,7 +112,7 @@ TEST(Config, WhereTheyLieIsTheSystemsFirstAndTheUsersLast) {
 
 TEST(Config, TheDataFileForMakersThatShipsSetsWhatHoldsWithoutIt) {
     Config config;
-    std::ifstream file(WP_SOURCE_DIR "/resources/vendors.json");
+    std::ifstream file(sourceFolder() + "/resources/vendors.json");
     const std::string text{std::istreambuf_iterator<char>(file), {}};
     ASSERT_FALSE(text.empty());
     const auto refusal = applyConfig(text, config);

@@ -13,10 +13,10 @@ IPAddress at(const char* text) {
     return *IPAddress::fromText(text);
 }
 
-/// A place on loopback where connections are taken in, or, once its queue is full, are left without an answer.
-class Place {
+/// On loopback: connections are taken in, or, once its queue is full, are left without an answer.
+class Listener {
   public:
-    explicit Place(const char* address, std::uint16_t port = 0)
+    explicit Listener(const char* address, std::uint16_t port = 0)
         : socket_(LoopbackSocket::listening(address, port, 0)) {}
     std::uint16_t port() const { return socket_.port(); }
     /// Fills the queue, so that whoever comes next hears nothing.
@@ -51,8 +51,8 @@ bool advanceAt(ConnectRace& race, Clock::time_point moment, int times = kOften) 
 }
 
 TEST(ConnectRace, TheNextAddressHasItsTurnAQuarterOfASecondLater) {
-    Place silent("127.0.0.1");
-    const Place good("127.0.0.2", silent.port());
+    Listener silent("127.0.0.1");
+    const Listener good("127.0.0.2", silent.port());
     silent.fill();
     ConnectRace race({at("127.0.0.1"), at("127.0.0.2")}, silent.port(), "");
     const auto begin = Clock::now();
@@ -63,8 +63,8 @@ TEST(ConnectRace, TheNextAddressHasItsTurnAQuarterOfASecondLater) {
 }
 
 TEST(ConnectRace, TheNextAddressHasItsTurnAtOnceWhereOneFailsBesideAnotherThatIsSilent) {
-    Place silent("127.0.0.1");
-    const Place good("127.0.0.4", silent.port());
+    Listener silent("127.0.0.1");
+    const Listener good("127.0.0.4", silent.port());
     silent.fill();
     // Nobody listens at the second and third.
     ConnectRace race({at("127.0.0.1"), at("127.0.0.2"), at("127.0.0.3"), at("127.0.0.4")}, silent.port(), "");
@@ -75,7 +75,7 @@ TEST(ConnectRace, TheNextAddressHasItsTurnAtOnceWhereOneFailsBesideAnotherThatIs
 }
 
 TEST(ConnectRace, FamiliesHaveTheirTurnsOneAfterTheOther) {
-    const Place good("127.0.0.1");
+    const Listener good("127.0.0.1");
     // Nobody listens on IPv6; with the families in turns the third attempt is the first on IPv4 that can succeed.
     ConnectRace race({at("::1"), at("::1"), at("127.0.0.1")}, good.port(), "");
     EXPECT_TRUE(advanceAt(race, Clock::now()));

@@ -14,8 +14,6 @@ namespace {
 using namespace std::chrono_literals;
 using Message = UdpServer::Message;
 
-const IPAddress kHere = *IPAddress::fromText("127.0.0.1");
-
 bool failedBecause(const Error& error, Reason reason) {
     return error.code == static_cast<int>(reason);
 }
@@ -182,14 +180,14 @@ std::optional<Message> dnsAnswer(const Message& query, const Message& ipv4, cons
     return answer;
 }
 
-NameServerSet at(const UdpServer& server) {
+NameServerSet serverAt(const UdpServer& server) {
     return {{kHere}, "lo", server.port()};
 }
 
 TEST(NameLookup, AsksForBothFamilies) {
     const Message six = {0x20, 1, 0xD, 0xB8, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 7};
     const UdpServer server([&](const Message& query) { return dnsAnswer(query, {203, 0, 113, 7}, six); });
-    const auto answer = lookUpName("host.example", at(server), patience());
+    const auto answer = lookUpName("host.example", serverAt(server), patience());
     ASSERT_TRUE(answer);
     std::vector<std::string> texts;
     for (const IPAddress& each : answer->addresses) texts.push_back(each.text());
@@ -199,7 +197,7 @@ TEST(NameLookup, AsksForBothFamilies) {
 
 TEST(NameLookup, ANameThatDoesNotExistIsAnAnswer) {
     const UdpServer server([](const Message& query) { return dnsAnswer(query, {}, {}, 3); });
-    const auto answer = lookUpName("host.example", at(server), patience());
+    const auto answer = lookUpName("host.example", serverAt(server), patience());
     ASSERT_TRUE(answer);
     EXPECT_TRUE(answer->addresses.empty());
     EXPECT_EQ(answer->why, "Domain name not found");
@@ -207,7 +205,7 @@ TEST(NameLookup, ANameThatDoesNotExistIsAnAnswer) {
 
 TEST(NameLookup, OneFamilyWithoutRecordsIsNoFailure) {
     const UdpServer server([](const Message& query) { return dnsAnswer(query, {203, 0, 113, 7}, {}); });
-    const auto answer = lookUpName("host.example", at(server), patience());
+    const auto answer = lookUpName("host.example", serverAt(server), patience());
     ASSERT_TRUE(answer);
     EXPECT_EQ(answer->addresses.size(), 1U);
     EXPECT_EQ(answer->why, "");
@@ -217,14 +215,14 @@ TEST(NameLookup, OneFamilyThatStaysSilentDoesNotHoldTheOtherUp) {
     const UdpServer server([](const Message& query) {
         return query[typeAt(query) + 1] == 1 ? dnsAnswer(query, {203, 0, 113, 7}, {}) : std::nullopt;
     });
-    const auto answer = lookUpName("host.example", at(server), patience());
+    const auto answer = lookUpName("host.example", serverAt(server), patience());
     ASSERT_TRUE(answer);
     EXPECT_EQ(answer->addresses.size(), 1U);
 }
 
 TEST(NameLookup, ADeadServerAndNoServerAreAnswersWithoutAddresses) {
     const UdpServer server(silence);
-    const auto dead = lookUpName("host.example", at(server), patience(100ms));
+    const auto dead = lookUpName("host.example", serverAt(server), patience(100ms));
     const auto none = lookUpName("host.example", {}, patience());
     ASSERT_TRUE(dead && none);
     EXPECT_TRUE(dead->addresses.empty());
@@ -240,7 +238,7 @@ TEST(NameLookup, GarbageIsNoAnswer) {
         garbage.insert(garbage.end(), 40, 0xC0);
         return garbage;
     });
-    const auto answer = lookUpName("host.example", at(server), patience(200ms));
+    const auto answer = lookUpName("host.example", serverAt(server), patience(200ms));
     ASSERT_TRUE(answer);
     EXPECT_TRUE(answer->addresses.empty());
     EXPECT_NE(answer->why, "");
@@ -261,7 +259,7 @@ TEST(NameLookup, AnAnswerToAnotherQuestionOrFromAnybodyElseIsNone) {
     const UdpServer stranger([&](const Message& query) { return dnsAnswer(query, four, {}); },
                              UdpServer::Sender::stranger);
     for (const UdpServer* each : {&otherNumber, &otherName, &stranger}) {
-        const auto answer = lookUpName("host.example", at(*each), patience(100ms));
+        const auto answer = lookUpName("host.example", serverAt(*each), patience(100ms));
         ASSERT_TRUE(answer);
         EXPECT_TRUE(answer->addresses.empty());
     }
@@ -273,7 +271,7 @@ TEST(NameLookup, AnAnswerThatWasCutIsAskedForOnceMoreOverAConnection) {
         (*answer)[2] |= 2;
         return answer;
     });
-    const auto answer = lookUpName("host.example", at(server), patience());
+    const auto answer = lookUpName("host.example", serverAt(server), patience());
     ASSERT_TRUE(answer);
     EXPECT_TRUE(answer->addresses.empty()) << "nobody takes connections there";
     EXPECT_EQ(answer->why, "Could not contact DNS servers");
@@ -281,7 +279,7 @@ TEST(NameLookup, AnAnswerThatWasCutIsAskedForOnceMoreOverAConnection) {
 
 TEST(NameLookup, GoesOverNoOtherInterfaceWhereItsOwnIsGone) {
     const UdpServer server([](const Message& query) { return dnsAnswer(query, {203, 0, 113, 7}, {}); });
-    NameServerSet gone = at(server);
+    NameServerSet gone = serverAt(server);
     gone.interfaceName = "none0";
     const auto answer = lookUpName("host.example", gone, patience());
     const auto each = askEachServer("host.example", gone, patience());
@@ -294,7 +292,7 @@ TEST(NameLookup, GoesOverNoOtherInterfaceWhereItsOwnIsGone) {
 
 TEST(NameLookup, EachServerIsToldApart) {
     const UdpServer server([](const Message& query) { return dnsAnswer(query, {203, 0, 113, 7}, {}); });
-    NameServerSet both = at(server);
+    NameServerSet both = serverAt(server);
     both.servers.push_back(*IPAddress::fromText("127.0.0.2"));  // nothing listens there
     const auto answers = askEachServer("host.example", both, patience());
     ASSERT_TRUE(answers);
@@ -311,13 +309,13 @@ TEST(NameLookup, AServersOwnWordIsKept) {
     for (const auto& [code, word] : codes) {
         const UdpServer server(
             [rcode = code](const Message& query) { return dnsAnswer(query, {}, {}, rcode); });
-        const auto answers = askEachServer("host.example", at(server), patience());
+        const auto answers = askEachServer("host.example", serverAt(server), patience());
         ASSERT_TRUE(answers);
         EXPECT_EQ(answers->front().code, word);
         EXPECT_TRUE(answers->front().answered);
     }
     const UdpServer dead(silence);
-    const auto answers = askEachServer("host.example", at(dead), patience(100ms));
+    const auto answers = askEachServer("host.example", serverAt(dead), patience(100ms));
     ASSERT_TRUE(answers);
     EXPECT_EQ(answers->front().code, "timeout");
     EXPECT_FALSE(answers->front().answered);
@@ -326,7 +324,7 @@ TEST(NameLookup, AServersOwnWordIsKept) {
 TEST(NameLookup, BeingStoppedEndsIt) {
     const StopOnceAsked asked;
     const UdpServer server(asked);
-    const auto answer = lookUpName("host.example", at(server), patience(20s, asked.stop));
+    const auto answer = lookUpName("host.example", serverAt(server), patience(20s, asked.stop));
     ASSERT_FALSE(answer);
     EXPECT_TRUE(failedBecause(answer.error(), Reason::cancelled));
 }

@@ -8,6 +8,7 @@
 #include "linux/files/dhcp_packet.h"
 #include "linux/files/dhcpcd_leases.h"
 #include "verification/unit/fakes/temporary_folder.h"
+#include "verification/unit/service/addresses.h"
 
 namespace wp {
 namespace {
@@ -55,12 +56,6 @@ Frame address6(std::uint8_t last) {
 /// A group of addresses that holds this one for so many seconds.
 Frame group6(std::uint8_t last, std::uint8_t seconds) {
     return option6(3, Frame(12, 0) + option6(5, address6(last) + Frame{0, 0, 0, 1, 0, 0, 0, seconds}));
-}
-
-std::string textsOf(const std::vector<IPAddress>& addresses) {
-    std::string text;
-    for (const IPAddress& each : addresses) text += each.text() + " ";
-    return text;
 }
 
 TEST(DhcpPacket, GrantsAnAddressForATimeAndNamesServersPortalAndVendor) {

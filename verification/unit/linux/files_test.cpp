@@ -7,6 +7,7 @@
 #include "linux/files/user_folder.h"
 #include "service/bytes.h"
 #include "verification/unit/fakes/temporary_folder.h"
+#include "verification/unit/service/addresses.h"
 
 namespace wp {
 namespace {
@@ -19,12 +20,6 @@ class Root : public ::testing::Test {
     fakes::TemporaryFolder folder_;
     const std::string& root_ = folder_.path();
 };
-
-std::string textsOf(const std::vector<IPAddress>& addresses) {
-    std::string text;
-    for (const IPAddress& each : addresses) text += each.text() + " ";
-    return text;
-}
 
 constexpr const char* kLeases = R"(default-duid "\000\001";
 lease {

@@ -15,6 +15,8 @@
 #include "verification/unit/fakes/temporary_folder.h"
 #include "verification/unit/linux/fakes/child_process.h"
 #include "verification/unit/linux/stop.h"
+#include "verification/unit/places.h"
+#include "verification/unit/service/addresses.h"
 
 namespace wp {
 namespace {
@@ -31,7 +33,7 @@ class MessageBus : public ::testing::Test {
                                     "--address=" + address_});
         setenv("DBUS_SYSTEM_BUS_ADDRESS", address_.c_str(), 1);
         services_ = new ChildProcess({"/usr/bin/python3",
-                                      WP_SOURCE_DIR "/verification/unit/linux/fakes/bus_services.py",
+                                      sourceFolder() + "/verification/unit/linux/fakes/bus_services.py",
                                       address_, "nm", "supplicant", "iwd", "bluez", "resolved", "broken"});
     }
     static void TearDownTestSuite() {
@@ -54,12 +56,6 @@ class MessageBus : public ::testing::Test {
 
 int codeOf(Reason reason) {
     return static_cast<int>(reason);
-}
-
-std::string textsOf(const std::vector<IPAddress>& addresses) {
-    std::string text;
-    for (const IPAddress& each : addresses) text += each.text() + " ";
-    return text;
 }
 
 /// One line per network: name, security, and the first letters of what is set.

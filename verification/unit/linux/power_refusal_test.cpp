@@ -6,6 +6,7 @@
 #include "verification/unit/fakes/temporary_folder.h"
 #include "verification/unit/linux/conversation.h"
 #include "verification/unit/linux/fakes/child_process.h"
+#include "verification/unit/places.h"
 
 namespace wp {
 namespace {
@@ -18,7 +19,7 @@ class OwnBus {
         daemon_.emplace(std::vector<std::string>{"dbus-daemon", "--session", "--nofork", "--nopidfile",
                                                  "--print-address", "--address=" + address_});
         service_.emplace(std::vector<std::string>{
-            "/usr/bin/python3", WP_SOURCE_DIR "/verification/unit/linux/fakes/bus_services.py", address_,
+            "/usr/bin/python3", sourceFolder() + "/verification/unit/linux/fakes/bus_services.py", address_,
             service});
     }
     ~OwnBus() { unsetenv("DBUS_SYSTEM_BUS_ADDRESS"); }

@@ -13,7 +13,7 @@ namespace {
 
 using ByteList = std::vector<std::uint8_t>;
 
-std::string textOf(const std::optional<IPAddress>& address) {
+std::string addressText(const std::optional<IPAddress>& address) {
     return address ? address->text() : "none";
 }
 
@@ -42,14 +42,14 @@ TEST(Stun, AsksForABindingWithItsTransaction) {
 }
 
 TEST(Stun, FindsTheMappedAddressBehindOtherAttributes) {
-    EXPECT_EQ(textOf(addressFromStun(stunResponse(kMapped), kTransaction)), "192.0.2.1");
+    EXPECT_EQ(addressText(addressFromStun(stunResponse(kMapped), kTransaction)), "192.0.2.1");
 }
 
 TEST(Stun, FindsAnIPv6Address) {
     // The IPv6 sample of RFC 5769.
     const ByteList attribute = {0x00, 0x20, 0x00, 0x14, 0x00, 0x02, 0xA1, 0x47, 0x01, 0x13, 0xA9, 0xFA,
                                 0xA5, 0xD3, 0xF1, 0x79, 0xBC, 0x25, 0xF4, 0xB5, 0xBE, 0xD2, 0xB9, 0xD9};
-    EXPECT_EQ(textOf(addressFromStun(stunResponse(attribute), kTransaction)),
+    EXPECT_EQ(addressText(addressFromStun(stunResponse(attribute), kTransaction)),
               "2001:db8:1234:5678:11:2233:4455:6677");
 }
 
@@ -57,29 +57,29 @@ TEST(Stun, TakesThePlainAddressOnlyWhereThereIsNoMaskedOne) {
     const ByteList plain = {0x00, 0x01, 0x00, 0x08, 0x00, 0x01, 0x12, 0x34, 198, 51, 100, 9};
     ByteList both = plain;
     for (const std::uint8_t byte : kMapped) both.push_back(byte);
-    EXPECT_EQ(textOf(addressFromStun(stunResponse(plain), kTransaction)), "198.51.100.9");
-    EXPECT_EQ(textOf(addressFromStun(stunResponse(both), kTransaction)), "192.0.2.1");
+    EXPECT_EQ(addressText(addressFromStun(stunResponse(plain), kTransaction)), "198.51.100.9");
+    EXPECT_EQ(addressText(addressFromStun(stunResponse(both), kTransaction)), "192.0.2.1");
 }
 
 TEST(Stun, RefusesForeignAndCutMessages) {
     const ByteList good = stunResponse(kMapped);
     for (std::size_t size = 0; size < good.size(); ++size)
-        EXPECT_EQ(textOf(addressFromStun(Bytes(good).first(size), kTransaction)), "none") << size;
+        EXPECT_EQ(addressText(addressFromStun(Bytes(good).first(size), kTransaction)), "none") << size;
     StunTransaction other = kTransaction;
     other[11] ^= 1;
-    EXPECT_EQ(textOf(addressFromStun(good, other)), "none");
+    EXPECT_EQ(addressText(addressFromStun(good, other)), "none");
     ByteList error = good;
     error[1] = 0x11;
-    EXPECT_EQ(textOf(addressFromStun(error, kTransaction)), "none");
+    EXPECT_EQ(addressText(addressFromStun(error, kTransaction)), "none");
     ByteList beyond = good;
     beyond[22] = 0xFF;
-    EXPECT_EQ(textOf(addressFromStun(beyond, kTransaction)), "none");
+    EXPECT_EQ(addressText(addressFromStun(beyond, kTransaction)), "none");
 }
 
 TEST(PortMapping, ReadsTheOuterAddress) {
     const auto answer = readExternalAddress(ByteList{0, 128, 0, 0, 0, 0, 0, 9, 203, 0, 113, 7});
     ASSERT_TRUE(answer);
-    EXPECT_EQ(textOf(answer->external), "203.0.113.7");
+    EXPECT_EQ(addressText(answer->external), "203.0.113.7");
     EXPECT_FALSE(answer->speaksOnlyPcp);
 }
 
@@ -112,14 +112,14 @@ TEST(PortMapping, AsksAndReadsTheYoungerProtocol) {
     answer[1] = 0x81;
     const std::uint8_t outer[] = {203, 0, 113, 7};
     std::copy(std::begin(outer), std::end(outer), answer.begin() + 56);
-    EXPECT_EQ(textOf(addressFromPcp(answer, nonce)), "203.0.113.7");
+    EXPECT_EQ(addressText(addressFromPcp(answer, nonce)), "203.0.113.7");
     for (std::size_t size = 0; size < answer.size(); ++size)
-        EXPECT_EQ(textOf(addressFromPcp(Bytes(answer).first(size), nonce)), "none");
+        EXPECT_EQ(addressText(addressFromPcp(Bytes(answer).first(size), nonce)), "none");
     answer[3] = 2;
-    EXPECT_EQ(textOf(addressFromPcp(answer, nonce)), "none");
+    EXPECT_EQ(addressText(addressFromPcp(answer, nonce)), "none");
     answer[3] = 0;
     answer[24] = 9;
-    EXPECT_EQ(textOf(addressFromPcp(answer, nonce)), "none");
+    EXPECT_EQ(addressText(addressFromPcp(answer, nonce)), "none");
 }
 
 TEST(Ssdp, FindsWhereTheDescriptionIs) {
@@ -181,12 +181,12 @@ TEST(DeviceDescription, AServiceTypeThatWouldBreakAHeaderIsNotTaken) {
 }
 
 TEST(Soap, ReadsTheOuterAddress) {
-    EXPECT_EQ(textOf(addressFromSoap("<s:Envelope><s:Body><u:R><NewExternalIPAddress>203.0.113.7"
-                                     "</NewExternalIPAddress></u:R></s:Body></s:Envelope>")),
+    EXPECT_EQ(addressText(addressFromSoap("<s:Envelope><s:Body><u:R><NewExternalIPAddress>203.0.113.7"
+                                          "</NewExternalIPAddress></u:R></s:Body></s:Envelope>")),
               "203.0.113.7");
-    EXPECT_EQ(textOf(addressFromSoap("<NewExternalIPAddress></NewExternalIPAddress>")), "none");
-    EXPECT_EQ(textOf(addressFromSoap("<NewExternalIPAddress>0.0.0.0</NewExternalIPAddress>")), "none");
-    EXPECT_EQ(textOf(addressFromSoap("garbage")), "none");
+    EXPECT_EQ(addressText(addressFromSoap("<NewExternalIPAddress></NewExternalIPAddress>")), "none");
+    EXPECT_EQ(addressText(addressFromSoap("<NewExternalIPAddress>0.0.0.0</NewExternalIPAddress>")), "none");
+    EXPECT_EQ(addressText(addressFromSoap("garbage")), "none");
 }
 
 TEST(PortalApi, BelievesACaptiveAnswerOnlyWithAPageToGoTo) {

@@ -12,8 +12,6 @@ namespace {
 
 using namespace std::chrono_literals;
 
-const IPAddress kHere = *IPAddress::fromText("127.0.0.1");
-
 UdpServer::Message answerWith(const std::string& location) {
     const std::string text = "HTTP/1.1 200 OK\r\nLOCATION: " + location + "\r\n\r\n";
     return {text.begin(), text.end()};

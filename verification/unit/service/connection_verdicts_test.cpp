@@ -3,14 +3,12 @@
 #include "service/captive_portal.h"
 #include "service/double_translation.h"
 #include "service/reachability.h"
+#include "verification/unit/service/addresses.h"
 #include "verification/unit/service/finding.h"
+#include "verification/unit/service/portal_answers.h"
 
 namespace wp {
 namespace {
-
-IPAddress address(std::string_view text) {
-    return IPAddress::fromText(text).value();
-}
 
 TranslationEvidence behind(std::string_view own) {
     TranslationEvidence evidence;
@@ -105,10 +103,6 @@ TEST(VendorService, ContentMustBeTheExpectedOne) {
     EXPECT_FALSE(found(retrievesFromVendor(contact(reached, 200, "anything"), {}, {})));
     EXPECT_FALSE(found(retrievesFromVendor(contact(reached, 404, "<!doctype html>"), page, {})));
     EXPECT_FALSE(found(retrievesFromVendor(contact(failed, 204), page, {})));
-}
-
-PortalAnswer answered(int status, std::size_t size = 0, std::string location = {}) {
-    return {PortalAnswer::End::answered, status, size, std::move(location), std::nullopt, {}};
 }
 
 PortalAnswer brokenOff(std::size_t size) {

@@ -3,7 +3,9 @@
 #include "platform/json_writer.h"
 #include "service/answer.h"
 #include "service/channel_use.h"
+#include "verification/unit/service/addresses.h"
 #include "verification/unit/service/frames.h"
+#include "verification/unit/service/portal_answers.h"
 
 namespace wp {
 namespace {
@@ -23,24 +25,11 @@ std::string detail(int number, const Facts& facts, std::string_view key) {
     return found == details.end() ? "" : jsonText(found->second, JSONStyle::compact);
 }
 
-IPAddress address(std::string_view text) {
-    return IPAddress::fromText(text).value();
-}
-
 Facts withPortal(PortalAnswer plain, PortalAnswer secure) {
     Facts facts = joinedTo({heard(nameElement("Cafe"))});
     facts.portal = PortalEvidence{{}, std::move(plain), std::move(secure)};
     facts.saved = SavedNetworks{"store", {}};
     return facts;
-}
-
-PortalAnswer answered(int status, std::size_t bodySize = 0, std::string location = "") {
-    PortalAnswer answer;
-    answer.end = PortalAnswer::End::answered;
-    answer.status = status;
-    answer.bodySize = bodySize;
-    answer.location = std::move(location);
-    return answer;
 }
 
 TEST(Answer, KeepsTheVerdictsOwnInformationAsItIs) {

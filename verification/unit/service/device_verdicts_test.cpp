@@ -3,14 +3,11 @@
 #include "service/address_configuration.h"
 #include "service/bluetooth.h"
 #include "service/peer_link.h"
+#include "verification/unit/service/addresses.h"
 #include "verification/unit/service/finding.h"
 
 namespace wp {
 namespace {
-
-IPAddress address(std::string_view text) {
-    return IPAddress::fromText(text).value();
-}
 
 AddressMethods methods(std::string ipv4, std::string ipv6) {
     return {std::move(ipv4), std::move(ipv6)};

@@ -2,12 +2,10 @@
 
 #include <gtest/gtest.h>
 
+#include "verification/unit/service/addresses.h"
+
 namespace wp {
 namespace {
-
-IPAddress address(std::string_view text) {
-    return IPAddress::fromText(text).value();
-}
 
 std::string written(std::string_view text) {
     const auto read = IPAddress::fromText(text);

@@ -16,6 +16,7 @@
 #include "host/string_table.h"
 #include "screens/tv/tv_screen.h"
 #include "verification/unit/network_list/list_run.h"
+#include "verification/unit/places.h"
 #include "verification/unit/tv/picture_compare.h"
 
 namespace wp::tv {
@@ -25,8 +26,8 @@ using fakes::AccessPoint;
 using fakes::ListRun;
 using ui::Key;
 
-const std::filesystem::path kGood = std::filesystem::path(WP_SOURCE_DIR) / "verification/unit/tv/pictures";
-const std::filesystem::path kTaken = std::filesystem::path(WP_BINARY_DIR) / "pictures";
+const std::filesystem::path kGood = std::filesystem::path(sourceFolder()) / "verification/unit/tv/pictures";
+const std::filesystem::path kTaken = std::filesystem::path(buildFolder()) / "pictures";
 
 std::vector<AccessPoint> neighbourhood(int count) {
     const char* names[] = {"Blue Kite",      "Café am Eck",   "Corner Shop", "Flat 12",        "Garden Room",
@@ -42,7 +43,7 @@ class Pictures : public testing::Test {
   protected:
     Pictures() {
         setenv("QT_QPA_PLATFORM", "offscreen", 1);
-        setenv("FONTCONFIG_FILE", WP_SOURCE_DIR "/verification/unit/tv/fonts.conf", 1);
+        setenv("FONTCONFIG_FILE", (sourceFolder() + "/verification/unit/tv/fonts.conf").c_str(), 1);
         setenv("WIFI_PROFILE_TV_SIZE", "1280x720", 1);
         setenv("WIFI_PROFILE_TV_MOTION", "none", 1);
         std::filesystem::create_directories(kTaken);

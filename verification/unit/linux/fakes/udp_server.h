@@ -10,11 +10,14 @@
 #include <vector>
 
 #include "linux/stop_signal.h"
+#include "service/ip_address.h"
 #include "verification/unit/linux/fakes/loopback_socket.h"
 
 namespace wp {
 
-/// A server of datagrams on 127.0.0.1 that answers each request as the test says: with bytes, or not at all.
+inline const IPAddress kHere = *IPAddress::fromText("127.0.0.1");
+
+/// A server of datagrams there that answers each request as the test says: with bytes, or not at all.
 class UdpServer {
   public:
     using Message = std::vector<std::uint8_t>;

@@ -12,6 +12,7 @@
 
 #include "verification/unit/fakes/temporary_folder.h"
 #include "verification/unit/linux/fakes/child_process.h"
+#include "verification/unit/places.h"
 
 namespace wp {
 
@@ -33,7 +34,8 @@ class WebServer {
         EXPECT_EQ(std::system(make.c_str()), 0);
         if (validity) renew(*validity);
         server_ = std::make_unique<ChildProcess>(std::vector<std::string>{
-            "python3", WP_SOURCE_DIR "/verification/unit/linux/fakes/web_server.py", certificate(), key()});
+            "python3", sourceFolder() + "/verification/unit/linux/fakes/web_server.py", certificate(),
+            key()});
         std::istringstream(server_->firstLine()) >> plainPort_ >> securePort_;
     }
     WebServer(const WebServer&) = delete;
