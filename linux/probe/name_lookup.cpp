@@ -42,18 +42,28 @@ struct Lookup {
     int running = 0;
 };
 
-std::string csvOf(const NameServerSet& whom) {
+enum class Zones { told, leftOut };
+
+/// The list in the library's form. \param zones whether link-local servers name their interface
+std::string listOf(const NameServerSet& whom, Zones zones) {
     std::string list;
     for (const IPAddress& server : whom.servers) {
-        const std::string zone = server.linkLocal() && !server.isIPv4() && !whom.interfaceName.empty()
-                                     ? "%" + whom.interfaceName
-                                     : "";
+        const bool hasZone = zones == Zones::told && server.linkLocal() && !server.isIPv4();
+        const std::string zone = hasZone && !whom.interfaceName.empty() ? "%" + whom.interfaceName : "";
         const std::string port = std::to_string(whom.port);
         if (!list.empty()) list += ",";
         // The zone stands behind the port in this list.
         list += server.isIPv4() ? server.text() + ":" + port : "[" + server.text() + "]:" + port + zone;
     }
     return list;
+}
+
+/// Older versions of the library refuse a list with a zone in it, and later ones want it. A socket that is bound to
+/// the interface reaches the server without one too.
+int setServers(ares_channel channel, const NameServerSet& whom) {
+    const int status = ares_set_servers_ports_csv(channel, listOf(whom, Zones::told).c_str());
+    if (status != ARES_EBADSTR) return status;
+    return ares_set_servers_ports_csv(channel, listOf(whom, Zones::leftOut).c_str());
 }
 
 /// Binds a socket of the library to the interface of that name, or refuses the socket: the library's own way goes over
@@ -78,7 +88,7 @@ Known<Channel> openChannel(const NameServerSet& whom, int tries, int moreFlags =
     const int mask = ARES_OPT_FLAGS | ARES_OPT_TIMEOUTMS | ARES_OPT_TRIES | ARES_OPT_LOOKUPS;
     int status = ares_init_options(&raw, &options, mask);
     Channel channel(raw);
-    if (status == ARES_SUCCESS) status = ares_set_servers_ports_csv(raw, csvOf(whom).c_str());
+    if (status == ARES_SUCCESS) status = setServers(raw, whom);
     if (status != ARES_SUCCESS)
         return failure(Reason::unavailable,
                        std::string("names cannot be asked for: ") + ares_strerror(status));

@@ -290,6 +290,20 @@ TEST(NameLookup, GoesOverNoOtherInterfaceWhereItsOwnIsGone) {
     EXPECT_EQ(each->front().code, "unreachable");
 }
 
+TEST(NameLookup, ALinkLocalServerIsOneLikeAnyOther) {
+    const UdpServer server([](const Message& query) { return dnsAnswer(query, {203, 0, 113, 7}, {}); });
+    NameServerSet both = serverAt(server);
+    both.servers.insert(both.servers.begin(), *IPAddress::fromText("fe80::1"));  // nothing listens there
+    const auto answer = lookUpName("host.example", both, patience());
+    const auto each = askEachServer("host.example", both, patience());
+    ASSERT_TRUE(answer) << answer.error().message;
+    ASSERT_TRUE(each) << each.error().message;
+    EXPECT_EQ(answer->addresses.size(), 1U);
+    ASSERT_EQ(each->size(), 2U);
+    EXPECT_FALSE(each->front().answered);
+    EXPECT_TRUE(each->back().answered);
+}
+
 TEST(NameLookup, EachServerIsToldApart) {
     const UdpServer server([](const Message& query) { return dnsAnswer(query, {203, 0, 113, 7}, {}); });
     NameServerSet both = serverAt(server);
