@@ -31,7 +31,9 @@ std::optional<AddressDetails> detailsOf(const ifaddrmsg& header, const Attribute
     const std::uint32_t flags = attributes.number<std::uint32_t>(IFA_FLAGS).value_or(header.ifa_flags);
     const std::uint8_t origin = attributes.number<std::uint8_t>(kAddressOrigin).value_or(0);
     const bool kernelMade = origin == kMadeByAdvertisement || origin == kMadeAsLinkLocal;
-    return AddressDetails{{*address, lastsForever(attributes, flags), kernelMade}, header.ifa_prefixlen};
+    return AddressDetails{{*address, lastsForever(attributes, flags), kernelMade},
+                          header.ifa_prefixlen,
+                          (flags & IFA_F_NOPREFIXROUTE) == 0};
 }
 
 template <class Header>
@@ -60,6 +62,16 @@ std::vector<AddressDetails> readAddressDetails(Bytes buffer, std::uint32_t inter
     return all;
 }
 
+std::vector<AssignedAddress> assignedByIwd(const std::vector<AddressDetails>& details, bool advertised) {
+    std::vector<AssignedAddress> assigned;
+    for (const AddressDetails& each : details) {
+        assigned.push_back(each.assigned);
+        if (advertised && !each.assigned.address.isIPv4() && !each.bringsRoute)
+            assigned.back().byAdvertisement = true;
+    }
+    return assigned;
+}
+
 Known<std::vector<AddressDetails>> gatherAddressDetails(std::uint32_t interfaceIndex, const Until& until) {
     const auto messages = dump<ifaddrmsg>(RTM_GETADDR, "addresses", until);
     if (!messages) return messages.error();
@@ -73,6 +85,7 @@ Known<WaysOut> gatherWaysOut(std::uint32_t interfaceIndex, const Until& until) {
     for (const Gateway& each : readGateways(*messages, interfaceIndex))
         if (const auto address = IPAddress::fromBytes(each.bytes)) ways.gateways.push_back(*address);
     ways.elsewhere = leadsElsewhere(*messages, interfaceIndex);
+    ways.advertised = hasAdvertisedRoute(*messages, interfaceIndex);
     return ways;
 }
 

@@ -13,11 +13,19 @@ namespace wp {
 struct AddressDetails {
     AssignedAddress assigned;
     unsigned prefixLength = 0;
+    bool bringsRoute =
+        true;  ///< to its network; a program that sets up all routes itself asks the kernel for none
 };
 
 /// The addresses of one interface in a buffer of the kernel's messages; passes over what it does not know or what
 /// is broken. *Any* thread.
 std::vector<AddressDetails> readAddressDetails(Bytes buffer, std::uint32_t interfaceIndex);
+
+/// The same as iwd's addresses are to be read. It sets what an advertisement or a lease grants without an end just as what
+/// was entered, both without a route. But it looks at advertisements only where no address of IPv6 was entered, and then
+/// leaves advertised routes behind. *Any* thread.
+/// \param advertised whether the interface has such a route
+std::vector<AssignedAddress> assignedByIwd(const std::vector<AddressDetails>& details, bool advertised);
 
 /// Asks the kernel for them.
 Known<std::vector<AddressDetails>> gatherAddressDetails(std::uint32_t interfaceIndex, const Until& until);
@@ -26,6 +34,7 @@ Known<std::vector<AddressDetails>> gatherAddressDetails(std::uint32_t interfaceI
 struct WaysOut {
     std::vector<IPAddress> gateways;  ///< of the interface, those in use first, IPv4 before IPv6
     bool elsewhere = false;           ///< whether there is one over another interface
+    bool advertised = false;          ///< whether a router advertised one of the interface's routes of IPv6
 };
 Known<WaysOut> gatherWaysOut(std::uint32_t interfaceIndex, const Until& until);
 /// The gateways alone.

@@ -183,19 +183,19 @@ NameServers serversWithoutManager(const ClientLeases& leases, bool client,
 Known<LinkSetup> setupFromKernel(Known<Bus>& bus, const Link& link, const Until& until) {
     const auto details = gatherAddressDetails(link.interfaceIndex, until);
     if (!details) return details.error();
-    std::vector<AssignedAddress> assigned;
-    for (const AddressDetails& each : *details) assigned.push_back(each.assigned);
+    const auto ways = gatherWaysOut(link.interfaceIndex, until);
+    const bool isIwds = iwdManages(bus, link, until);
+    const auto assigned = assignedByIwd(*details, isIwds && ways && ways->advertised);
     const ClientLeases leases = readClientLeases(link, assigned);
     const DhcpClients clients = dhcpClientsOf(link.interfaceName);
     const bool client = leases.ipv4 || clients.any;
     KernelIPv6 switches = kernelSwitches(link.interfaceName);
     switches.setByClient = clients.asksRouters;
-    switches.acceptsAdvertisements |= clients.asksRouters || iwdManages(bus, link, until);
+    switches.acceptsAdvertisements |= clients.asksRouters || isIwds;
     LinkSetup setup;
     setup.toldBy = "addresses";
     setup.methods = {methodFromIPv4Addresses(assigned, client), methodFromIPv6Addresses(assigned, switches)};
-    NameServers names =
-        serversWithoutManager(leases, client, assigned, gatherWaysOut(link.interfaceIndex, until));
+    NameServers names = serversWithoutManager(leases, client, assigned, ways);
     names.effective = effectiveServers(bus, link, {}, until);
     setup.servers = leases.ipv4 && !leases.ipv4->servers.empty() ? leases.ipv4->servers : names.effective;
     setup.nameServers = std::move(names);

@@ -133,6 +133,20 @@ bool leadsElsewhere(Bytes buffer, std::uint32_t interfaceIndex) {
     return found;
 }
 
+bool hasAdvertisedRoute(Bytes buffer, std::uint32_t interfaceIndex) {
+    bool found = false;
+    forEachContent(buffer, [&](const NetlinkMessage& message) {
+        const std::optional<rtmsg> header = headerOf<rtmsg>(message);
+        if (message.type != RTM_NEWROUTE || !header) return;
+        if (header->rtm_family != AF_INET6 || header->rtm_protocol != RTPROT_RA) return;
+        const Attributes attributes = message.attributesAfter(NLMSG_ALIGN(sizeof(rtmsg)));
+        const auto hops = attributes.find(RTA_MULTIPATH);
+        found |= hops ? nextHopAmong(Address::Family::ipv6, *hops, interfaceIndex).has_value()
+                      : attributes.number<std::uint32_t>(RTA_OIF) == interfaceIndex;
+    });
+    return found;
+}
+
 bool isReachable(Bytes buffer, std::uint32_t interfaceIndex, Bytes address) {
     bool found = false;
     forEachContent(buffer, [&](const NetlinkMessage& message) {

@@ -27,6 +27,10 @@ std::vector<Gateway> readGateways(Bytes buffer, std::uint32_t interfaceIndex);
 /// Whether a default route, of whatever table, leads over another interface: a cable's, or a tunnel's.
 bool leadsElsewhere(Bytes buffer, std::uint32_t interfaceIndex);
 
+/// Whether a route of IPv6 over the interface is marked as one that a router advertised. The kernel marks its own so, and
+/// so does a program that looks at advertisements in the kernel's place.
+bool hasAdvertisedRoute(Bytes buffer, std::uint32_t interfaceIndex);
+
 /// Whether the kernel has lately heard from the neighbour of this address on the interface, though it may ignore pings.
 bool isReachable(Bytes buffer, std::uint32_t interfaceIndex, Bytes address);
 

@@ -19,8 +19,9 @@ struct AddressMethods {
 /// One address as the kernel keeps it, for devices without a manager that tells.
 struct AssignedAddress {
     IPAddress address;
-    bool permanent = false;        ///< without an end to its life
-    bool byAdvertisement = false;  ///< the kernel made it of a router's advertisement, or as a link-local one
+    bool permanent = false;  ///< without an end to its life
+    /// It was made of a router's advertisement, or as a link-local one.
+    bool byAdvertisement = false;
 };
 
 /// The kernel's own switches for IPv6 on the interface.

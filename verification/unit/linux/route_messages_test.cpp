@@ -112,6 +112,28 @@ TEST(RouteMessages, TellWhetherAnotherInterfaceLeadsOut) {
     EXPECT_TRUE(leadsElsewhere(routes, 4711));
 }
 
+/// The kernel's message on a route over interface 3 to 2001:db8::/64.
+std::vector<std::uint8_t> routeMessage(unsigned char family, unsigned char protocol) {
+    const std::uint8_t network[] = {0x20, 1, 0xD, 0xB8, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0};
+    NetlinkRequest message(RTM_NEWROUTE, 0);
+    message.header<rtmsg>() = {family, 64, 0, 0, RT_TABLE_MAIN, protocol, RT_SCOPE_UNIVERSE, RTN_UNICAST, 0};
+    message.put(RTA_DST, network);
+    message.put(RTA_OIF, std::uint32_t{3});
+    const auto* bytes = reinterpret_cast<const std::uint8_t*>(&message.message());
+    return {bytes, bytes + message.message().nlmsg_len};
+}
+
+TEST(RouteMessages, TellWhetherARouterAdvertisedARoute) {
+    const auto advertised = routeMessage(AF_INET6, RTPROT_RA);
+
+    EXPECT_TRUE(hasAdvertisedRoute(advertised, 3));
+    EXPECT_FALSE(hasAdvertisedRoute(advertised, 4));
+    EXPECT_FALSE(hasAdvertisedRoute(routeMessage(AF_INET6, RTPROT_STATIC), 3));
+    EXPECT_FALSE(hasAdvertisedRoute(routeMessage(AF_INET, RTPROT_RA), 3));
+    for (std::size_t size = 0; size < advertised.size(); ++size)
+        EXPECT_FALSE(hasAdvertisedRoute(Bytes(advertised).first(size), 3));
+}
+
 TEST(RouteMessages, TellAnIPv6GatewayWhereThereIsNoOther) {
     const auto gateways = readGateways(captured("ipv6-only-route"), interfaceIn("ipv6-only"));
 
@@ -147,6 +169,21 @@ TEST(AddressDetails, TellLifetimeAndOrigin) {
     EXPECT_EQ(linesOf(readAddressDetails(addressMessage(0, 0xFFFF'FFFF), 3)), "2001:db8::5/64 forever\n");
     EXPECT_EQ(linesOf(readAddressDetails(addressMessage(2, 3600), 3)), "2001:db8::5/64 advertised\n");
     EXPECT_EQ(linesOf(readAddressDetails(addressMessage(0, 3600), 3)), "2001:db8::5/64\n");
+}
+
+TEST(AddressDetails, OfIwdWereEnteredUnlessARouteIsAdvertised) {
+    auto details = readAddressDetails(addressMessage(0, 0xFFFF'FFFF, IFA_F_NOPREFIXROUTE), 3);
+    const auto ofAPerson = readAddressDetails(addressMessage(0, 0xFFFF'FFFF), 3);
+    details.insert(details.end(), ofAPerson.begin(), ofAPerson.end());
+    ASSERT_EQ(details.size(), 2U);
+    EXPECT_FALSE(details[0].bringsRoute);
+
+    const auto advertised = assignedByIwd(details, true), entered = assignedByIwd(details, false);
+
+    EXPECT_TRUE(advertised[0].byAdvertisement);
+    EXPECT_FALSE(advertised[1].byAdvertisement) << "set beside iwd, with a route of its own";
+    EXPECT_FALSE(entered[0].byAdvertisement);
+    EXPECT_TRUE(entered[0].permanent);
 }
 
 TEST(AddressDetails, SurviveAnyCutOfADump) {
