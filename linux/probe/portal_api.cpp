@@ -21,9 +21,10 @@ std::optional<PortalApiAnswer> portalFromApi(std::string_view json) {
 }
 
 std::string portalApiIn(const std::map<std::string, std::string>& lease) {
-    // By what NetworkManager calls them (its internal client, then dhclient's numbers), then networkd.
-    for (const char* name : {"captive_portal", "unknown_114", "114", "default_url", "dhcp6_captive_portal",
-                             "unknown_103", "private_160", "unknown_160"}) {
+    // As NetworkManager passes them on: by names of its own that dhclient shares, by dhcpcd's, and by the numbers of a
+    // dhclient that has no name for them. Of DHCPv6 it has no name itself.
+    for (const char* name : {"default_url", "captive_portal_uri", "unknown_114", "v4_captive_portal",
+                             "unknown_160", "dhcp6_v6_captive_portal", "dhcp6_unknown_103"}) {
         const auto found = lease.find(name);
         if (found != lease.end() && !found->second.empty()) return found->second;
     }

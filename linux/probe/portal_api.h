@@ -20,8 +20,8 @@ struct PortalApiAnswer {
 /// thread.
 std::optional<PortalApiAnswer> portalFromApi(std::string_view json);
 
-/// The address of the portal's API among the options of a lease, by their numbers or the names that managers
-/// give them (RFC 8910, option 114; 160 is its withdrawn code); empty where the network names none.
+/// The address of the portal's API among the options of a lease in NetworkManager's form, by the names that DHCP clients
+/// give them (RFC 8910: option 114, withdrawn 160; of DHCPv6 103); empty where the network names none.
 std::string portalApiIn(const std::map<std::string, std::string>& lease);
 
 /// Whether the address is the one that means "no portal here".

@@ -207,8 +207,9 @@ TEST(PortalApi, BelievesACaptiveAnswerOnlyWithAPageToGoTo) {
 }
 
 TEST(PortalApi, IsNamedByALease) {
-    EXPECT_EQ(portalApiIn({{"captive_portal", "https://p.example/api"}}), "https://p.example/api");
-    EXPECT_EQ(portalApiIn({{"unknown_114", ""}, {"private_160", "https://old.example/"}}),
+    for (const char* name : {"default_url", "captive_portal_uri", "dhcp6_v6_captive_portal"})
+        EXPECT_EQ(portalApiIn({{name, "https://p.example/api"}}), "https://p.example/api") << name;
+    EXPECT_EQ(portalApiIn({{"default_url", ""}, {"v4_captive_portal", "https://old.example/"}}),
               "https://old.example/");
     EXPECT_EQ(portalApiIn({{"routers", "192.168.1.1"}}), "");
     EXPECT_TRUE(meansNoPortal("urn:ietf:params:capport:unrestricted"));
