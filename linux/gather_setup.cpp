@@ -158,9 +158,10 @@ ClientLeases readClientLeases(const Link& link, const std::vector<AssignedAddres
     for (const AssignedAddress& each : assigned) addresses.push_back(each.address);
     const std::time_t now = std::time(nullptr);
     DhcpcdLeases kept = findDhcpcdLeases(link.interfaceName, addresses, now);
-    auto ofDhclient = findLease(link.interfaceName, now);
-    // Only dhcpcd's was held against the interface's addresses.
-    return {kept.ipv4 ? std::move(kept.ipv4) : std::move(ofDhclient), std::move(kept.ipv6)};
+    // Of IPv4 only dhcpcd's is held against the interface's addresses.
+    if (!kept.ipv4) kept.ipv4 = findLease(link.interfaceName, now);
+    if (!kept.ipv6) kept.ipv6 = findLease6(link.interfaceName, addresses, now);
+    return {std::move(kept.ipv4), std::move(kept.ipv6)};
 }
 
 /// The name servers where no manager tells: by the leases, else by who can have named them at all.

@@ -1,5 +1,6 @@
 #include "linux/files/leases.h"
 
+#include <algorithm>
 #include <charconv>
 #include <chrono>
 
@@ -59,19 +60,90 @@ struct Block {
     bool passed = false;
 };
 
-void readStatement(std::string_view line, Block& block, std::int64_t now) {
+struct Statement {
+    std::string_view name, value;
+};
+
+/// "name value;" or "option name value;"; without a value both are empty.
+Statement statementIn(std::string_view line) {
     if (line.ends_with(";")) line = trimmed(line.substr(0, line.size() - 1));
     if (line.starts_with("option ")) line = trimmed(line.substr(7));
     const std::size_t blank = line.find(' ');
-    if (blank == line.npos) return;
-    const std::string_view name = line.substr(0, blank), value = trimmed(line.substr(blank));
+    if (blank == line.npos) return {};
+    return {line.substr(0, blank), trimmed(line.substr(blank))};
+}
+
+void readStatement(std::string_view line, Block& block, std::int64_t now) {
+    const auto [name, value] = statementIn(line);
     if (name == "interface") block.interfaceName = unquoted(value);
     if (name == "expire") block.passed = hasPassed(value, now);
     if (name == "domain-name-servers") addServers(value, block.lease.servers);
     if (name == "vendor-encapsulated-options" || name == "vendor-class-identifier")
         block.lease.vendorText += unquoted(value);
-    if (name == "unknown-114" || name == "default-url" || name == "captive-portal")
+    if (name == "default-url" || name == "unknown-114" ||
+        (name == "v4-captive-portal" && block.lease.portalApi.empty()))
         block.lease.portalApi = unquoted(value);
+}
+
+/// An address that a lease of DHCPv6 grants; or a prefix, which is passed over.
+struct Grant {
+    std::optional<IPAddress> address;
+    std::uint32_t starts = 0;   ///< since 1970
+    std::uint32_t seconds = 0;  ///< all bits set: without an end
+};
+
+/// One block of the file of DHCPv6. It holds groups of addresses, and these an address each, in braces of their own.
+struct Block6 {
+    Lease lease;
+    std::string interfaceName;
+    std::vector<Grant> grants;
+    int depth = 1;
+};
+
+constexpr int kInGrant = 3;
+
+std::uint32_t numberIn(std::string_view text) {
+    std::uint32_t number = 0;
+    std::from_chars(text.data(), text.data() + text.size(), number);
+    return number;
+}
+
+/// A line that opens braces.
+void openBraces(std::string_view line, Block6& block) {
+    if (++block.depth != kInGrant) return;
+    const auto [name, value] = statementIn(line);
+    block.grants.emplace_back();
+    if (name == "iaaddr") block.grants.back().address = IPAddress::fromText(value.substr(0, value.find(' ')));
+}
+
+void readStatement6(std::string_view line, Block6& block) {
+    const auto [name, value] = statementIn(line);
+    if (block.depth == kInGrant) {
+        if (name == "starts") block.grants.back().starts = numberIn(value);
+        if (name == "max-life") block.grants.back().seconds = numberIn(value);
+    }
+    if (block.depth > 1) return;
+    if (name == "interface") block.interfaceName = unquoted(value);
+    if (name == "dhcp6.name-servers") addServers(value, block.lease.servers);
+    if (name == "dhcp6.v6-captive-portal" || name == "dhcp6.unknown-103")
+        block.lease.portalApi = unquoted(value);
+}
+
+bool isInForce(const Grant& grant, const std::vector<IPAddress>& assigned, std::int64_t now) {
+    constexpr std::uint32_t kWithoutEnd = 0xFFFFFFFF;
+    const bool isHere = grant.address && std::ranges::find(assigned, *grant.address) != assigned.end();
+    return isHere && (grant.seconds == kWithoutEnd || std::int64_t{grant.starts} + grant.seconds > now);
+}
+
+/// The first that can be read and holds a lease.
+template <class Read>
+std::optional<Lease> firstOf(const std::string& root, std::initializer_list<std::string> paths, Read read) {
+    for (const std::string& path : paths) {
+        const auto text = readSmallFile(root + path);
+        std::optional<Lease> lease = text ? read(*text) : std::nullopt;
+        if (lease) return lease;
+    }
+    return std::nullopt;
 }
 
 }  // namespace
@@ -99,16 +171,44 @@ std::optional<Lease> readDhclientLeases(std::string_view text, std::string_view 
     return last;
 }
 
-std::optional<Lease> findLease(const std::string& interfaceName, std::int64_t now, const std::string& root) {
-    for (const std::string& path :
-         {"/var/lib/dhcp/dhclient." + interfaceName + ".leases", std::string("/var/lib/dhcp/dhclient.leases"),
-          "/var/lib/dhclient/dhclient-" + interfaceName + ".leases",
-          std::string("/var/lib/dhclient/dhclient.leases")}) {
-        const auto text = readSmallFile(root + path);
-        auto lease = text ? readDhclientLeases(*text, interfaceName, now) : std::nullopt;
-        if (lease) return lease;
+std::optional<Lease> readDhclient6Leases(std::string_view text, std::string_view interfaceName,
+                                         const std::vector<IPAddress>& assigned, std::int64_t now) {
+    std::optional<Lease> last;
+    std::optional<Block6> block;
+    for (std::string_view line : linesOf(text)) {
+        line = trimmed(line);
+        if (!block) {
+            if (line.starts_with("lease6 ") && line.ends_with("{")) block.emplace();
+        } else if (line.ends_with("{")) {
+            openBraces(line, *block);
+        } else if (line != "}") {
+            readStatement6(line, *block);
+        } else if (--block->depth == 0) {
+            const bool counts = std::ranges::any_of(
+                block->grants, [&](const Grant& each) { return isInForce(each, assigned, now); });
+            if (block->interfaceName == interfaceName)
+                last = counts ? std::optional(std::move(block->lease)) : std::nullopt;
+            block.reset();
+        }
     }
-    return std::nullopt;
+    return last;
+}
+
+std::optional<Lease> findLease(const std::string& interfaceName, std::int64_t now, const std::string& root) {
+    return firstOf(
+        root,
+        {"/var/lib/dhcp/dhclient." + interfaceName + ".leases", "/var/lib/dhcp/dhclient.leases",
+         "/var/lib/dhclient/dhclient-" + interfaceName + ".leases", "/var/lib/dhclient/dhclient.leases"},
+        [&](const std::string& text) { return readDhclientLeases(text, interfaceName, now); });
+}
+
+std::optional<Lease> findLease6(const std::string& interfaceName, const std::vector<IPAddress>& assigned,
+                                std::int64_t now, const std::string& root) {
+    return firstOf(
+        root,
+        {"/var/lib/dhcp/dhclient6." + interfaceName + ".leases", "/var/lib/dhcp/dhclient6.leases",
+         "/var/lib/dhclient/dhclient6-" + interfaceName + ".leases", "/var/lib/dhclient/dhclient6.leases"},
+        [&](const std::string& text) { return readDhclient6Leases(text, interfaceName, assigned, now); });
 }
 
 std::vector<IPAddress> serversFromResolverFile(std::string_view text) {

@@ -22,9 +22,19 @@ struct Lease {
 std::optional<Lease> readDhclientLeases(std::string_view text, std::string_view interfaceName,
                                         std::int64_t now);
 
+/// The same of DHCPv6, which dhclient keeps in a file of its own. It is in force where the interface has an address that it
+/// grants, and that address's time is not over. A lease without addresses (of a network where addresses come from
+/// advertisements) does not tell how long it holds, nor of which network it is, and counts for nothing.
+/// \param assigned the interface's addresses
+std::optional<Lease> readDhclient6Leases(std::string_view text, std::string_view interfaceName,
+                                         const std::vector<IPAddress>& assigned, std::int64_t now);
+
 /// Looks for the interface's lease in the places where dhclient keeps them, below a root folder.
 std::optional<Lease> findLease(const std::string& interfaceName, std::int64_t now,
                                const std::string& root = "");
+/// The same of DHCPv6.
+std::optional<Lease> findLease6(const std::string& interfaceName, const std::vector<IPAddress>& assigned,
+                                std::int64_t now, const std::string& root = "");
 
 /// The name servers of a resolver file.
 std::vector<IPAddress> serversFromResolverFile(std::string_view text);

@@ -73,6 +73,13 @@ dhclient_lease() {
         > "/run/lab/$1/dhclient.log" 2>&1 || { cat "/run/lab/$1/dhclient.log"; return 1; }
 }
 
+# dhclient_lease6 X: the same of DHCPv6, once the router has said that there is some.
+dhclient_lease6() {
+    echo 'also request dhcp6.v6-captive-portal;' > "/run/lab/$1/dhclient6.conf"
+    dhclient -6 -1 -cf "/run/lab/$1/dhclient6.conf" -lf "/var/lib/dhcp/dhclient6.$1.leases" -pf "/run/lab/$1/dhclient6.pid" "$1" \
+        > "/run/lab/$1/dhclient6.log" 2>&1 || { cat "/run/lab/$1/dhclient6.log"; return 1; }
+}
+
 # dhcpcd_lease X: addresses from dhcpcd, which keeps the servers' answers byte for byte.
 dhcpcd_lease() {
     local dir=/run/lab/$1

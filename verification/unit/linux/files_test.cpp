@@ -70,6 +70,111 @@ TEST(Leases, CutAndBrokenFilesAreReadAsFarAsTheyGo) {
     EXPECT_FALSE(readDhclientLeases("}\n}\nlease {\nlease {\n", "wlan0", 0));
 }
 
+/// As dhclient 4.4 writes it.
+constexpr const char* kLeases6 = R"(default-duid "\000\001\000\0012\225\206 \276\342\311\230\276\211";
+lease6 {
+  interface "wlan0";
+  ia-na c9:98:be:89 {
+    starts 1795199400;
+    renew 1800;
+    rebind 3150;
+    iaaddr 2001:db8::6 {
+      starts 1795199400;
+      preferred-life 3600;
+      max-life 7200;
+    }
+    iaaddr 2001:db8::7 {
+      starts 1795199400;
+      preferred-life 1800;
+      max-life 3600;
+    }
+  }
+  ia-pd c9:98:be:89 {
+    starts 1795199400;
+    iaprefix 2001:db8:9::/56 {
+      starts 1795199400;
+      preferred-life 86400;
+      max-life 86400;
+    }
+  }
+  option dhcp6.client-id 0:1:0:1:32:95:86:20:be:e2:c9:98:be:89;
+  option dhcp6.name-servers 2001:db8::53,2001:db8::54;
+  option dhcp6.v6-captive-portal "https://p.example/six";
+  option dhcp6.status-code success "success";
+}
+lease6 {
+  interface "eth0";
+  ia-na 1:2:3:4 {
+    iaaddr 2001:db8:1::7 {
+      starts 1795199400;
+      max-life 4294967295;
+    }
+  }
+  option dhcp6.name-servers fe80::1;
+}
+lease6 {
+  interface "wlan1";
+  option dhcp6.name-servers 2001:db8::55;
+}
+)";
+
+std::optional<Lease> lease6(const char* interfaceName, const char* address, std::int64_t now,
+                            const std::string& text = kLeases6) {
+    return readDhclient6Leases(text, interfaceName, {*IPAddress::fromText(address)}, now);
+}
+
+TEST(Leases6, NameServersAndPortalOfTheAddressThatTheInterfaceHas) {
+    const auto lease = lease6("wlan0", "2001:db8::7", kSixThirtyPm + 3599);
+    ASSERT_TRUE(lease);
+    EXPECT_EQ(textsOf(lease->servers), "2001:db8::53 2001:db8::54 ");
+    EXPECT_EQ(lease->portalApi, "https://p.example/six");
+    EXPECT_EQ(textsOf(lease6("eth0", "2001:db8:1::7", std::int64_t{1} << 40)->servers), "fe80::1 ");
+}
+
+TEST(Leases6, OneThatHasEndedOrIsOfAnotherNetworkIsNone) {
+    EXPECT_FALSE(lease6("wlan0", "2001:db8::7", kSixThirtyPm + 3600));
+    EXPECT_TRUE(lease6("wlan0", "2001:db8::6", kSixThirtyPm + 3600)) << "each address has its own time";
+    EXPECT_FALSE(lease6("wlan0", "2001:db8:9::", kSixThirtyPm)) << "a prefix is no address of the interface";
+    EXPECT_FALSE(lease6("wlan0", "2001:db8::8", kSixThirtyPm));
+    EXPECT_FALSE(lease6("eth0", "2001:db8::7", kSixThirtyPm));
+    EXPECT_FALSE(lease6("wlan1", "2001:db8::7", kSixThirtyPm)) << "it grants nothing";
+}
+
+TEST(Leases6, TheLastLeaseOfTheInterfaceCounts) {
+    const std::string whole = kLeases6;
+    std::string later =
+        whole.substr(whole.find("lease6"), whole.find("lease6 {", 100) - whole.find("lease6"));
+    later.replace(later.find("2001:db8::53"), 12, "2001:db8::99");
+    EXPECT_EQ(textsOf(lease6("wlan0", "2001:db8::7", kSixThirtyPm, whole + later)->servers),
+              "2001:db8::99 2001:db8::54 ");
+    later.replace(later.find("iaaddr 2001:db8::7"), 18, "iaaddr 2001:db8::8");
+    EXPECT_FALSE(lease6("wlan0", "2001:db8::7", kSixThirtyPm, whole + later));
+}
+
+TEST(Leases6, CutAndBrokenFilesAreReadAsFarAsTheyGo) {
+    const std::string whole = kLeases6;
+    const std::size_t end = whole.find("\n}\n") + 2;
+    for (std::size_t size = 0; size < whole.size(); ++size)
+        EXPECT_EQ(lease6("wlan0", "2001:db8::7", kSixThirtyPm, whole.substr(0, size)).has_value(),
+                  size >= end)
+            << size;
+    EXPECT_FALSE(lease6("w", "::1", 0, "}\nlease6 {\nstarts 1;\n{\n{\n{\nstarts 1;\n}\n}\n}\n}\n"));
+    EXPECT_FALSE(lease6("w", "::1", 0,
+                        "lease6 {\ninterface \"w\";\nia-na {\niaaddr ::1 {\n"
+                        "starts -9223372036854775808;\nmax-life 99999999999;\n}\n}\n}\n"));
+}
+
+TEST_F(Root, OfASystemWithDhclientHasItsLeasesOfDhcp6) {
+    const std::vector<IPAddress> assigned{*IPAddress::fromText("2001:db8::7")};
+    EXPECT_FALSE(findLease6("wlan0", assigned, kSixThirtyPm, root_));
+    write("/var/lib/dhclient/dhclient6-wlan0.leases", kLeases6);
+    EXPECT_TRUE(findLease6("wlan0", assigned, kSixThirtyPm, root_));
+    EXPECT_FALSE(findLease6("wlan0", assigned, kSixThirtyPm + 3600, root_));
+    std::filesystem::remove_all(root_ + "/var/lib/dhclient");
+    write("/var/lib/dhcp/dhclient6.leases", kLeases6);
+    EXPECT_TRUE(findLease6("wlan0", assigned, kSixThirtyPm, root_));
+}
+
 TEST(ResolverFile, NamesItsServers) {
     EXPECT_EQ(textsOf(serversFromResolverFile(
                   "# x\nnameserver 192.168.1.1\nsearch a\n\tnameserver\t2001:db8::1%wlan0\n"
