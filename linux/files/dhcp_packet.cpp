@@ -9,7 +9,7 @@ namespace wp {
 namespace {
 
 using Buffer = std::vector<std::uint8_t>;
-/// The value of each option, its parts one after another.
+/// The value of each option that is read here, its parts one after another.
 using Options = std::map<unsigned, Buffer>;
 
 constexpr std::size_t kLongestUri = 2048;
@@ -21,6 +21,8 @@ constexpr std::uint32_t kMagic = 0x63825363;
 constexpr unsigned kPad = 0, kNameServers = 6, kVendorOptions = 43, kLeaseTime = 51, kOverload = 52;
 constexpr unsigned kMessageType = 53, kVendorClass = 60, kPortal = 114, kWithdrawnPortal = 160, kEnd = 255;
 constexpr std::uint8_t kAcknowledgement = 5;
+constexpr unsigned kRead[] = {kNameServers, kVendorOptions, kLeaseTime, kOverload,
+                              kMessageType, kVendorClass,   kPortal,    kWithdrawnPortal};
 
 void readOptions(Bytes rest, Options& options) {
     while (!rest.empty() && rest[0] != kEnd) {
@@ -30,8 +32,10 @@ void readOptions(Bytes rest, Options& options) {
         }
         if (rest.size() < 2 || rest[1] > rest.size() - 2) return;
         const Bytes value = rest.subspan(2, rest[1]);
-        Buffer& whole = options[rest[0]];
-        whole.insert(whole.end(), value.begin(), value.end());
+        if (std::ranges::find(kRead, rest[0]) != std::end(kRead)) {
+            Buffer& whole = options[rest[0]];
+            whole.insert(whole.end(), value.begin(), value.end());
+        }
         rest = rest.subspan(2 + value.size());
     }
 }
@@ -112,7 +116,8 @@ std::optional<GrantedLease> readDhcp6Message(Bytes message) {
     forEachOption6(message.subspan(kHead6), [&](unsigned number, Bytes value) {
         if (number == kAddressGroup) addGroup(value, granted);
         // Unlike those of DHCPv4 they come whole; the first counts.
-        options.try_emplace(number, value.begin(), value.end());
+        if (number == kNameServers6 || number == kPortal6)
+            options.try_emplace(number, value.begin(), value.end());
     });
     if (granted.addresses.empty()) return std::nullopt;
     granted.lease.servers = addressesIn(options, kNameServers6, kAddressSize);
