@@ -37,6 +37,10 @@ int lineOf(const std::vector<ListLine>& lines, ui::IndexPath path) {
     return static_cast<int>(std::find_if(lines.begin(), lines.end(), isLine) - lines.begin());
 }
 
+const ListLine& lineAt(const std::vector<ListLine>& lines, int index) {
+    return lines[static_cast<std::size_t>(index)];
+}
+
 /// Draws the lines that fall into the window.
 class ListPainter {
   public:
@@ -114,10 +118,10 @@ int firstLineToShow(const std::vector<ListLine>& lines, std::optional<ui::IndexP
     int first = before;
     int at = focused ? lineOf(lines, *focused) : count;
     if (at < count) {
-        bool isUnderTitle = at > 0 && lines[static_cast<std::size_t>(at - 1)].kind == ListLine::Kind::header;
+        bool isUnderTitle = at > 0 && lineAt(lines, at - 1).kind == ListLine::Kind::header;
         int last = at;
         auto isOfRow = [&](const ListLine& line) { return line.path == *focused && line.part > 0; };
-        while (last + 1 < count && isOfRow(lines[static_cast<std::size_t>(last + 1)])) ++last;
+        while (last + 1 < count && isOfRow(lineAt(lines, last + 1))) ++last;
         first = std::max(first, last - height + 1);
         first = std::min(first, isUnderTitle && height > 1 ? at - 1 : at);
     }
@@ -134,7 +138,7 @@ void drawList(Canvas& canvas, Area area, const ui::SettingsTableView& table,
     ListPainter painter(canvas, inner, table, focused);
     int count = static_cast<int>(lines.size());
     for (int row = 0; row < inner.rows && firstLine + row < count; ++row)
-        painter.drawLine(inner.row + row, lines[static_cast<std::size_t>(firstLine + row)]);
+        painter.drawLine(inner.row + row, lineAt(lines, firstLine + row));
     drawScrollMark(canvas, area, firstLine, inner.rows, count);
 }
 

@@ -195,7 +195,7 @@ class TerminalScreen::Loop : private ui::ScreenObserver {
         int timeout = -1;
         if (until) {
             auto left = std::chrono::ceil<std::chrono::milliseconds>(*until - Clock::now()).count();
-            timeout = static_cast<int>(std::clamp<long>(left, 0, 60 * 60 * 1000));
+            timeout = static_cast<int>(std::clamp<long>(left, 0, 60L * 60 * 1000));
         }
         pollfd descriptors[] = {{wake_->descriptor(), POLLIN, 0}, {session_->descriptor(), POLLIN, 0}};
         int ready = poll(descriptors, isLost_ ? 1 : 2, timeout);

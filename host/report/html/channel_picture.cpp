@@ -249,11 +249,9 @@ class Drawing {
 
     std::optional<Box> freeBox(double middle, double half, double shapeTop) const {
         const double centre = std::clamp(middle, kLeft + half, std::max(kLeft + half, kRight - half));
-        for (double top = shapeTop - kLine; top >= 0; top -= 4) {
-            const Box box{centre - half, centre + half, top};
+        for (Box box{centre - half, centre + half, shapeTop - kLine}; box.top >= 0; box.top -= 4)
             if (std::none_of(taken_.begin(), taken_.end(), [&](const Box& each) { return box.meets(each); }))
                 return box;
-        }
         return std::nullopt;
     }
 
