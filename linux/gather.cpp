@@ -77,6 +77,14 @@ Wait waitAtHome(milliseconds wanted, const HomeChannel::Stay& stay, const Until&
     }
 }
 
+Known<std::vector<RadioInterface>> stationInterfaces(RadioSocket& radio, const Until& until) {
+    Known<std::vector<RadioInterface>> interfaces = radio.interfaces(until);
+    if (!interfaces) return interfaces;
+    std::erase_if(*interfaces, [](const RadioInterface& each) { return !each.isStation(); });
+    putInUseFirst(*interfaces, isUp);
+    return interfaces;
+}
+
 Error notJoined(const Link& link) {
     const std::string reason = link.up ? " is not joined to a network" : " is down";
     return failure(link.up ? Reason::notJoined : Reason::noInterface, link.interfaceName + reason);
@@ -87,11 +95,7 @@ Error notJoined(const Link& link) {
 Known<std::vector<RadioInterface>> gatherStationInterfaces(const Until& until) {
     Known<RadioSocket> radio = RadioSocket::open(until);
     if (!radio) return radio.error();
-    Known<std::vector<RadioInterface>> interfaces = radio->interfaces(until);
-    if (!interfaces) return interfaces;
-    std::erase_if(*interfaces, [](const RadioInterface& each) { return !each.isStation(); });
-    putInUseFirst(*interfaces, isUp);
-    return interfaces;
+    return stationInterfaces(*radio, until);
 }
 
 void putInUseFirst(std::vector<RadioInterface>& interfaces,
@@ -103,14 +107,14 @@ void putInUseFirst(std::vector<RadioInterface>& interfaces,
 }
 
 Known<Link> gatherLink(const std::optional<std::string>& wantedInterface, const Until& until) {
-    const Known<std::vector<RadioInterface>> stations = gatherStationInterfaces(until);
+    Known<RadioSocket> radio = RadioSocket::open(until);
+    if (!radio) return radio.error();
+    const Known<std::vector<RadioInterface>> stations = stationInterfaces(*radio, until);
     if (!stations) return stations.error();
     const Known<RadioInterface> chosen = chooseInterface(*stations, wantedInterface);
     if (!chosen) return chosen.error();
     Link link{chosen->name, chosen->index, chosen->radio, isUp(chosen->name), std::nullopt};
     if (!link.up) return link;
-    Known<RadioSocket> radio = RadioSocket::open(until);
-    if (!radio) return radio.error();
     Known<std::vector<AccessPoint>> known = radio->accessPoints(link.interfaceIndex, until);
     if (!known) return known.error();
     link.joined = joinedAmong(std::move(*known));

@@ -58,10 +58,11 @@ void NetlinkSocket::Close::operator()(mnl_socket* socket) const {
     mnl_socket_close(socket);
 }
 
-NetlinkSocket::NetlinkSocket(mnl_socket* socket) : socket_(socket), buffer_(kReceiveSize) {}
+NetlinkSocket::NetlinkSocket(mnl_socket* socket)
+    : socket_(socket), buffer_(std::make_unique_for_overwrite<std::uint8_t[]>(kReceiveSize)) {}
 
 Known<NetlinkSocket> NetlinkSocket::open(int protocol) {
-    mnl_socket* const raw = mnl_socket_open2(protocol, SOCK_CLOEXEC);
+    mnl_socket* const raw = mnl_socket_open2(protocol, SOCK_CLOEXEC | SOCK_NONBLOCK);
     if (raw == nullptr)
         return failure(Reason::unavailable, std::string("no netlink: ") + std::strerror(errno));
     NetlinkSocket socket(raw);
@@ -75,12 +76,21 @@ bool NetlinkSocket::join(std::uint32_t group) {
     return mnl_socket_setsockopt(socket_.get(), NETLINK_ADD_MEMBERSHIP, &group, sizeof group) == 0;
 }
 
-NetlinkAnswer NetlinkSocket::receive(const Until& until) {
-    const Wait wait = waitReadable(mnl_socket_get_fd(socket_.get()), until);
-    if (wait != Wait::ready) return {errorOf(wait), {}};
-    const ssize_t size = mnl_socket_recvfrom(socket_.get(), buffer_.data(), buffer_.size());
+NetlinkAnswer NetlinkSocket::receiveWaiting() {
+    const ssize_t size = mnl_socket_recvfrom(socket_.get(), buffer_.get(), kReceiveSize);
     if (size < 0) return {errno, {}};
-    return {0, {buffer_.begin(), buffer_.begin() + size}};
+    return {0, {buffer_.get(), buffer_.get() + size}};
+}
+
+/// The kernel answers most questions while it is asked: what has come is taken before anything is waited for.
+NetlinkAnswer NetlinkSocket::receive(const Until& until) {
+    for (;;) {
+        if (until.stop->raised()) return {ECANCELED, {}};
+        NetlinkAnswer come = receiveWaiting();
+        if (come.error != EAGAIN && come.error != EINTR) return come;
+        const Wait wait = waitReadable(mnl_socket_get_fd(socket_.get()), until);
+        if (wait != Wait::ready) return {errorOf(wait), {}};
+    }
 }
 
 NetlinkAnswer NetlinkSocket::gather(std::uint32_t sequence, const Until& until) {

@@ -64,6 +64,8 @@ class NetlinkSocket {
     bool join(std::uint32_t group);
     /// The next messages that came, whatever they are; `error` as above.
     NetlinkAnswer receive(const Until& until);
+    /// The same of what has come already; `EAGAIN` where nothing has.
+    NetlinkAnswer receiveWaiting();
 
   private:
     struct Close {
@@ -74,7 +76,7 @@ class NetlinkSocket {
     NetlinkAnswer gather(std::uint32_t sequence, const Until& until);
 
     std::unique_ptr<mnl_socket, Close> socket_;
-    std::vector<std::uint8_t> buffer_;
+    std::unique_ptr<std::uint8_t[]> buffer_;  ///< not cleared: most answers touch little of it
     std::uint32_t sequence_ = 0;
 };
 

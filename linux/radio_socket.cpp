@@ -92,20 +92,18 @@ void putOrder(NetlinkRequest& request, const ScanOrder& order) {
     putFlags(request, order);
 }
 
-RadioSocket::RadioSocket(NetlinkSocket questions, NetlinkSocket events, RadioFamily family)
-    : questions_(std::move(questions)), events_(std::move(events)), family_(std::move(family)) {}
+RadioSocket::RadioSocket(NetlinkSocket questions, RadioFamily family)
+    : questions_(std::move(questions)), family_(std::move(family)) {}
 
 Known<RadioSocket> RadioSocket::open(const Until& until) {
     Known<NetlinkSocket> questions = NetlinkSocket::open(NETLINK_GENERIC);
     if (!questions) return questions.error();
-    Known<NetlinkSocket> events = NetlinkSocket::open(NETLINK_GENERIC);
-    if (!events) return events.error();
     const NetlinkAnswer answer = askForFamily(*questions, until);
     if (answer.error == ECANCELED || answer.error == ETIME)
         return failureOf(answer.error, "Wi-Fi of the kernel");
     std::optional<RadioFamily> family = readFamily(answer.messages);
     if (!family) return failure(Reason::unavailable, "the kernel knows no Wi-Fi (nl80211)");
-    return RadioSocket(std::move(*questions), std::move(*events), std::move(*family));
+    return RadioSocket(std::move(*questions), std::move(*family));
 }
 
 NetlinkAnswer RadioSocket::ask(std::uint8_t command, std::uint16_t flags, std::uint32_t interfaceIndex,
@@ -187,9 +185,8 @@ int RadioSocket::startScan(std::uint32_t interfaceIndex, const ScanOrder& order,
 }
 
 void RadioSocket::receiveWaitingEvents() {
-    const Until now{std::make_shared<StopSignal>(), Clock::now()};
-    for (;;) {
-        const NetlinkAnswer answer = events_.receive(now);
+    while (events_) {
+        const NetlinkAnswer answer = events_->receiveWaiting();
         if (answer.error != 0 && answer.error != ENOBUFS) return;
         std::ranges::move(readScanEvents(answer.messages), std::back_inserter(arrived_));
     }
@@ -211,7 +208,10 @@ void RadioSocket::abortScan(std::uint32_t interfaceIndex) {
 
 bool RadioSocket::listenForScans() {
     const auto group = family_.groups.find(NL80211_MULTICAST_GROUP_SCAN);
-    return group != family_.groups.end() && events_.join(group->second);
+    Known<NetlinkSocket> events = NetlinkSocket::open(NETLINK_GENERIC);
+    if (!events || group == family_.groups.end() || !events->join(group->second)) return false;
+    events_ = std::move(*events);
+    return true;
 }
 
 Known<ScanEvent> RadioSocket::nextScanStart(std::uint32_t interfaceIndex, const Until& until) {
@@ -230,7 +230,7 @@ Known<ScanEvent> RadioSocket::nextScanEvent(std::uint32_t interfaceIndex, bool s
             const bool isStart = event.kind == ScanEvent::Kind::started;
             if (event.interfaceIndex == interfaceIndex && isStart == start) return event;
         }
-        const NetlinkAnswer answer = events_.receive(until);
+        const NetlinkAnswer answer = events_->receive(until);
         // Too many messages at once: some are lost, and the end of a scan may be among them.
         if (answer.error == ENOBUFS) continue;
         if (answer.error != 0) return failureOf(answer.error, "scan");

@@ -42,13 +42,13 @@ class RadioSocket {
 
     /// Also receives what becomes of scans, from now on.
     bool listenForScans();
-    /// The start of a scan of this interface; what came before it is forgotten.
+    /// The start of a scan of this interface, once `listenForScans` has succeeded; what came before it is forgotten.
     Known<ScanEvent> nextScanStart(std::uint32_t interfaceIndex, const Until& until);
     /// The end of a scan of this interface.
     Known<ScanEvent> nextScanEnd(std::uint32_t interfaceIndex, const Until& until);
 
   private:
-    RadioSocket(NetlinkSocket questions, NetlinkSocket events, RadioFamily family);
+    RadioSocket(NetlinkSocket questions, RadioFamily family);
 
     NetlinkAnswer ask(std::uint8_t command, std::uint16_t flags, std::uint32_t interfaceIndex,
                       const Until& until);
@@ -58,7 +58,7 @@ class RadioSocket {
     NetlinkAnswer askAboutRadio(std::uint8_t command, std::uint32_t radio, const Until& until);
 
     NetlinkSocket questions_;
-    NetlinkSocket events_;
+    std::optional<NetlinkSocket> events_;  ///< only where somebody listens
     RadioFamily family_;
     std::deque<ScanEvent> arrived_;
 };

@@ -21,14 +21,10 @@ int millisecondsUntil(Clock::time_point deadline) {
 StopSignal::StopSignal() : event_(eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK)) {}
 
 void StopSignal::raise() {
+    raised_ = true;
     const std::uint64_t one = 1;
     // A counter that cannot grow any more is raised already.
     [[maybe_unused]] const ssize_t written = write(event_.number(), &one, sizeof one);
-}
-
-bool StopSignal::raised() const {
-    pollfd entry{event_.number(), POLLIN, 0};
-    return poll(&entry, 1, 0) > 0;
 }
 
 Wait waitReadable(int descriptor, const Until& until) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <atomic>
 #include <chrono>
 #include <memory>
 
@@ -15,10 +16,11 @@ class StopSignal {
   public:
     StopSignal();
     void raise();
-    bool raised() const;
+    bool raised() const { return raised_; }
     int descriptor() const { return event_.number(); }
 
   private:
+    std::atomic<bool> raised_ = false;  ///< asked without a call
     Descriptor event_;
 };
 
