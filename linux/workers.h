@@ -1,14 +1,18 @@
 #pragma once
 
+#include <condition_variable>
+#include <deque>
 #include <functional>
 #include <list>
+#include <mutex>
 #include <thread>
 
 #include "linux/inbox.h"
 
 namespace wp {
 
-/// Threads that each do one piece of work and hand what comes of it to the owner's thread.
+/// Threads that each do one piece of work at a time and hand what comes of it to the owner's thread. A piece never
+/// waits for another: where no thread is idle a further one begins. A few are kept for what comes next.
 class Workers {
   public:
     /// What is left to do with the outcome, on the owner's thread.
@@ -18,14 +22,24 @@ class Workers {
     /// Waits for all threads; whoever stops must have told them. What they hand over then is dropped.
     ~Workers();
 
-    /// Runs `work` on a thread of its own and then what it returns on the owner's. The owner's thread.
+    /// Runs `work` on a thread that has nothing else to do and then what it returns on the owner's. The owner's thread.
     void start(std::function<Publication()> work);
     /// What work has to say before it is done, for the owner's thread. *Any* thread.
     void post(Publication publication) { inbox_.post(std::move(publication)); }
 
   private:
+    using Place = std::list<std::thread>::iterator;
+
+    void work(Place place);
+    bool isNeeded(std::unique_lock<std::mutex>& lock);
+
     Inbox& inbox_;
-    std::list<std::thread> threads_;
+    std::mutex mutex_;
+    std::condition_variable changed_;
+    std::deque<std::function<Publication()>> waiting_;
+    std::size_t idle_ = 0;  ///< threads that wait for a piece
+    bool isClosed_ = false;
+    std::list<std::thread> threads_;  ///< the owner's thread
 };
 
 }  // namespace wp
