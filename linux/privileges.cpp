@@ -27,7 +27,7 @@ void dropPrivileges() {
     const bool mayScan = permits(Capabilities(cap_get_proc()), scan);
     // Bounding and ambient sets first: shrinking them is a privilege of its own.
     for (cap_value_t each = 0; each <= cap_max_bits(); ++each) cap_drop_bound(each);
-    cap_reset_ambient();
+    prctl(PR_CAP_AMBIENT, PR_CAP_AMBIENT_CLEAR_ALL, 0, 0, 0);
     const Capabilities kept(cap_init());
     if (mayScan && kept) {
         cap_set_flag(kept.get(), CAP_PERMITTED, 1, &scan, CAP_SET);
