@@ -31,7 +31,7 @@ std::string drawn(const ChannelPicture& picture) {
 
 std::string plotted(std::vector<std::optional<double>> times, std::vector<std::string> labels = {}) {
     Markup markup;
-    drawPings({"pings", "Title", "Description", std::move(times), std::move(labels)}, markup);
+    drawPings({{"pings", "Title", "Description"}, std::move(times), std::move(labels)}, markup);
     return markup.written();
 }
 
