@@ -12,7 +12,7 @@
 namespace wp {
 
 /// Threads that each do one piece of work at a time and hand what comes of it to the owner's thread. A piece never
-/// waits for another: where no thread is idle a further one begins. A few are kept for what comes next.
+/// waits for another: where no thread is idle a further one begins. One is kept for what comes next.
 class Workers {
   public:
     /// What is left to do with the outcome, on the owner's thread.
