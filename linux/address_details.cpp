@@ -62,11 +62,11 @@ std::vector<AddressDetails> readAddressDetails(Bytes buffer, std::uint32_t inter
     return all;
 }
 
-std::vector<AssignedAddress> assignedByIwd(const std::vector<AddressDetails>& details, bool advertised) {
+std::vector<AssignedAddress> assignedOf(const std::vector<AddressDetails>& details, bool byIwd) {
     std::vector<AssignedAddress> assigned;
     for (const AddressDetails& each : details) {
         assigned.push_back(each.assigned);
-        if (advertised && !each.assigned.address.isIPv4() && !each.bringsRoute)
+        if (byIwd && !each.assigned.address.isIPv4() && !each.bringsRoute)
             assigned.back().byAdvertisement = true;
     }
     return assigned;

@@ -186,7 +186,7 @@ Known<LinkSetup> setupFromKernel(Known<Bus>& bus, const Link& link, const Until&
     if (!details) return details.error();
     const auto ways = gatherWaysOut(link.interfaceIndex, until);
     const bool isIwds = iwdManages(bus, link, until);
-    const auto assigned = assignedByIwd(*details, isIwds && ways && ways->advertised);
+    const auto assigned = assignedOf(*details, isIwds && ways && ways->advertised);
     const ClientLeases leases = readClientLeases(link, assigned);
     const DhcpClients clients = dhcpClientsOf(link.interfaceName);
     const bool client = leases.ipv4 || clients.any;

@@ -178,7 +178,7 @@ TEST(AddressDetails, OfIwdWereEnteredUnlessARouteIsAdvertised) {
     ASSERT_EQ(details.size(), 2U);
     EXPECT_FALSE(details[0].bringsRoute);
 
-    const auto advertised = assignedByIwd(details, true), entered = assignedByIwd(details, false);
+    const auto advertised = assignedOf(details, true), entered = assignedOf(details, false);
 
     EXPECT_TRUE(advertised[0].byAdvertisement);
     EXPECT_FALSE(advertised[1].byAdvertisement) << "set beside iwd, with a route of its own";
