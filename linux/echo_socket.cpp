@@ -21,6 +21,8 @@ using std::chrono::milliseconds;
 constexpr milliseconds kApart{200};
 constexpr milliseconds kWait{1000};
 constexpr milliseconds kSilence{300};
+// Five visits and what goes between them are over by then.
+constexpr milliseconds kPatience{1500};
 
 struct SocketAddress {
     sockaddr_storage storage{};
@@ -87,9 +89,10 @@ class EchoRow {
   private:
     /// Takes what is answered between the requests too. False when stopped.
     bool sendAll(const Until& until) {
+        // Somebody else's scan may last longer than it is worth waiting for.
+        const Until patience = until.within(kPatience);
         for (std::size_t i = 0; i < kEchoRequests; ++i) {
-            // Somebody else's scan may last longer than it is worth waiting for.
-            if (stay_.begin(until.within(kWait)) == Wait::stopped) return false;
+            if (stay_.begin(patience) == Wait::stopped) return false;
             sent_[i] = Clock::now();
             const std::vector<std::uint8_t> request =
                 echoRequest(target_.family, {identifier_, static_cast<std::uint16_t>(firstSequence_ + i)});

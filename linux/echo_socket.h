@@ -18,8 +18,9 @@ class EchoSocket {
 
     /// Sends 5 requests at least 200 ms apart out of the interface and waits up to 1 s for each answer, all at once.
     /// Every peer waits about that long, and a home network answers within a few milliseconds. The radio may leave the
-    /// channel between an answer and the next request, which waits for its return. Where nothing at all has come 300 ms after the last request, more than a
-    /// second after the first, the row seems to be lost: it ends its stay and waits on.
+    /// channel between an answer and the next request, which waits for its return, but no longer than 1.5 s from the
+    /// first one on. Where nothing at all has come 300 ms after the last request, more than a second after the first,
+    /// the row seems to be lost: it ends its stay and waits on.
     Known<Echo> ask(const Gateway& target, const std::string& interfaceName, std::uint32_t interfaceIndex,
                     HomeChannel::Stay& stay, const Until& until);
 

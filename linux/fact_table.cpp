@@ -195,7 +195,8 @@ constexpr Fact kSetup[] = {Fact::link, Fact::setup};
 constexpr Fact kTranslation[] = {Fact::link, Fact::setup, Fact::router};
 constexpr Fact kNearby[] = {Fact::nearby};
 // While a scan visits other channels echo requests would be lost and delayed, and other channels counted.
-constexpr HomeUse kAny = HomeUse::none, kHome = HomeUse::needed, kAway = HomeUse::left;
+constexpr HomeUse kAny = HomeUse::none, kHome = HomeUse::needed, kFirst = HomeUse::neededAtFirst,
+                  kAway = HomeUse::left;
 
 // clang-format off
 constexpr FactRow kRows[] = {
@@ -218,9 +219,9 @@ constexpr FactRow kRows[] = {
     {Fact::driverSharesAirtime,  "driverSharesAirtime",  kLink,         {},       kAny,   1s,            driverSharesAirtime,  "how Bluetooth shares airtime"},
     {Fact::peerLinks,            "peerLinks",            kLink,         {},       kAny,   3s,            peerLinks,            "the peer-to-peer links"},
     {Fact::allowedChannels,      "allowedChannels",      kLink,         {},       kAny,   3s,            allowedChannels,      "the channels to choose from"},
-    {Fact::nameAnswer,           "nameAnswer",           kSetup,        {},       kAny,   4s,            nameAnswer,           "whether names resolve"},
-    {Fact::portal,               "portal",               kSetup,        {},       kAny,   5s,            portal,               "whether there is a portal"},
-    {Fact::vendorService,        "vendorService",        kSetup,        {},       kAny,   kServiceTime,  vendorService,        "whether the vendor is reached"},
+    {Fact::nameAnswer,           "nameAnswer",           kSetup,        {},       kFirst, 4s,            nameAnswer,           "whether names resolve"},
+    {Fact::portal,               "portal",               kSetup,        {},       kFirst, 5s,            portal,               "whether there is a portal"},
+    {Fact::vendorService,        "vendorService",        kSetup,        {},       kFirst, kServiceTime,  vendorService,        "whether the vendor is reached"},
     {Fact::router,               "router",               kLink,         {},       kAny,   4s,            router,               "who made the router"},
     {Fact::translation,          "translation",          kTranslation,  {},       kAny,   3s,            translation,          "how often addresses are translated"},
 };

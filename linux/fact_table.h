@@ -25,7 +25,8 @@ struct Gathering {
 enum class HomeUse {
     none,  ///< it does not matter
     needed,  ///< from when the fact is wanted until it is there, or its gathering says that it is not needed any more
-    left,  ///< the radio visits other channels
+    neededAtFirst,  ///< the same, but for a second at most: what takes longer is not told by a tenth of a second
+    left,           ///< the radio visits other channels
 };
 
 /// How one fact is had.

@@ -7,6 +7,7 @@
 #include <sys/socket.h>
 
 #include <algorithm>
+#include <cmath>
 
 #include "linux/netlink_socket.h"
 #include "linux/route_messages.h"
@@ -85,6 +86,15 @@ Known<std::vector<RadioInterface>> stationInterfaces(RadioSocket& radio, const U
     return interfaces;
 }
 
+enum class Counting { betweenVisits, undisturbed };
+
+/// Whether the radio has counted for about as long as it was at home. Some drivers begin anew with each scan, and some have
+/// one row of counters for all channels.
+bool isOfHomeAlone(const Airtime& counted, Clock::duration atHome) {
+    const double expected = std::chrono::duration<double, std::milli>(atHome).count();
+    return !counted.empty() && std::abs(static_cast<double>(counted[0].time) - expected) <= expected / 2;
+}
+
 Error notJoined(const Link& link) {
     const std::string reason = link.up ? " is not joined to a network" : " is down";
     return failure(link.up ? Reason::notJoined : Reason::noInterface, link.interfaceName + reason);
@@ -144,21 +154,29 @@ Known<Survey> gatherSurvey(const Link& link, const Until& until) {
 }
 
 Known<Airtime> gatherAirtime(const Link& link, HomeChannel::Stay& stay, const Until& until) {
+    if (!link.joined) return Airtime();
     Known<RadioSocket> radio = RadioSocket::open(until);
     if (!radio) return radio.error();
-    const Known<Airtime> before = radio->airtime(link.interfaceIndex, until);
-    if (!before) return before.error();
-    stay.pause();
-    const Wait wait = waitAtHome(kCountedTime, stay, until.within(kLongestCount));
-    if (wait == Wait::stopped) return waitFailure(wait, "airtime");
-    const Known<Airtime> after = radio->airtime(link.interfaceIndex, until);
-    if (!after) return after.error();
-    Airtime counted = airtimeBetween(*before, *after);
-    // On the others there was a brief visit at most. Some radios do not tell which one is in use.
-    std::erase_if(counted, [&](const ChannelTime& each) {
-        return !each.inUse && !(link.joined && each.frequency == link.joined->frequency);
-    });
-    return counted;
+    const auto counters = [&]() -> Known<Airtime> {
+        // Only at home: some drivers have counters for the present channel alone.
+        if (stay.begin(until) == Wait::stopped) return waitFailure(Wait::stopped, "airtime");
+        Known<Airtime> all = radio->airtime(link.interfaceIndex, until);
+        if (all) std::erase_if(*all, [&](auto& each) { return each.frequency != link.joined->frequency; });
+        return all;
+    };
+    for (const Counting how : {Counting::betweenVisits, Counting::undisturbed}) {
+        const Known<Airtime> before = counters();
+        if (!before || before->empty()) return before;
+        const Clock::duration begin = stay.timeAtHome();
+        if (how == Counting::betweenVisits) stay.pause();
+        const Wait wait = waitAtHome(kCountedTime, stay, until.within(kLongestCount));
+        if (wait == Wait::stopped) return waitFailure(wait, "airtime");
+        const Known<Airtime> after = counters();
+        if (!after) return after;
+        Airtime counted = airtimeBetween(*before, *after);
+        if (how == Counting::undisturbed || isOfHomeAlone(counted, stay.timeAtHome() - begin)) return counted;
+    }
+    return Airtime();
 }
 
 Known<AllowedChannels> gatherAllowedChannels(const Link& link, const Until& until) {

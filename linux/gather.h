@@ -28,7 +28,8 @@ Known<Echo> gatherGatewayEcho(const Link& link, EchoSocket& socket, HomeChannel:
 /// Whether the kernel has lately heard from this address on the link, as from a router that ignores echo requests.
 bool answersAsNeighbour(const Link& link, const std::string& address, const Until& until);
 
-/// What the radio counted on the channel in use within one second. Visits to other channels in between only make it longer.
+/// What the radio counted within one second on the channel of the joined network; nothing where none is joined or nothing
+/// is counted. Visits to other channels in between only make it longer.
 Known<Airtime> gatherAirtime(const Link& link, HomeChannel::Stay& stay, const Until& until);
 /// The channels that the radio and the regulatory domain allow.
 Known<AllowedChannels> gatherAllowedChannels(const Link& link, const Until& until);

@@ -3,6 +3,7 @@
 #include <sys/eventfd.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <cstdint>
 #include <utility>
 
@@ -18,20 +19,29 @@ HomeChannel::HomeChannel() : changed_(eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK)) {}
 
 Wait HomeChannel::leave(Visit visit, const Until& until) {
     const Clock::time_point begin = Clock::now();
-    for (;;) {
+    for (Clock::time_point time;;) {
         {
             const std::lock_guard lock(mutex_);
             std::uint64_t changes = 0;
             [[maybe_unused]] const ssize_t size = read(changed_.number(), &changes, sizeof changes);
-            if (mayLeave(visit)) {
+            const Clock::time_point now = Clock::now();
+            time = leaveTime(visit);
+            if (time <= now) {
                 isAway_ = true;
-                leftAt_ = Clock::now();
-                timeWaited_ += leftAt_ - begin;
+                leftAt_ = now;
+                timeWaited_ += now - begin;
                 return Wait::ready;
             }
         }
-        if (const Wait wait = waitReadable(changed_.number(), until); wait != Wait::ready) return wait;
+        const Wait wait = waitReadable(changed_.number(), {until.stop, std::min(time, until.deadline)});
+        if (wait == Wait::stopped || (wait == Wait::timeout && Clock::now() >= until.deadline)) return wait;
     }
+}
+
+void HomeChannel::leftByOthers() {
+    const std::lock_guard lock(mutex_);
+    isAway_ = true;
+    leftAt_ = Clock::now();
 }
 
 void HomeChannel::returned() {
@@ -46,6 +56,13 @@ Clock::duration HomeChannel::timeWaited() const {
     return timeWaited_;
 }
 
+Clock::time_point HomeChannel::leaveTime(Visit visit) const {
+    Clock::time_point time = Clock::time_point::min();
+    for (const Stay* each : stays_)
+        if (visit == Visit::lengthy || each->isNeeding_) time = std::max(time, each->end_);
+    return time;
+}
+
 bool HomeChannel::isSettled() const {
     const std::lock_guard lock(mutex_);
     return !isAway_ && Clock::now() >= returnedAt_ + kAtHome;
@@ -56,16 +73,16 @@ void HomeChannel::tellVisitor() {
     [[maybe_unused]] const ssize_t written = write(changed_.number(), &one, sizeof one);
 }
 
-HomeChannel::Stay::Stay(HomeChannel& channel) : channel_(channel) {
+HomeChannel::Stay::Stay(HomeChannel& channel, Clock::duration atMost)
+    : channel_(channel), end_(Clock::now() + atMost) {
     const std::lock_guard lock(channel_.mutex_);
-    ++channel_.stays_;
-    ++channel_.needing_;
+    channel_.stays_.push_back(this);
 }
 
 Wait HomeChannel::Stay::begin(const Until& until) {
     {
         const std::lock_guard lock(channel_.mutex_);
-        if (!hasEnded_ && !std::exchange(isNeeding_, true)) ++channel_.needing_;
+        isNeeding_ = true;
     }
     while (!channel_.isSettled()) {
         if (waitReadable(-1, until.within(kBetweenLooks)) == Wait::stopped) return Wait::stopped;
@@ -76,17 +93,12 @@ Wait HomeChannel::Stay::begin(const Until& until) {
 
 void HomeChannel::Stay::pause() {
     const std::lock_guard lock(channel_.mutex_);
-    if (!std::exchange(isNeeding_, false)) return;
-    --channel_.needing_;
-    channel_.tellVisitor();
+    if (std::exchange(isNeeding_, false)) channel_.tellVisitor();
 }
 
 void HomeChannel::Stay::end() {
-    pause();
     const std::lock_guard lock(channel_.mutex_);
-    if (std::exchange(hasEnded_, true)) return;
-    --channel_.stays_;
-    channel_.tellVisitor();
+    if (std::erase(channel_.stays_, this) > 0) channel_.tellVisitor();
 }
 
 Clock::duration HomeChannel::Stay::timeAtHome() const {

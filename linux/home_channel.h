@@ -2,6 +2,7 @@
 
 #include <chrono>
 #include <mutex>
+#include <vector>
 
 #include "linux/stop_signal.h"
 
@@ -16,11 +17,11 @@ inline constexpr std::chrono::milliseconds kAtHome{30};
 /// visits other channels, so that neither falls into the other. *Any* thread; one visitor at a time.
 class HomeChannel {
   public:
-    /// Somebody who needs the channel, from the beginning on and for as long as this lives. One thread at a time; the
-    /// channel outlives it.
+    /// Somebody who needs the channel, from the beginning on and for as long as this lives, but no longer than `atMost`.
+    /// One thread at a time; the channel outlives it.
     class Stay {
       public:
-        explicit Stay(HomeChannel& channel);
+        explicit Stay(HomeChannel& channel, Clock::duration atMost = std::chrono::minutes(1));
         ~Stay() { end(); }
         Stay(const Stay&) = delete;
         Stay& operator=(const Stay&) = delete;
@@ -35,8 +36,10 @@ class HomeChannel {
         Clock::duration timeAtHome() const;
 
       private:
+        friend HomeChannel;
         HomeChannel& channel_;
-        bool isNeeding_ = true, hasEnded_ = false;
+        Clock::time_point end_;
+        bool isNeeding_ = true;
     };
 
     HomeChannel();
@@ -46,18 +49,20 @@ class HomeChannel {
     /// Waits until nobody needs the channel during such a visit. Then the radio counts as away until it has `returned`.
     Wait leave(Visit visit, const Until& until);
     void returned();
+    /// Somebody else has taken the radio away already, who asks nobody: it counts as away until it has `returned`.
+    void leftByOthers();
     /// How long visits have waited for leave since the channel is looked after.
     Clock::duration timeWaited() const;
 
   private:
-    bool mayLeave(Visit visit) const { return visit == Visit::brief ? needing_ == 0 : stays_ == 0; }
+    /// When a visit may begin, as far as is known now.
+    Clock::time_point leaveTime(Visit visit) const;
     bool isSettled() const;
     void tellVisitor();
 
     mutable std::mutex mutex_;
-    Descriptor changed_;  ///< readable where somebody needs less than when the visitor looked
-    int stays_ = 0;       ///< that have not ended
-    int needing_ = 0;     ///< of them, those that do not pause
+    Descriptor changed_;              ///< readable where somebody needs less than when the visitor looked
+    std::vector<const Stay*> stays_;  ///< that have not ended before their time
     Clock::time_point startedAt_ = Clock::now();
     Clock::duration timeAway_{0}, timeWaited_{0};
     bool isAway_ = false;

@@ -51,6 +51,8 @@ void Phase::want(Fact fact) {
     state(*meant) = State::wanted;
     if (rowOf(*meant).home == HomeUse::needed)
         stay(*meant) = std::make_shared<HomeChannel::Stay>(sources_.home);
+    else if (rowOf(*meant).home == HomeUse::neededAtFirst)
+        stay(*meant) = std::make_shared<HomeChannel::Stay>(sources_.home, std::chrono::seconds(1));
     for (const Fact need : rowOf(*meant).needs) want(need);
 }
 

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cerrno>
+#include <utility>
 
 #include "linux/manager_scan.h"
 #include "linux/scan_row.h"
@@ -26,24 +27,28 @@ bool hearsOthers(const std::vector<AccessPoint>& found) {
     return std::ranges::any_of(found, [](const AccessPoint& each) { return !each.joined; });
 }
 
-/// Keeps the radio away from its home channel for as long as it lives, beginning when nobody minds.
+/// Has the radio away from its home channel for as long as it lives, beginning when nobody minds.
 class Away {
   public:
-    Away(HomeChannel& home, std::optional<HomeChannel::Visit> visit, const Until& until)
-        : home_(home), leaves_(visit), wait_(visit ? home.leave(*visit, until) : Wait::ready) {}
+    explicit Away(HomeChannel& home) : home_(home) {}
     ~Away() {
-        if (leaves_ && !failed()) home_.returned();
+        if (isAway_) home_.returned();
     }
     Away(const Away&) = delete;
     Away& operator=(const Away&) = delete;
 
-    bool failed() const { return wait_ != Wait::ready; }
-    Error error() const { return waitFailure(wait_, "scan"); }
+    Wait leave(HomeChannel::Visit visit, const Until& until) {
+        const Wait wait = home_.leave(visit, until);
+        isAway_ = wait == Wait::ready;
+        return wait;
+    }
+    void takenByOthers() {
+        if (!std::exchange(isAway_, true)) home_.leftByOthers();
+    }
 
   private:
     HomeChannel& home_;
-    bool leaves_;
-    Wait wait_;
+    bool isAway_ = false;
 };
 
 /// One row of scans for one wish.
@@ -82,8 +87,9 @@ class ScanRun {
 
     /// What a scan found that whatever manages the interface was asked for, and who that was.
     Known<ScanReport> runByManager(bool listening, AskedManager& manager) {
-        const Away away(home_, HomeChannel::Visit::lengthy, until_);
-        if (away.failed()) return away.error();
+        Away away(home_);
+        const Wait wait = away.leave(HomeChannel::Visit::lengthy, until_);
+        if (wait != Wait::ready) return waitFailure(wait, "scan");
         Known<Bus> bus = Bus::system();
         const auto asked = askManagerForScan(bus, {wish_.interfaceName, wish_.named, listening}, until_);
         if (!asked) return asked.error();
@@ -179,12 +185,15 @@ class ScanRun {
     /// Makes the row's next request as soon as nobody minds, and waits until the scan, or the one that is in its way, has
     /// ended.
     std::optional<Error> visit(ScanRow& row) {
-        const Away away(home_, row.visit(), until_);
-        if (away.failed()) return away.error();
+        Away away(home_);
+        if (const Wait wait = leave(row, away); wait != Wait::ready) return waitFailure(wait, "scan");
         const int error = radio_.startScan(wish_.interfaceIndex, row.next(), until_);
         if (error == EINVAL && row.skip()) return std::nullopt;
         if (error != 0 && error != EBUSY) return startFailure(error);
-        if (error == EBUSY && slicing_.wanted) keepHeard();
+        if (error == EBUSY) {
+            away.takenByOthers();
+            keepHeard();
+        }
         const Known<ScanEvent> event = radio_.nextScanEnd(wish_.interfaceIndex, until_);
         if (event) {
             row.ended(error == 0 ? ScanRow::Whose::own : ScanRow::Whose::others, *event);
@@ -192,6 +201,16 @@ class ScanRun {
         }
         if (error == 0) radio_.abortScan(wish_.interfaceIndex);
         return event.error();
+    }
+
+    Wait leave(const ScanRow& row, Away& away) {
+        const std::optional<HomeChannel::Visit> visit = row.visit();
+        if (!visit) return Wait::ready;
+        const Wait atOnce = away.leave(*visit, until_.within(milliseconds(0)));
+        if (atOnce != Wait::timeout) return atOnce;
+        // There is time for a whole scan of somebody else.
+        keepHeard();
+        return away.leave(*visit, until_);
     }
 
     static Error startFailure(int error) {
@@ -221,6 +240,7 @@ class ScanRun {
 
     /// Whoever scans between two requests may have the kernel forget what was heard before.
     void keepHeard() {
+        if (!slicing_.wanted) return;
         Known<std::vector<AccessPoint>> heard = results();
         if (!heard) return;
         heard_ = std::move(*heard);

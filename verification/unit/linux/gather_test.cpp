@@ -150,6 +150,15 @@ TEST(EchoSocket, KeepsTheChannelToItsEndWhereItIsAnswered) {
     EXPECT_EQ(Wait::timeout, home.leave(HomeChannel::Visit::lengthy, patience(std::chrono::milliseconds(0))));
 }
 
+TEST(EchoSocket, WaitsForARadioThatStaysAwayOnlySoLong) {
+    HomeChannel home;
+    home.leftByOthers();
+    HomeChannel::Stay stay(home);
+    const Known<Echo> echo = echoFrom(kAnswering, stay);
+    ASSERT_TRUE(echo) << echo.error().text();
+    EXPECT_TRUE(std::ranges::all_of(echo->roundTrips, isAnswered));
+}
+
 /// A busy machine may miss all pauses of a row, but not of every row.
 TEST(EchoSocket, LetsVisitsHappenBetweenAnAnswerAndTheNextRequest) {
     HomeChannel home;

@@ -2,7 +2,9 @@
 
 #include <gtest/gtest.h>
 
+#include <atomic>
 #include <future>
+#include <thread>
 
 #include "verification/unit/linux/stop.h"
 
@@ -71,17 +73,41 @@ TEST(HomeChannel, IsNotNeededAfterTheEndWhateverFollows) {
     EXPECT_EQ(Wait::ready, home.leave(lengthy, patience()));
 }
 
-TEST(HomeChannel, IsLeftByAWaitingVisitorAsSoonAsItMay) {
+TEST(HomeChannel, IsLeftInSpiteOfAStayWhoseTimeIsOver) {
+    HomeChannel home;
+    HomeChannel::Stay stay(home, milliseconds(20));
+    EXPECT_EQ(Wait::ready, home.leave(lengthy, patience()));
+    home.returned();
+    EXPECT_EQ(Wait::ready, stay.begin(patience()));
+    EXPECT_EQ(Wait::ready, home.leave(brief, patience()));
+}
+
+TEST(HomeChannel, IsAwayWhereOthersTakeTheRadioWithoutAsking) {
     HomeChannel home;
     HomeChannel::Stay stay(home);
-    auto visitor = std::async(std::launch::async, [&] {
-        const Wait wait = home.leave(brief, patience());
-        home.returned();
-        return wait == Wait::ready ? home.leave(lengthy, patience()) : wait;
-    });
-    stay.pause();
-    stay.end();
-    EXPECT_EQ(Wait::ready, visitor.get());
+    home.leftByOthers();
+    EXPECT_EQ(Wait::timeout, stay.begin(patience(milliseconds(20))));
+    home.returned();
+    EXPECT_EQ(Wait::ready, stay.begin(patience()));
+}
+
+TEST(HomeChannel, IsLeftByAWaitingVisitorAsSoonAsItMay) {
+    for (const HomeChannel::Visit visit : {brief, lengthy}) {
+        HomeChannel home;
+        HomeChannel::Stay stay(home);
+        std::atomic isRefused = false;
+        auto visitor = std::async(std::launch::async, [&] {
+            isRefused = home.leave(visit, atOnce()) == Wait::timeout;
+            return isRefused ? home.leave(visit, patience()) : Wait::timeout;
+        });
+        while (!isRefused) std::this_thread::yield();
+        std::this_thread::sleep_for(milliseconds(5));  // most likely it waits again by now
+        if (visit == brief)
+            stay.pause();
+        else
+            stay.end();
+        EXPECT_EQ(Wait::ready, visitor.get());
+    }
 }
 
 TEST(HomeChannel, IsAwaitedWhileTheRadioIsAway) {
@@ -89,10 +115,10 @@ TEST(HomeChannel, IsAwaitedWhileTheRadioIsAway) {
     ASSERT_EQ(Wait::ready, home.leave(brief, patience()));
     HomeChannel::Stay stay(home);
     EXPECT_EQ(Wait::timeout, stay.begin(patience(milliseconds(20))));
+    const Clock::time_point beforeReturn = Clock::now();
     home.returned();
-    const Clock::time_point returned = Clock::now();
     EXPECT_EQ(Wait::ready, stay.begin(patience()));
-    EXPECT_GE(Clock::now() - returned, kAtHome - milliseconds(1));
+    EXPECT_GE(Clock::now() - beforeReturn, kAtHome);
 }
 
 TEST(HomeChannel, IsAwaitedByNobodyWhoIsStopped) {
@@ -116,8 +142,9 @@ TEST(HomeChannel, CountsNoTimeAway) {
     EXPECT_EQ(before, stay.timeAtHome());
     const Clock::duration atLeastAway = Clock::now() - away;
     home.returned();
-    EXPECT_LE(stay.timeAtHome(), Clock::now() - away + before - atLeastAway);
-    EXPECT_GE(stay.timeAtHome(), before);
+    const Clock::duration after = stay.timeAtHome();
+    EXPECT_LE(after, before + (Clock::now() - away) - atLeastAway);
+    EXPECT_GE(after, before);
 }
 
 }  // namespace
