@@ -14,7 +14,8 @@ extern char** environ;
 
 namespace wp {
 
-/// A program that a test starts and that ends with it, even where the test is killed.
+/// A program that a test starts and that ends with it, even where the test is killed: with the thread that makes this, to be
+/// exact, which therefore has to live as long.
 class ChildProcess {
   public:
     /// Starts the program and waits for its first line.
