@@ -194,7 +194,8 @@ constexpr Fact kLink[] = {Fact::link};
 constexpr Fact kSetup[] = {Fact::link, Fact::setup};
 constexpr Fact kTranslation[] = {Fact::link, Fact::setup, Fact::router};
 constexpr Fact kNearby[] = {Fact::nearby};
-// While a scan visits other channels echo requests would be lost and delayed, and other channels counted.
+// While a scan visits other channels echo requests would be lost and delayed, answers that are timed would be late, and
+// other channels counted.
 constexpr HomeUse kAny = HomeUse::none, kHome = HomeUse::needed, kFirst = HomeUse::neededAtFirst,
                   kAway = HomeUse::left;
 

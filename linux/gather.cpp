@@ -173,8 +173,11 @@ Known<Airtime> gatherAirtime(const Link& link, HomeChannel::Stay& stay, const Un
         if (wait == Wait::stopped) return waitFailure(wait, "airtime");
         const Known<Airtime> after = counters();
         if (!after) return after;
+        const Clock::duration atHome = stay.timeAtHome() - begin;
+        // Somebody else's scans have left too little.
+        if (atHome < kCountedTime / 2) break;
         Airtime counted = airtimeBetween(*before, *after);
-        if (how == Counting::undisturbed || isOfHomeAlone(counted, stay.timeAtHome() - begin)) return counted;
+        if (how == Counting::undisturbed || isOfHomeAlone(counted, atHome)) return counted;
     }
     return Airtime();
 }

@@ -91,6 +91,11 @@ Wait HomeChannel::Stay::begin(const Until& until) {
     return Wait::ready;
 }
 
+void HomeChannel::Stay::prolong(Clock::duration atLeast) {
+    const std::lock_guard lock(channel_.mutex_);
+    end_ = std::max(end_, Clock::now() + atLeast);
+}
+
 void HomeChannel::Stay::pause() {
     const std::lock_guard lock(channel_.mutex_);
     if (std::exchange(isNeeding_, false)) channel_.tellVisitor();

@@ -28,6 +28,8 @@ class HomeChannel {
 
         /// Needs the channel from now on. Where the radio is away this waits until it is back and has settled.
         Wait begin(const Until& until);
+        /// Lasts for so long from now on at least.
+        void prolong(Clock::duration atLeast);
         /// Until the next `begin` brief visits are welcome, others are not.
         void pause();
         /// Needs the channel no more, nor again. Calling it again changes nothing.

@@ -8,6 +8,11 @@ namespace wp {
 
 namespace {
 
+// What the network answers within a second is timed, and nothing better is known of a network that takes longer. Where it
+// is asked late because the device's own set-up was slow to tell, what answers at all answers in half a second.
+constexpr std::chrono::milliseconds kAtFirst{1000};
+constexpr std::chrono::milliseconds kExchange{500};
+
 bool isAboutLink(Fact fact) {
     switch (fact) {
         case Fact::station:
@@ -52,7 +57,7 @@ void Phase::want(Fact fact) {
     if (rowOf(*meant).home == HomeUse::needed)
         stay(*meant) = std::make_shared<HomeChannel::Stay>(sources_.home);
     else if (rowOf(*meant).home == HomeUse::neededAtFirst)
-        stay(*meant) = std::make_shared<HomeChannel::Stay>(sources_.home, std::chrono::seconds(1));
+        stay(*meant) = std::make_shared<HomeChannel::Stay>(sources_.home, kAtFirst);
     for (const Fact need : rowOf(*meant).needs) want(need);
 }
 
@@ -105,6 +110,10 @@ void Phase::launch(const FactRow& row) {
         const Clock::time_point begin = Clock::now();
         const Clock::duration waited = self->sources_.home.timeWaited();
         const Until until{self->stop_, begin + row.most};
+        if (row.home == HomeUse::neededAtFirst) {
+            stay->prolong(kExchange);
+            stay->begin(until.within(kExchange));
+        }
         Store store = row.gather(
             {self->facts_, self->topic_, self->startedAt_, self->sources_, until, row.loss, stay.get()});
         stay.reset();

@@ -34,8 +34,8 @@ struct PhaseTopic {
 
 struct FactRow;
 
-/// The facts of a row of requests with the same configuration. Each fact is gathered once, on a thread of its own
-/// as soon as what it builds on is there; requests wait for their facts. Owner's thread; workers read only facts
+/// The facts of a row of requests with the same configuration. Each fact is gathered once, on a worker's thread as
+/// soon as what it builds on is there; requests wait for their facts. Owner's thread; workers read only facts
 /// that are complete.
 class Phase : public std::enable_shared_from_this<Phase> {
   public:

@@ -1,5 +1,7 @@
 #include "linux/workers.h"
 
+#include <system_error>
+
 namespace wp {
 namespace {
 
@@ -24,16 +26,21 @@ void Workers::start(std::function<Publication()> work) {
         if (waiting_.size() <= idle_) return changed_.notify_one();
     }
     const Place place = threads_.emplace(threads_.end());
-    *place = std::thread([this, place] { this->work(place); });
+    try {
+        *place = std::thread([this, place] { this->work(place); });
+    } catch (const std::system_error&) {
+        threads_.erase(place);
+        if (threads_.empty()) throw;
+    }
 }
 
 /// Waits for a piece of work; false where enough threads do, or none will come.
 bool Workers::isNeeded(std::unique_lock<std::mutex>& lock) {
-    if (waiting_.empty() && idle_ == kMostIdle) return false;
+    if (isClosed_ || (waiting_.empty() && idle_ == kMostIdle)) return false;
     ++idle_;
     changed_.wait(lock, [this] { return isClosed_ || !waiting_.empty(); });
     --idle_;
-    return !waiting_.empty();
+    return !isClosed_;
 }
 
 void Workers::work(Place place) {

@@ -22,10 +22,9 @@ class Workers {
     /// Waits for all threads; whoever stops must have told them. What they hand over then is dropped.
     ~Workers();
 
-    /// Runs `work` on a thread that has nothing else to do and then what it returns on the owner's. The owner's thread.
+    /// Runs `work` on a thread that has nothing else to do and then what it returns on the owner's. Where the system gives
+    /// no further thread the work waits for one of those that are there; without any this throws. The owner's thread.
     void start(std::function<Publication()> work);
-    /// What work has to say before it is done, for the owner's thread. *Any* thread.
-    void post(Publication publication) { inbox_.post(std::move(publication)); }
 
   private:
     using Place = std::list<std::thread>::iterator;

@@ -82,6 +82,13 @@ TEST(HomeChannel, IsLeftInSpiteOfAStayWhoseTimeIsOver) {
     EXPECT_EQ(Wait::ready, home.leave(brief, patience()));
 }
 
+TEST(HomeChannel, IsKeptByAStayThatIsProlonged) {
+    HomeChannel home;
+    HomeChannel::Stay stay(home, milliseconds(0));
+    stay.prolong(std::chrono::hours(1));
+    EXPECT_EQ(Wait::timeout, home.leave(brief, atOnce()));
+}
+
 TEST(HomeChannel, IsAwayWhereOthersTakeTheRadioWithoutAsking) {
     HomeChannel home;
     HomeChannel::Stay stay(home);

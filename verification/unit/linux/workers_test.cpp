@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 #include <poll.h>
 
+#include <chrono>
 #include <latch>
 #include <thread>
 
@@ -38,12 +39,16 @@ TEST(WorkersTest, WhatIsStillWorkedOnWhenTheyGoIsWaitedForAndDropped) {
     Inbox inbox;
     bool isDone = false;
     bool isPublished = false;
+    std::latch begun(1);
     {
         Workers workers(inbox);
         workers.start([&]() -> Workers::Publication {
+            begun.count_down();
+            std::this_thread::sleep_for(std::chrono::milliseconds(10));
             isDone = true;
             return [&] { isPublished = true; };
         });
+        begun.wait();
     }
     EXPECT_TRUE(isDone);
     EXPECT_FALSE(isPublished);
