@@ -35,8 +35,8 @@ def processes() -> dict[int, Process]:
     return found
 
 
-def kernel_started_by(starter: int) -> int | None:
-    """The lab's kernel among the descendants of a process."""
+def kernel_started_by(starter: int) -> Process | None:
+    """The lab's kernel among the descendants of a process. It may have ended since."""
     all_of_them = processes()
 
     def descends(process: Process) -> bool:
@@ -47,7 +47,7 @@ def kernel_started_by(starter: int) -> int | None:
     for each in all_of_them.values():
         parent = all_of_them.get(each.parent)
         if each.name == "linux" and parent and parent.name != "linux" and descends(each):
-            return each.number
+            return each
     return None
 
 
@@ -62,7 +62,7 @@ class UserTime:
         if len(self.seen) < len(self.marks) and self.marks[len(self.seen)].exists():
             kernel = kernel_started_by(starter)
             if kernel is not None:
-                self.seen.append(Process(Path("/proc", str(kernel))).ended_children_user_s)
+                self.seen.append(kernel.ended_children_user_s)
 
     def watch(self, running) -> None:
         """Until the starter of the lab (a Popen) has ended; what an earlier one showed is forgotten."""
@@ -72,5 +72,5 @@ class UserTime:
             time.sleep(BETWEEN_LOOKS_S)
 
     def between(self) -> list[float]:
-        """Seconds of user time from each mark to the next."""
+        """Seconds of user time from each mark to the next; fewer where the lab ended before a mark was seen."""
         return [later - earlier for earlier, later in zip(self.seen, self.seen[1:])]
