@@ -9,17 +9,21 @@ import pathlib
 import re
 import sys
 
-UNIT = pathlib.Path(__file__).resolve().parents[1] / "unit"
-PROGRAM = re.compile(r"^wp_unit_test\((\w+)(.*?)^\)", re.MULTILINE | re.DOTALL)
-SOURCE = re.compile(r"\w+\.cpp")
-# What begins at a line's start and has a type before its name; a test has none.
-HELPER = re.compile(r"^(?!class |struct |using |namespace )[A-Za-z_][^\n(=]*[ &*](\w+)\(", re.MULTILINE)
+VERIFICATION = pathlib.Path(__file__).resolve().parents[1]
+PROGRAM = re.compile(r"^(wp_unit_test|add_executable)\((\w+)(.*?)\)$", re.MULTILINE | re.DOTALL)
+TOGETHER = "set_target_properties({} PROPERTIES UNITY_BUILD ON"
+SOURCE = re.compile(r"[\w./]+\.cpp")
+# What begins at a line's start and has a type before its name, such as std::function<void()>; a test has none.
+HELPER = re.compile(r"^(?!class |struct |using |namespace )[A-Za-z_](?:[^\n(=<]|<[^\n=]*?>)*[ &*](\w+)\(", re.MULTILINE)
 
 
 def main():
     programs, faults = 0, []
-    for listing in sorted(UNIT.glob("*/CMakeLists.txt")):
-        for program, body in PROGRAM.findall(listing.read_text(encoding="utf-8")):
+    for listing in sorted([*VERIFICATION.glob("*/CMakeLists.txt"), *VERIFICATION.glob("unit/*/CMakeLists.txt")]):
+        text = listing.read_text(encoding="utf-8")
+        for kind, program, body in PROGRAM.findall(text):
+            if kind == "add_executable" and TOGETHER.format(program) not in text:
+                continue
             programs += 1
             sources = collections.defaultdict(set)
             for source in SOURCE.findall(body):
