@@ -156,6 +156,14 @@ TEST_F(MessageBus, AnInterfaceThatNetworkManagerLeavesAloneIsNotItsOwn) {
     EXPECT_EQ(link.error().code, codeOf(Reason::notFound));
 }
 
+TEST_F(MessageBus, ThePortalIsTheOneOfTheLeaseOfIPv4OrElseOfIPv6) {
+    const auto both = gatherSetup({"wlan0", 9990, 0, true, {}}, patience());
+    const auto alone = gatherSetup({"wlan11", 9999, 0, true, {}}, patience());
+    ASSERT_TRUE(both && alone);
+    EXPECT_EQ(both->portalApi, "https://p.example/api");
+    EXPECT_EQ(alone->portalApi, "https://p.example/six");
+}
+
 TEST_F(MessageBus, WithoutAnActiveConnectionNothingIsSetUpByHand) {
     const auto setup = gatherSetup({"wlan6", 9996, 0, true, {}}, patience());
     ASSERT_TRUE(setup) << setup.error().text();

@@ -34,11 +34,11 @@ def network_manager():
                    "if args[0] == 'wlan7': raise dbus.exceptions.DBusException("
                    "'silent', name='org.freedesktop.DBus.Error.NoReply')\n"
                    "ret = dbus.ObjectPath('%s/Devices/' + {'wlan0': '1', 'wlan1': '2', 'wlan4': '4', 'wlan5': '5',"
-                   " 'wlan6': '6', 'wlan8': '8'}[args[0]])" % base)
+                   " 'wlan6': '6', 'wlan8': '8', 'wlan11': '9'}[args[0]])" % base)
     device = nm + ".Device"
     main.AddObject(base + "/Devices/1", device, {
         "Managed": True, "ActiveConnection": dbus.ObjectPath(base + "/ActiveConnection/1"),
-        "Dhcp4Config": dbus.ObjectPath(base + "/DHCP4Config/1"), "Dhcp6Config": dbus.ObjectPath("/"),
+        "Dhcp4Config": dbus.ObjectPath(base + "/DHCP4Config/1"), "Dhcp6Config": dbus.ObjectPath(base + "/DHCP6Config/1"),
         "Ip4Config": dbus.ObjectPath(base + "/IP4Config/1"), "Ip6Config": dbus.ObjectPath(base + "/IP6Config/1"),
     }, [])
     dbusmock.get_object(base + "/Devices/1").AddMethod(
@@ -58,11 +58,16 @@ def network_manager():
     dbusmock.get_object(base + "/Devices/8").AddMethod(
         device + ".Wireless", "RequestScan", "a{sv}", "", "raise dbus.exceptions.DBusException("
         "'Scanning not allowed while already scanning', name='org.freedesktop.NetworkManager.Device.NotAllowed')")
+    main.AddObject(base + "/Devices/9", device, {
+        "Managed": True, "ActiveConnection": dbus.ObjectPath(base + "/ActiveConnection/1"),
+        "Dhcp4Config": dbus.ObjectPath("/"), "Dhcp6Config": dbus.ObjectPath(base + "/DHCP6Config/1")}, [])
     main.AddObject(base + "/ActiveConnection/1", nm + ".Connection.Active",
                    {"Connection": dbus.ObjectPath(base + "/Settings/1")}, [])
     main.AddObject(base + "/DHCP4Config/1", nm + ".DHCP4Config", {"Options": dbus.Dictionary({
-        "domain_name_servers": "192.168.1.1 192.168.1.2", "captive_portal": "https://p.example/api",
+        "domain_name_servers": "192.168.1.1 192.168.1.2", "default_url": "https://p.example/api",
         "vendor_encapsulated_options": "EXAMPLE_METERED"}, signature="sv")}, [])
+    main.AddObject(base + "/DHCP6Config/1", nm + ".DHCP6Config", {"Options": dbus.Dictionary({
+        "dhcp6_v6_captive_portal": "https://p.example/six"}, signature="sv")}, [])
     main.AddObject(base + "/IP4Config/1", nm + ".IP4Config", {"NameserverData": dbus.Array([
         dbus.Dictionary({"address": "192.168.1.1"}, signature="sv")], signature="a{sv}")}, [])
     main.AddObject(base + "/IP6Config/1", nm + ".IP6Config", {"Nameservers": dbus.Array([
