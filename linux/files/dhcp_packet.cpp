@@ -12,7 +12,7 @@ using Buffer = std::vector<std::uint8_t>;
 /// The value of each option that is read here, its parts one after another.
 using Options = std::map<unsigned, Buffer>;
 
-constexpr std::size_t kLongestUri = 2048;
+constexpr std::size_t kLongestVendorText = 2048;
 
 // Of DHCPv4: where the fields of the packet lie, and the options' numbers.
 constexpr std::size_t kOwnAddress = 16, kServerName = 44, kServerNameSize = 64, kFile = 108, kFileSize = 128;
@@ -40,11 +40,15 @@ void readOptions(Bytes rest, Options& options) {
     }
 }
 
-std::string textIn(const Options& options, unsigned number) {
+std::string_view textIn(const Options& options, unsigned number) {
     const auto found = options.find(number);
     if (found == options.end()) return {};
-    return plainText({reinterpret_cast<const char*>(found->second.data()), found->second.size()},
-                     kLongestUri);
+    return {reinterpret_cast<const char*>(found->second.data()), found->second.size()};
+}
+
+std::string vendorTextIn(const Options& options) {
+    return plainText(textIn(options, kVendorOptions), kLongestVendorText) +
+           plainText(textIn(options, kVendorClass), kLongestVendorText);
 }
 
 std::vector<IPAddress> addressesIn(const Options& options, unsigned number, std::size_t size) {
@@ -103,9 +107,10 @@ std::optional<GrantedLease> readDhcpPacket(Bytes packet) {
     granted.addresses = {*IPAddress::fromBytes(packet.subspan(kOwnAddress, 4))};
     granted.seconds = bigEndian32(time, 0);
     granted.lease.servers = addressesIn(options, kNameServers, 4);
-    granted.lease.vendorText = textIn(options, kVendorOptions) + textIn(options, kVendorClass);
-    granted.lease.portalApi = textIn(options, kPortal);
-    if (granted.lease.portalApi.empty()) granted.lease.portalApi = textIn(options, kWithdrawnPortal);
+    granted.lease.vendorText = vendorTextIn(options);
+    granted.lease.portalApi = portalUriFrom(textIn(options, kPortal));
+    if (granted.lease.portalApi.empty())
+        granted.lease.portalApi = portalUriFrom(textIn(options, kWithdrawnPortal));
     return granted;
 }
 
@@ -121,7 +126,7 @@ std::optional<GrantedLease> readDhcp6Message(Bytes message) {
     });
     if (granted.addresses.empty()) return std::nullopt;
     granted.lease.servers = addressesIn(options, kNameServers6, kAddressSize);
-    granted.lease.portalApi = textIn(options, kPortal6);
+    granted.lease.portalApi = portalUriFrom(textIn(options, kPortal6));
     return granted;
 }
 

@@ -10,9 +10,15 @@
 namespace wp {
 namespace {
 
-std::string unquoted(std::string_view text) {
-    if (text.size() >= 2 && text.front() == '"' && text.back() == '"') text = text.substr(1, text.size() - 2);
-    return plainText(text, 512);
+constexpr std::size_t kLongestUri = 2048, kLongestText = 512;
+
+std::string_view withoutQuotes(std::string_view text) {
+    const bool isQuoted = text.size() >= 2 && text.front() == '"' && text.back() == '"';
+    return isQuoted ? text.substr(1, text.size() - 2) : text;
+}
+
+std::string textFrom(std::string_view value) {
+    return plainText(withoutQuotes(value), kLongestText);
 }
 
 /// "4 2026/11/20 18:30:00" in UTC; "never" and "epoch N" are the other forms.
@@ -75,14 +81,14 @@ Statement statementIn(std::string_view line) {
 
 void readStatement(std::string_view line, Block& block, std::int64_t now) {
     const auto [name, value] = statementIn(line);
-    if (name == "interface") block.interfaceName = unquoted(value);
+    if (name == "interface") block.interfaceName = textFrom(value);
     if (name == "expire") block.passed = hasPassed(value, now);
     if (name == "domain-name-servers") addServers(value, block.lease.servers);
     if (name == "vendor-encapsulated-options" || name == "vendor-class-identifier")
-        block.lease.vendorText += unquoted(value);
+        block.lease.vendorText += textFrom(value);
     if (name == "default-url" || name == "unknown-114" ||
         (name == "v4-captive-portal" && block.lease.portalApi.empty()))
-        block.lease.portalApi = unquoted(value);
+        block.lease.portalApi = portalUriFrom(withoutQuotes(value));
 }
 
 /// An address that a lease of DHCPv6 grants; or a prefix, which is passed over.
@@ -123,10 +129,10 @@ void readStatement6(std::string_view line, Block6& block) {
         if (name == "max-life") block.grants.back().seconds = numberIn(value);
     }
     if (block.depth > 1) return;
-    if (name == "interface") block.interfaceName = unquoted(value);
+    if (name == "interface") block.interfaceName = textFrom(value);
     if (name == "dhcp6.name-servers") addServers(value, block.lease.servers);
     if (name == "dhcp6.v6-captive-portal" || name == "dhcp6.unknown-103")
-        block.lease.portalApi = unquoted(value);
+        block.lease.portalApi = portalUriFrom(withoutQuotes(value));
 }
 
 bool isInForce(const Grant& grant, const std::vector<IPAddress>& assigned, std::int64_t now) {
@@ -147,6 +153,10 @@ std::optional<Lease> firstOf(const std::string& root, std::initializer_list<std:
 }
 
 }  // namespace
+
+std::string portalUriFrom(std::string_view text) {
+    return text.size() > kLongestUri ? std::string() : plainText(text, kLongestUri);
+}
 
 std::optional<Lease> readDhclientLeases(std::string_view text, std::string_view interfaceName,
                                         std::int64_t now) {

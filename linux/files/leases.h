@@ -17,6 +17,10 @@ struct Lease {
     std::string portalApi;
 };
 
+/// The address of a portal's API as a network names it, as plain text. One of more than 2048 bytes counts as none: cut
+/// off it would lead elsewhere. *Any* thread.
+std::string portalUriFrom(std::string_view text);
+
 /// The last lease for the interface in the form that dhclient keeps; nothing where there is none, or its
 /// end has passed. \param now seconds since 1970-01-01 UTC. *Any* thread.
 std::optional<Lease> readDhclientLeases(std::string_view text, std::string_view interfaceName,

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "linux/files/leases.h"
 #include "service/plain_text.h"
 
 namespace wp {
@@ -60,7 +61,7 @@ void addLease(const std::map<std::string, std::string>& lease, NetworkdLink& lin
     };
     link.hasLease = !value("ADDRESS").empty();
     addServers(value("DNS"), link.offeredServers);
-    link.portalApi = value("CAPTIVE_PORTAL");
+    link.portalApi = portalUriFrom(value("CAPTIVE_PORTAL"));
     link.vendorText = plainText(value("VENDOR_SPECIFIC"));
 }
 
@@ -100,7 +101,7 @@ std::optional<NetworkdLink> readNetworkdLink(unsigned interfaceIndex, const std:
         addLease(readAssignments(*lease), link);
     // From its version 254 on: of DHCPv4, DHCPv6 or a router's advertisement.
     if (const auto portal = state.find("CAPTIVE_PORTAL"); portal != state.end())
-        link.portalApi = plainText(portal->second, 2048);
+        link.portalApi = portalUriFrom(portal->second);
     return link;
 }
 

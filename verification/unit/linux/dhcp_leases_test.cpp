@@ -83,6 +83,14 @@ TEST(DhcpPacket, HasOptionsInPartsAndInTheFieldsForFileAndServer) {
         "https://old.example/");
 }
 
+TEST(DhcpPacket, NamesAPortalWholeOrNotAtAll) {
+    const Frame part = option(114, bytesOf(std::string(128, 'a')));
+    Frame parts;
+    for (int i = 0; i < 16; ++i) parts = parts + part;
+    EXPECT_EQ(readDhcpPacket(packet(kGranted + parts))->lease.portalApi, std::string(2048, 'a'));
+    EXPECT_EQ(readDhcpPacket(packet(kGranted + parts + option(114, bytesOf("a"))))->lease.portalApi, "");
+}
+
 TEST(DhcpPacket, ThatGrantsNothingIsNoLease) {
     EXPECT_FALSE(readDhcpPacket({}));
     EXPECT_FALSE(readDhcpPacket(packet({})));

@@ -131,6 +131,25 @@ TEST(Leases6, NameServersAndPortalOfTheAddressThatTheInterfaceHas) {
     EXPECT_EQ(textsOf(lease6("eth0", "2001:db8:1::7", std::int64_t{1} << 40)->servers), "fe80::1 ");
 }
 
+std::string replaced(std::string text, const std::string& old, const std::string& with) {
+    return text.replace(text.find(old), old.size(), with);
+}
+
+TEST(Leases, APortalsAddressIsReadWholeOrNotAtAll) {
+    const std::string start = "https://p.example/", longest = start + std::string(2048 - start.size(), 'a');
+    for (const std::string& each : {longest, longest + "a"}) {
+        const std::string expected = each.size() > 2048 ? "" : each;
+        const auto lease =
+            readDhclientLeases(replaced(kLeases, "https://p.example/api", each), "wlan0", kSixThirtyPm);
+        ASSERT_TRUE(lease);
+        EXPECT_EQ(lease->portalApi, expected);
+        const auto six =
+            lease6("wlan0", "2001:db8::7", kSixThirtyPm, replaced(kLeases6, "https://p.example/six", each));
+        ASSERT_TRUE(six);
+        EXPECT_EQ(six->portalApi, expected);
+    }
+}
+
 TEST(Leases6, OneThatHasEndedOrIsOfAnotherNetworkIsNone) {
     EXPECT_FALSE(lease6("wlan0", "2001:db8::7", kSixThirtyPm + 3600));
     EXPECT_TRUE(lease6("wlan0", "2001:db8::6", kSixThirtyPm + 3600)) << "each address has its own time";
