@@ -69,7 +69,7 @@ PortalAnswer portalAnswer(const WebAnswer& answer, const WebRequest& request) {
     portal.end =
         answer.end == WebAnswer::End::answered ? PortalAnswer::End::answered : PortalAnswer::End::noAnswer;
     portal.status = answer.status;
-    portal.bodySize = answer.bodySize;
+    portal.bodySize = answer.body.size();
     portal.location = answer.location;
     portal.server = answer.server;
     if (!portal.server && !request.addresses.empty()) portal.server = request.addresses.front();
@@ -104,7 +104,7 @@ Known<PortalDeclaration> askPortalApi(const Link& link, const LinkSetup& setup, 
 bool decides(const std::optional<WebAnswer>& plain) {
     if (!plain || plain->end != WebAnswer::End::answered) return false;
     return plain->status == 204 || plain->status == 511 || (plain->status >= 300 && plain->status <= 399) ||
-           (plain->status == 200 && plain->bodySize > 1);
+           (plain->status == 200 && plain->body.size() > 1);
 }
 
 ServiceContact contactOf(const WebAnswer& answer) {
@@ -118,9 +118,7 @@ ServiceContact contactOf(const WebAnswer& answer) {
     contact.clockOffset = answer.clockOffset;
     switch (answer.end) {
         case WebAnswer::End::answered:
-            // Content that comes slowly is judged by its beginning; what breaks off has not been handed over.
-            contact.end = answer.bodyCame == WebAnswer::Body::cutOff ? ServiceContact::End::failed
-                                                                     : ServiceContact::End::reached;
+            contact.end = ServiceContact::End::reached;
             break;
         case WebAnswer::End::badCertificate:
             contact.end = ServiceContact::End::badCertificate;

@@ -14,7 +14,7 @@ struct PortalAnswer {
     enum class End { answered, noAnswer };
     End end = End::noAnswer;
     int status = 0;
-    std::uint64_t bodySize = 0;                 ///< as announced, or else as far as it came
+    std::uint64_t bodySize = 0;                 ///< as far as it came, whatever was announced
     std::string location;                       ///< of a redirect
     std::optional<IPAddress> server;            ///< who answered
     std::string why;                            ///< of no answer, or of a body that is not whole
@@ -50,13 +50,14 @@ struct PortalVerdict {
 /// through, `none` where nothing answers.
 enum class Connectivity { full, partial, portal, none };
 
-/// The network's own word comes first. Then the plain answer: 204 is open; a redirect or 511 is a portal; any
-/// other page in place of the expected emptiness is one too, for which its beginning suffices. An empty page with
-/// status 200 is open where the secure request got through, else it tells nothing; one that broke off before it began
-/// is neither page nor emptiness, and thus no answer. Without a plain answer, a secure one means partial
-/// connectivity, not a portal. Where nothing answered the test cannot tell, which is not the same as "no
-/// portal". A probe host that suddenly has a private address and does not answer is no portal but no
-/// Internet. (The union of what two television and desktop systems and a connection manager do.)
+/// The network's own word comes first. Then the plain answer: 204 is open; a redirect or 511 is a portal; any other
+/// page in place of the expected emptiness is one too, for which its beginning suffices. An empty page with status
+/// 200 is open where the secure request got through, else it tells nothing; one of which nothing came before it
+/// broke off or time was over is, however long it was said to be, neither page nor emptiness, and thus no answer.
+/// Without a plain answer, a secure one means partial connectivity, not a portal. Where nothing answered the test
+/// cannot tell, which is not the same as "no portal". A probe host that suddenly has a private address and does not
+/// answer is no portal but no Internet. (The union of what two television and desktop systems and a connection
+/// manager do.)
 Known<PortalVerdict> judgePortal(const PortalEvidence& evidence);
 
 /// What the probes say about the reach; nothing where a page that is neither empty nor a portal's tells nothing.

@@ -64,7 +64,7 @@ void addClock(Details& details, const Facts& facts, const ServiceContact& contac
 Details contactDetails(const Facts& facts, const Known<ServiceContact>& contact) {
     if (!contact) return {};
     Details details{{"end", wordOf(contact->end)}};
-    if (contact->end != ServiceContact::End::reached) addText(details, "why", contact->why);
+    addText(details, "why", contact->why);
     if (contact->server) details.emplace("server", contact->server->text());
     addKnown(details, "connectTime", rounded(contact->steps.connect));
     addKnown(details, "secureTime", rounded(contact->steps.secure));

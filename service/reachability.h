@@ -55,14 +55,14 @@ enum class CertificateFault {
 /// What became of a connection to the vendor's service.
 struct ServiceContact {
     enum class End {
-        reached,         ///< connected and, over TLS, with a certificate that holds
-        failed,          ///< no address, no connection, or one that broke before the answer's end
+        reached,  ///< connected and, over TLS, with a certificate that holds; what was asked for is answered
+        failed,   ///< no address, no connection, or one that broke before there was an answer
         badCertificate,  ///< connected, but the certificate does not hold
     };
     End end = End::failed;
-    std::string why;   ///< of a failure
+    std::string why;   ///< of a failure, or of a body that is not whole
     int status = 0;    ///< of HTTP
-    std::string body;  ///< at most 64 KiB
+    std::string body;  ///< as far as it came, at most 64 KiB
     ContactSteps steps{};
     CertificateFault fault = CertificateFault::none;
     std::optional<IPAddress> server{};
@@ -82,7 +82,8 @@ struct ClockCheck {
 /// Test 9: whether the vendor's service can be reached, up to a secure connection. A certificate that does
 /// not hold on a device whose clock is wrong says nothing about the network.
 Outcome reachesVendor(const Known<ServiceContact>& contact, const ClockCheck& clock);
-/// Test 11: whether the vendor's content arrives unaltered.
+/// Test 11: whether the vendor's content arrives unaltered. Its beginning tells, however the connection ended: many
+/// servers end one without the word that ends it.
 Outcome retrievesFromVendor(const Known<ServiceContact>& contact, const ExpectedContent& expected,
                             const ClockCheck& clock);
 

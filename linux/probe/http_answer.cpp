@@ -160,9 +160,9 @@ void HttpAnswer::chooseBody() {
         part_ = equalWithoutCase(last, "chunked") ? Part::chunkSize : Part::untilClosed;
         return;
     }
-    announced_ = lengthIn(all("Content-Length"));
-    left_ = announced_.value_or(0);
-    part_ = announced_ ? Part::counted : Part::untilClosed;
+    const auto announced = lengthIn(all("Content-Length"));
+    left_ = announced.value_or(0);
+    part_ = announced ? Part::counted : Part::untilClosed;
 }
 
 void HttpAnswer::takeChunkSize(std::string_view line) {

@@ -35,8 +35,6 @@ class HttpAnswer {
     /// The value of the first header of that name, whose case plays no part; empty where there is none.
     std::string_view header(std::string_view name) const;
     const std::string& body() const { return body_; }
-    /// How long the body is in bytes: as announced, or else as far as it came.
-    std::uint64_t bodySize() const { return announced_.value_or(body_.size()); }
 
   private:
     enum class Part { statusLine, header, chunkSize, chunk, chunkEnd, counted, untilClosed, end, broken };
@@ -57,9 +55,8 @@ class HttpAnswer {
     int interim_ = 0;
     std::size_t headSize_ = 0;
     std::uint64_t left_ = 0;  ///< of a chunk or a counted body
-    std::optional<std::uint64_t> announced_;
-    std::string line_;   ///< the beginning of one that is not whole yet
-    std::string whole_;  ///< what the last whole line lies in
+    std::string line_;        ///< the beginning of one that is not whole yet
+    std::string whole_;       ///< what the last whole line lies in
     std::vector<std::pair<std::string, std::string>> headers_;
     std::string body_;
 };

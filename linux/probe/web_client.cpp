@@ -174,7 +174,6 @@ class Exchange {
             answer_.why = missing;
         }
         answer_.body = read_.body();
-        answer_.bodySize = read_.bodySize();
         const bool redirects = answer_.status >= 300 && answer_.status <= 399;
         const std::string_view location = read_.header("Location");
         if (redirects && !location.empty()) answer_.location = targetOf(request_.url, location);

@@ -43,8 +43,7 @@ struct WebAnswer {
     std::string why;  ///< of a failure, or of a body that is not whole
     int status = 0;
     Body bodyCame = Body::whole;
-    std::string body;            ///< up to the request's bound
-    std::uint64_t bodySize = 0;  ///< as announced, or else as far as it came
+    std::string body;      ///< as far as it came, up to the request's bound
     std::string location;  ///< where a redirect leads, as a whole URL of http or https; empty for any other
     std::optional<IPAddress> server;
     ContactSteps steps;

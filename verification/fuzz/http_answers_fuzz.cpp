@@ -34,8 +34,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     const HttpAnswer whole = answerTo(bytes, size + 1), cut = answerTo(bytes, 3);
     if (!whole.ended() || whole.body().size() > kRoom) std::abort();
     if (whole.status() != cut.status() || whole.body() != cut.body()) std::abort();
-    if (whole.isWhole() != cut.isWhole() || whole.bodySize() != cut.bodySize()) std::abort();
-    if (whole.bodySize() < whole.body().size()) std::abort();
+    if (whole.isWhole() != cut.isWhole()) std::abort();
     for (const char* name : {"Location", "Date", "Content-Length"})
         if (whole.header(name) != cut.header(name)) std::abort();
     HttpAnswer broken(kRoom);

@@ -102,6 +102,7 @@ TEST(VendorService, ContentMustBeTheExpectedOne) {
     EXPECT_FALSE(found(retrievesFromVendor(contact(reached, 200, "<html>"), page, {})));
     EXPECT_FALSE(found(retrievesFromVendor(contact(reached, 200, "anything"), {}, {})));
     EXPECT_FALSE(found(retrievesFromVendor(contact(reached, 404, "<!doctype html>"), page, {})));
+    EXPECT_FALSE(found(retrievesFromVendor(contact(reached, 200, "<!doctype htm"), page, {}))) << "cut off";
     EXPECT_FALSE(found(retrievesFromVendor(contact(failed, 204), page, {})));
 }
 

@@ -124,6 +124,9 @@ TEST(Details, OfTheServiceAreItsStepsAndItsOwnClockBeforeThePortals) {
     EXPECT_EQ(jsonText(Dictionary::make(detailsOf(11, facts)), JSONStyle::compact),
               R"({"clockBeforeBuild":false,"clockOffset":2,"clockSource":"service","connectTime":12.5,)"
               R"("end":"reached","secureTime":20.0,"status":204})");
+
+    facts.vendorService->retrieve->why = "the connection was closed";
+    EXPECT_EQ(detail(11, facts, "why"), R"("the connection was closed")") << "before the content was whole";
 }
 
 TEST(Details, OfAPortalAreItsKindItsPageAndTheReach) {
@@ -257,9 +260,10 @@ TEST(Details, OfHiddenNetworksAreWhatTheirBeaconsTellAllTheSame) {
 TEST(Details, OfAScanCountTheAccessPointsOfEachBand) {
     const Facts facts = joinedTo({heard(nameElement("Northlight")), heard(nameElement("Cafe"), 5180),
                                   heard(nameElement(""), 5200), heard(nameElement("Bay"), 60480)});
-    EXPECT_EQ(detail(31, facts, "bands"),
-              R"([{"accessPoints":1,"band":"other","hidden":0},{"accessPoints":1,"band":"2.4GHz","hidden":0},)"
-              R"({"accessPoints":2,"band":"5GHz","hidden":1}])");
+    EXPECT_EQ(
+        detail(31, facts, "bands"),
+        R"([{"accessPoints":1,"band":"other","hidden":0},{"accessPoints":1,"band":"2.4GHz","hidden":0},)"
+        R"({"accessPoints":2,"band":"5GHz","hidden":1}])");
     EXPECT_EQ(detail(31, Facts(), "bands"), "");
 }
 
