@@ -22,6 +22,8 @@ constexpr int kSignalSamples = 5;
 constexpr milliseconds kBetweenSamples{250};
 // Counters have steps of about 10 ms: within a second that is one in a hundred.
 constexpr milliseconds kCountedTime{1000};
+// Counters that stand still for so long are none.
+constexpr milliseconds kFirstLook{100};
 // While a scan goes on the radio is at home for a fifth of the time. Should that be less, what it counted has to do.
 constexpr milliseconds kLongestCount{8000};
 constexpr milliseconds kBetweenCounts{20};
@@ -84,6 +86,16 @@ Known<std::vector<RadioInterface>> stationInterfaces(RadioSocket& radio, const U
     std::erase_if(*interfaces, [](const RadioInterface& each) { return !each.isStation(); });
     putInUseFirst(*interfaces, isUp);
     return interfaces;
+}
+
+/// The counters of the joined network's channel, or of none. Only read at home: some drivers have them for the present
+/// channel alone.
+Known<Airtime> homeCounters(RadioSocket& radio, const Link& link, HomeChannel::Stay& stay,
+                            const Until& until) {
+    if (stay.begin(until) == Wait::stopped) return waitFailure(Wait::stopped, "airtime");
+    Known<Airtime> all = radio.airtime(link.interfaceIndex, until);
+    if (all) std::erase_if(*all, [&](auto& each) { return each.frequency != link.joined->frequency; });
+    return all;
 }
 
 enum class Counting { betweenVisits, undisturbed };
@@ -157,13 +169,15 @@ Known<Airtime> gatherAirtime(const Link& link, HomeChannel::Stay& stay, const Un
     if (!link.joined) return Airtime();
     Known<RadioSocket> radio = RadioSocket::open(until);
     if (!radio) return radio.error();
-    const auto counters = [&]() -> Known<Airtime> {
-        // Only at home: some drivers have counters for the present channel alone.
-        if (stay.begin(until) == Wait::stopped) return waitFailure(Wait::stopped, "airtime");
-        Known<Airtime> all = radio->airtime(link.interfaceIndex, until);
-        if (all) std::erase_if(*all, [&](auto& each) { return each.frequency != link.joined->frequency; });
-        return all;
-    };
+    const auto counters = [&] { return homeCounters(*radio, link, stay, until); };
+    const Known<Airtime> first = counters();
+    if (!first || first->empty()) return first;
+    if (waitReadable(-1, until.within(kFirstLook)) == Wait::stopped)
+        return waitFailure(Wait::stopped, "airtime");
+    const Known<Airtime> second = counters();
+    if (!second) return second;
+    const Airtime running = airtimeBetween(*first, *second);
+    if (running.empty() || milliseconds(running[0].time) < kFirstLook / 2) return Airtime();
     for (const Counting how : {Counting::betweenVisits, Counting::undisturbed}) {
         const Known<Airtime> before = counters();
         if (!before || before->empty()) return before;
