@@ -100,11 +100,33 @@ Known<Airtime> homeCounters(RadioSocket& radio, const Link& link, HomeChannel::S
 
 enum class Counting { betweenVisits, undisturbed };
 
+/// What the radio counted, and for how long it was at home meanwhile.
+struct Counted {
+    Airtime airtime;
+    Clock::duration atHome{0};
+};
+
+/// Counts until the radio has been at home for as long as is wanted, or time is over.
+Known<Counted> countAtHome(RadioSocket& radio, const Link& link, HomeChannel::Stay& stay, milliseconds wanted,
+                           Counting how, const Until& until) {
+    const Known<Airtime> before = homeCounters(radio, link, stay, until);
+    if (!before) return before.error();
+    if (before->empty()) return Counted();
+    const Clock::duration begin = stay.timeAtHome();
+    if (how == Counting::betweenVisits) stay.pause();
+    const Wait wait = waitAtHome(wanted, stay, until.within(kLongestCount));
+    if (wait == Wait::stopped) return waitFailure(wait, "airtime");
+    const Known<Airtime> after = homeCounters(radio, link, stay, until);
+    if (!after) return after.error();
+    return Counted{airtimeBetween(*before, *after), stay.timeAtHome() - begin};
+}
+
 /// Whether the radio has counted for about as long as it was at home. Some drivers begin anew with each scan, and some have
 /// one row of counters for all channels.
-bool isOfHomeAlone(const Airtime& counted, Clock::duration atHome) {
-    const double expected = std::chrono::duration<double, std::milli>(atHome).count();
-    return !counted.empty() && std::abs(static_cast<double>(counted[0].time) - expected) <= expected / 2;
+bool isOfHomeAlone(const Counted& counted) {
+    const double expected = std::chrono::duration<double, std::milli>(counted.atHome).count();
+    return !counted.airtime.empty() &&
+           std::abs(static_cast<double>(counted.airtime[0].time) - expected) <= expected / 2;
 }
 
 Error notJoined(const Link& link) {
@@ -169,29 +191,18 @@ Known<Airtime> gatherAirtime(const Link& link, HomeChannel::Stay& stay, const Un
     if (!link.joined) return Airtime();
     Known<RadioSocket> radio = RadioSocket::open(until);
     if (!radio) return radio.error();
-    const auto counters = [&] { return homeCounters(*radio, link, stay, until); };
-    const Known<Airtime> first = counters();
-    if (!first || first->empty()) return first;
-    if (waitReadable(-1, until.within(kFirstLook)) == Wait::stopped)
-        return waitFailure(Wait::stopped, "airtime");
-    const Known<Airtime> second = counters();
-    if (!second) return second;
-    const Airtime running = airtimeBetween(*first, *second);
-    if (running.empty() || milliseconds(running[0].time) < kFirstLook / 2) return Airtime();
+    const auto count = [&](milliseconds wanted, Counting how) {
+        return countAtHome(*radio, link, stay, wanted, how, until);
+    };
+    const Known<Counted> first = count(kFirstLook, Counting::undisturbed);
+    if (!first) return first.error();
+    if (first->airtime.empty() || milliseconds(first->airtime[0].time) < kFirstLook / 2) return Airtime();
     for (const Counting how : {Counting::betweenVisits, Counting::undisturbed}) {
-        const Known<Airtime> before = counters();
-        if (!before || before->empty()) return before;
-        const Clock::duration begin = stay.timeAtHome();
-        if (how == Counting::betweenVisits) stay.pause();
-        const Wait wait = waitAtHome(kCountedTime, stay, until.within(kLongestCount));
-        if (wait == Wait::stopped) return waitFailure(wait, "airtime");
-        const Known<Airtime> after = counters();
-        if (!after) return after;
-        const Clock::duration atHome = stay.timeAtHome() - begin;
+        const Known<Counted> counted = count(kCountedTime, how);
+        if (!counted) return counted.error();
         // Somebody else's scans have left too little.
-        if (atHome < kCountedTime / 2) break;
-        Airtime counted = airtimeBetween(*before, *after);
-        if (how == Counting::undisturbed || isOfHomeAlone(counted, atHome)) return counted;
+        if (counted->atHome < kCountedTime / 2) break;
+        if (how == Counting::undisturbed || isOfHomeAlone(*counted)) return counted->airtime;
     }
     return Airtime();
 }
