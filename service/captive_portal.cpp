@@ -64,7 +64,10 @@ Known<PortalVerdict> judgePortal(const PortalEvidence& evidence) {
     if (evidence.declared.unrestricted) return open("the network says that it has no portal");
     if (evidence.declared.captive) {
         const std::string why = "the network's own API says so";
-        return *evidence.declared.captive ? portal(PortalKind::declared, why) : open(why);
+        if (!*evidence.declared.captive) return open(why);
+        return portal(PortalKind::declared, evidence.declared.page.empty()
+                                                ? why + "; the address of its page is too long to tell"
+                                                : why);
     }
     if (isAnswer(evidence.plain)) return judgePlain(evidence.plain, evidence.secure);
     if (opens(evidence.secure)) return open("partial: HTTPS got through, HTTP did not");

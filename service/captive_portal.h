@@ -26,7 +26,7 @@ struct PortalAnswer {
 struct PortalDeclaration {
     bool unrestricted = false;    ///< named the address that means "no portal here"
     std::optional<bool> captive;  ///< what its API answered (RFC 8908); absent: no usable answer
-    std::string page{};           ///< where its API sends the user
+    std::string page{};           ///< where its API sends the user; empty where that is too long to tell
 };
 
 /// What is known about a portal in front of the joined network.

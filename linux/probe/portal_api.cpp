@@ -1,6 +1,7 @@
 #include "linux/probe/portal_api.h"
 
 #include "exchange/json_reader.h"
+#include "linux/probe/web_place.h"
 #include "service/plain_text.h"
 
 namespace wp {
@@ -15,9 +16,12 @@ std::optional<PortalApiAnswer> portalFromApi(std::string_view json) {
     if (flag == nullptr) return std::nullopt;
     const auto page = (*entries)->value("user-portal-url");
     const std::string* text = page ? page->as<std::string>() : nullptr;
+    PortalApiAnswer answer{*flag, text != nullptr ? plainText(*text, text->size()) : std::string()};
     // Without a page the user could do nothing about it; such an answer is not believed.
-    if (*flag && (text == nullptr || text->empty())) return std::nullopt;
-    return PortalApiAnswer{*flag, text != nullptr ? plainText(*text, 2048) : std::string()};
+    if (answer.captive && answer.page.empty()) return std::nullopt;
+    // Cut it would be another address.
+    if (answer.page.size() > kLongestUrl) answer.page.clear();
+    return answer;
 }
 
 std::string portalApiIn(const std::map<std::string, std::string>& lease) {

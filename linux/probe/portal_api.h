@@ -13,7 +13,7 @@ inline constexpr std::size_t kLongestPortalAnswer = 4096;
 /// What the portal's API says (RFC 8908).
 struct PortalApiAnswer {
     bool captive = false;
-    std::string page;  ///< where the user is to go; may be empty for a device that is not captive
+    std::string page;  ///< where the user is to go; empty if it has more than `kLongestUrl` bytes, or none is needed
 };
 
 /// Nothing for what is no such answer: not JSON, without "captive", or captive without a page to go to. *Any*

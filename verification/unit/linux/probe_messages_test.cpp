@@ -6,6 +6,7 @@
 #include "linux/probe/portal_api.h"
 #include "linux/probe/ssdp.h"
 #include "linux/probe/stun_message.h"
+#include "linux/probe/web_place.h"
 #include "linux/probe/xml_text.h"
 
 namespace wp {
@@ -199,11 +200,23 @@ TEST(PortalApi, BelievesACaptiveAnswerOnlyWithAPageToGoTo) {
     EXPECT_FALSE(open->captive);
     EXPECT_FALSE(portalFromApi(R"({"captive":true})"));
     EXPECT_FALSE(portalFromApi(R"({"captive":true,"user-portal-url":""})"));
+    EXPECT_FALSE(portalFromApi(R"({"captive":true,"user-portal-url":" \u0007 "})"));
     EXPECT_FALSE(portalFromApi(R"({"captive":"true"})"));
     EXPECT_FALSE(portalFromApi(R"([true])"));
     EXPECT_FALSE(portalFromApi("<html>"));
     EXPECT_FALSE(portalFromApi(R"({"captive":false,"x":")" + std::string(kLongestPortalAnswer, 'x') + "\"}"));
     EXPECT_FALSE(portalFromApi(std::string(100, '[')));
+}
+
+TEST(PortalApi, APagesAddressIsReadWholeOrNotAtAll) {
+    const std::string start = "https://p.example/",
+                      longest = start + std::string(kLongestUrl - start.size(), 'a');
+    for (const std::string& each : {longest, longest + "a"}) {
+        const auto read = portalFromApi(R"({"captive":true,"user-portal-url":")" + each + "\"}");
+        ASSERT_TRUE(read);
+        EXPECT_TRUE(read->captive);
+        EXPECT_EQ(read->page, each.size() > kLongestUrl ? "" : each);
+    }
 }
 
 TEST(PortalApi, IsNamedByALease) {

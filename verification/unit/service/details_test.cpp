@@ -143,6 +143,13 @@ TEST(Details, OfAPortalAreItsKindItsPageAndTheReach) {
     EXPECT_EQ(detail(46, declared, "kind"), R"("declared")");
     EXPECT_EQ(detail(46, declared, "url"), R"("https://login.example/")");
 
+    Facts tooLong = declared;
+    tooLong.portal->declared.page.clear();
+    EXPECT_EQ(detail(46, tooLong, "kind"), R"("declared")");
+    EXPECT_EQ(detail(46, tooLong, "url"), "");
+    EXPECT_EQ(detail(46, tooLong, "why"),
+              R"("the network's own API says so; the address of its page is too long to tell")");
+
     EXPECT_EQ(detail(46, withPortal(answered(511), {}), "kind"), R"("status511")");
     EXPECT_EQ(detail(46, withPortal(answered(200, 300), {}), "kind"), R"("alteredPage")");
     EXPECT_EQ(detail(46, withPortal(answered(204), {}), "kind"), R"("none")");
