@@ -2,41 +2,26 @@
 
 #include <algorithm>
 #include <cstdlib>
-#include <ctime>
 
-#include "linux/address_details.h"
+#include "linux/asked_servers.h"
 #include "linux/dbus/bluez.h"
 #include "linux/dbus/iwd.h"
 #include "linux/dbus/network_manager.h"
-#include "linux/dbus/resolved.h"
 #include "linux/dbus/supplicant.h"
-#include "linux/files/dhcp_clients.h"
-#include "linux/files/dhcpcd_leases.h"
-#include "linux/files/leases.h"
 #include "linux/files/networkd.h"
 #include "linux/files/proxy_settings.h"
 #include "linux/probe/portal_api.h"
 #include "linux/radio_socket.h"
+#include "linux/unmanaged_setup.h"
 #include "service/plain_text.h"
 
 namespace wp {
 namespace {
 
-using Servers = std::vector<IPAddress>;
-
-void add(Servers& servers, const Servers& more) {
-    for (const IPAddress& each : more)
-        if (std::ranges::find(servers, each) == servers.end()) servers.push_back(each);
-}
-
 Servers without(Servers servers, const Servers& others) {
     std::erase_if(servers,
                   [&](const IPAddress& each) { return std::ranges::find(others, each) != others.end(); });
     return servers;
-}
-
-bool areHidden(const Servers& servers) {
-    return std::ranges::any_of(servers, [](const IPAddress& each) { return each.loopback(); });
 }
 
 Servers fromWords(const std::string& words) {
@@ -52,18 +37,6 @@ const std::string& optionOf(const std::map<std::string, std::string>& lease, con
     static const std::string kNone;
     const auto found = lease.find(name);
     return found == lease.end() ? kNone : found->second;
-}
-
-/// The servers of the resolver's file; in place of a resolver on the device those that it asks for the link.
-Servers effectiveServers(Known<Bus>& bus, const Link& link, const Servers& ofManager, const Until& until) {
-    const auto file = readSmallFile("/etc/resolv.conf");
-    Servers servers = file ? serversFromResolverFile(*file) : Servers();
-    if (!areHidden(servers) || !bus) return servers;
-    const auto asked = resolvedServers(*bus, link.interfaceIndex, until);
-    if (!asked && ofManager.empty()) return servers;
-    std::erase_if(servers, [](const IPAddress& each) { return each.loopback(); });
-    add(servers, asked ? *asked : ofManager);
-    return servers;
 }
 
 Known<std::string> methodOf(const Known<BusValue>& settings, const char* family) {
@@ -133,82 +106,6 @@ LinkSetup setupFromNetworkd(Known<Bus>& bus, const Link& link, const NetworkdLin
     return setup;
 }
 
-KernelIPv6 kernelSwitches(const std::string& interfaceName) {
-    const auto number = [&](const char* name) {
-        const auto text = readSmallFile("/proc/sys/net/ipv6/conf/" + interfaceName + "/" + name, 64);
-        return text ? std::atoi(text->c_str()) : -1;
-    };
-    // Without the folder the kernel has no IPv6 at all.
-    return {number("disable_ipv6") != 0, number("accept_ra") > 0};
-}
-
-/// iwd looks at routers' advertisements itself and has the kernel leave them alone.
-bool iwdManages(Known<Bus>& bus, const Link& link, const Until& until) {
-    const Known<BusValue> objects = bus ? iwdObjects(*bus, until) : bus.error();
-    return objects && !iwdDevice(*objects, link.interfaceName).empty();
-}
-
-/// What DHCP clients without a manager wrote down.
-struct ClientLeases {
-    std::optional<Lease> ipv4, ipv6;
-};
-
-ClientLeases readClientLeases(const Link& link, const std::vector<AssignedAddress>& assigned) {
-    std::vector<IPAddress> addresses;
-    for (const AssignedAddress& each : assigned) addresses.push_back(each.address);
-    const std::time_t now = std::time(nullptr);
-    DhcpcdLeases kept = findDhcpcdLeases(link.interfaceName, addresses, now);
-    // Of IPv4 only dhcpcd's is held against the interface's addresses.
-    if (!kept.ipv4) kept.ipv4 = findLease(link.interfaceName, now);
-    if (!kept.ipv6) kept.ipv6 = findLease6(link.interfaceName, addresses, now);
-    return {std::move(kept.ipv4), std::move(kept.ipv6)};
-}
-
-/// The name servers where no manager tells: by the leases, else by who can have named them at all.
-NameServers serversWithoutManager(const ClientLeases& leases, bool client,
-                                  const std::vector<AssignedAddress>& assigned, const Known<WaysOut>& ways) {
-    NameServers names;
-    for (const auto* lease : {&leases.ipv4, &leases.ipv6})
-        if (*lease) add(names.offered, (*lease)->servers);
-    names.offerKnown = leases.ipv4.has_value();
-    // What a router advertised is written down nowhere.
-    names.advertisementsKnown = false;
-    if (!ways) return names;
-    names.routers = ways->gateways;
-    if (leases.ipv4) return names;
-    // Nobody offers anything to an interface that was set up by hand; another one may have brought the servers along.
-    names.offerKnown = names.advertisementsKnown = !client && !ways->elsewhere && allSetByHand(assigned);
-    return names;
-}
-
-Known<LinkSetup> setupFromKernel(Known<Bus>& bus, const Link& link, const Until& until) {
-    const auto details = gatherAddressDetails(link.interfaceIndex, until);
-    if (!details) return details.error();
-    const auto ways = gatherWaysOut(link.interfaceIndex, until);
-    const bool isIwds = iwdManages(bus, link, until);
-    const auto assigned = assignedOf(*details, isIwds && ways && ways->advertised);
-    const ClientLeases leases = readClientLeases(link, assigned);
-    const DhcpClients clients = dhcpClientsOf(link.interfaceName);
-    const bool client = leases.ipv4 || clients.any;
-    KernelIPv6 switches = kernelSwitches(link.interfaceName);
-    switches.setByClient = clients.asksRouters;
-    switches.acceptsAdvertisements |= clients.asksRouters || isIwds;
-    LinkSetup setup;
-    setup.toldBy = "addresses";
-    setup.methods = {methodFromIPv4Addresses(assigned, client), methodFromIPv6Addresses(assigned, switches)};
-    NameServers names = serversWithoutManager(leases, client, assigned, ways);
-    names.effective = effectiveServers(bus, link, {}, until);
-    setup.servers = leases.ipv4 && !leases.ipv4->servers.empty() ? leases.ipv4->servers : names.effective;
-    setup.nameServers = std::move(names);
-    setup.leaseText =
-        failure(Reason::unavailable, client ? "the DHCP client left no lease of IPv4 that can be read"
-                                            : "no lease of IPv4 was found");
-    if (leases.ipv4) setup.leaseText = leases.ipv4->vendorText;
-    for (const auto* lease : {&leases.ipv4, &leases.ipv6})
-        if (*lease && setup.portalApi.empty()) setup.portalApi = (*lease)->portalApi;
-    return setup;
-}
-
 bool is(const Error& error, Reason reason) {
     return error.code == static_cast<int>(reason);
 }
@@ -264,7 +161,7 @@ Known<LinkSetup> gatherSetup(const Link& link, const Until& until) {
         setup = setupOfSilentManager(bus, link, managed.error(), until);
         profile = managed.error();
     } else {
-        setup = setupFromKernel(bus, link, until);
+        setup = setupWithoutManager(bus, link, until);
     }
     if (!setup) return setup;
     setup->proxies = allProxies(profile);

@@ -13,23 +13,38 @@ bool contains(const std::vector<IPAddress>& list, const IPAddress& address) {
     return std::find(list.begin(), list.end(), address) != list.end();
 }
 
+bool isAssigned(const FamilyPlan& plan, const std::vector<AssignedAddress>& addresses) {
+    return std::any_of(addresses.begin(), addresses.end(),
+                       [&](const AssignedAddress& each) { return contains(plan.addresses, each.address); });
+}
+
 }  // namespace
 
-Known<std::string> methodFromIPv4Addresses(const std::vector<AssignedAddress>& addresses, bool hasLease) {
-    bool any = false;
+Known<std::string> methodFromIPv4Addresses(const std::vector<AssignedAddress>& addresses, bool hasLease,
+                                           const FamilyPlan& plan) {
+    if (isAssigned(plan, addresses)) return plan.method;
+    bool any = false, routable = false;
     for (const AssignedAddress& each : addresses) {
         if (!each.address.isIPv4() || each.address.loopback() || each.address.unspecified()) continue;
-        // A client without a manager may set its address without an end, but it leaves a lease behind.
-        if (each.permanent && !each.address.linkLocal() && !hasLease) return std::string("static");
         any = true;
+        routable |= !each.address.linkLocal();
+        // A client without a manager may set its address without an end, but it leaves a lease behind.
+        if (!each.permanent || each.address.linkLocal() || hasLease) continue;
+        if (plan.started && plan.method == "auto")
+            return failure(Reason::unavailable,
+                           "the interface was started to ask for an address, but has one without an end, of "
+                           "which no DHCP client tells");
+        return std::string("static");
     }
+    if (!routable && !hasLease && !plan.method.empty()) return plan.method;
     if (any || hasLease) return std::string("dynamic");
     return failure(Reason::unavailable, "no manager tells how IPv4 is set up, and there is no address");
 }
 
 Known<std::string> methodFromIPv6Addresses(const std::vector<AssignedAddress>& addresses,
-                                           const KernelIPv6& kernel) {
+                                           const KernelIPv6& kernel, const FamilyPlan& plan) {
     if (kernel.disabled) return std::string("disabled");
+    if (isAssigned(plan, addresses)) return plan.method;
     bool dynamic = false;
     for (const AssignedAddress& each : addresses) {
         if (each.address.isIPv4() || each.address.linkLocal() || each.address.loopback()) continue;
@@ -40,6 +55,7 @@ Known<std::string> methodFromIPv6Addresses(const std::vector<AssignedAddress>& a
         if (withoutEnd) return std::string("static");
         dynamic = true;
     }
+    if (!dynamic && !plan.method.empty()) return plan.method;
     if (dynamic || kernel.acceptsAdvertisements) return std::string("dynamic");
     return std::string("link-local");
 }

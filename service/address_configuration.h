@@ -32,12 +32,28 @@ struct KernelIPv6 {
     bool setByClient = false;
 };
 
+/// How addresses of one family are to be set by a file's word, for devices where what reads it cannot be asked.
+struct FamilyPlan {
+    std::string method;                ///< "auto", "manual", "link-local"; empty where the file does not say
+    std::vector<IPAddress> addresses;  ///< entered there by hand
+    bool started = false;              ///< whether the interface is kept as started by that file
+};
+
+/// What a file says of one interface.
+struct InterfacePlan {
+    FamilyPlan ipv4, ipv6;
+    std::vector<IPAddress> servers;  ///< name servers entered there by hand
+};
+
 /// The method of IPv4 as the addresses give it away: an address without an end that no lease accounts for was
-/// put there by hand. No address at all tells nothing. *Any* thread.
-Known<std::string> methodFromIPv4Addresses(const std::vector<AssignedAddress>& addresses, bool hasLease);
+/// put there by hand. Where there is no address a plan tells; so it does of an address that stands in it. An address without
+/// an end on an interface that was started to ask for one tells nothing. *Any* thread.
+/// \param hasLease whether there is a lease in force, or a client that may have one
+Known<std::string> methodFromIPv4Addresses(const std::vector<AssignedAddress>& addresses, bool hasLease,
+                                           const FamilyPlan& plan = {});
 /// The same for IPv6, where a client's address without an end tells nothing. *Any* thread.
 Known<std::string> methodFromIPv6Addresses(const std::vector<AssignedAddress>& addresses,
-                                           const KernelIPv6& kernel);
+                                           const KernelIPv6& kernel, const FamilyPlan& plan = {});
 
 /// Whether all addresses of the interface were put there by hand, so that neither a lease nor an advertisement can have
 /// brought name servers along. *Any* thread.

@@ -14,8 +14,9 @@ namespace wp {
 /// How the interface is set up, by its connection manager, else by what the kernel and the files of the system
 /// give away.
 struct LinkSetup {
-    std::string
-        toldBy;  ///< "NetworkManager", "systemd-networkd"; "addresses": nobody, so that those were looked at
+    /// "NetworkManager", "systemd-networkd"; "addresses": nobody, so that those were looked at; "ifupdown": the same, held
+    /// together with what its file says.
+    std::string toldBy;
     AddressMethods methods;
     Known<NameServers> nameServers;
     Known<WebProxyPlaces> proxies;

@@ -1,39 +1,23 @@
 #include "linux/files/dhcp_clients.h"
 
 #include <algorithm>
-#include <filesystem>
 #include <vector>
 
-#include "linux/files/key_value_file.h"
+#include "linux/files/processes.h"
 
 namespace wp {
 namespace {
 
 struct Client {
     const char* program;
+    bool ipv4;         ///< asks for addresses of IPv4, unless told not to
     bool asksRouters;  ///< looks at routers' advertisements itself, and has the kernel leave them alone
 };
-constexpr Client kClients[] = {
-    {"udhcpc", false}, {"udhcpc6", false}, {"dhclient", false}, {"dhcpcd", true}, {"connmand", true}};
-
-/// The words of a command line. A program that shows a title of its own there ("dhcpcd: wlan0 [ip4]") has one text in
-/// place of words, which blanks separate.
-std::vector<std::string> wordsOfCommand(const std::string& line) {
-    std::vector<std::string> words(1);
-    const bool isTitle = line.substr(0, line.find('\0')).find(": ") != line.npos;
-    for (const char c : line) {
-        if (c == '\0' || (isTitle && c == ' '))
-            words.emplace_back();
-        else
-            words.back() += c;
-    }
-    if (isTitle && words.front().ends_with(":")) words.front().pop_back();
-    return words;
-}
-
-std::string programIn(const std::string& word) {
-    return std::filesystem::path(word).filename().string();
-}
+constexpr Client kClients[] = {{"udhcpc", true, false},
+                               {"udhcpc6", false, false},
+                               {"dhclient", true, false},
+                               {"dhcpcd", true, true},
+                               {"connmand", true, true}};
 
 /// A client that names interfaces looks after those, one that names none after all.
 bool looksAfter(const std::vector<std::string>& words, const std::string& interfaceName) {
@@ -41,7 +25,7 @@ bool looksAfter(const std::vector<std::string>& words, const std::string& interf
         return word == interfaceName || word == "-i" + interfaceName;
     };
     if (std::ranges::any_of(words, names)) return true;
-    const std::string program = programIn(words[0]);
+    const std::string program = programOf(words[0]);
     const auto isOption = [](const std::string& word) {
         return word.empty() || word.starts_with("-") || word.starts_with("[") || word.find('/') != word.npos;
     };
@@ -49,9 +33,15 @@ bool looksAfter(const std::vector<std::string>& words, const std::string& interf
            program == "connmand";
 }
 
+/// Whether options, or the title, say that only IPv6 is asked for.
+bool isForIPv6Alone(const std::vector<std::string>& words) {
+    const auto has = [&](const char* word) { return std::ranges::find(words, word) != words.end(); };
+    return has("-6") || has("--ipv6only") || (has("[ip6]") && !has("[ip4]"));
+}
+
 const Client* clientIn(const std::vector<std::string>& words) {
     for (const std::string& word : words) {
-        const Client* found = std::ranges::find(kClients, programIn(word), &Client::program);
+        const Client* found = std::ranges::find(kClients, programOf(word), &Client::program);
         if (found != std::end(kClients)) return found;
     }
     return nullptr;
@@ -61,19 +51,13 @@ const Client* clientIn(const std::vector<std::string>& words) {
 
 DhcpClients dhcpClientsOf(const std::string& interfaceName, const std::string& root) {
     DhcpClients clients;
-    std::error_code failed;
-    std::filesystem::directory_iterator entry(root + "/proc", failed);
-    for (; !failed && entry != std::filesystem::directory_iterator(); entry.increment(failed)) {
-        const std::string folder = entry->path().string(), name = entry->path().filename().string();
-        if (name.find_first_not_of("0123456789") != name.npos) continue;
-        const auto command = readSmallFile(folder + "/cmdline", 4096);
-        if (!command) continue;
-        const auto words = wordsOfCommand(*command);
+    forEachProcess(root, [&](const std::vector<std::string>& words) {
         const Client* client = clientIn(words);
-        if (client == nullptr || !looksAfter(words, interfaceName)) continue;
+        if (client == nullptr || !looksAfter(words, interfaceName)) return;
         clients.any = true;
+        clients.ipv4 |= client->ipv4 && !isForIPv6Alone(words);
         clients.asksRouters |= client->asksRouters;
-    }
+    });
     return clients;
 }
 

@@ -8,6 +8,7 @@ namespace wp {
 /// an automatic address from one that was entered.
 struct DhcpClients {
     bool any = false;
+    bool ipv4 = false;         ///< one asks for addresses of IPv4
     bool asksRouters = false;  ///< one looks at advertisements itself, and has the kernel leave them alone
 };
 /// The clients among the processes that this user sees. *Any* thread.

@@ -59,10 +59,15 @@ void addServers(std::string_view list, std::vector<IPAddress>& servers) {
     }
 }
 
+bool contains(const std::vector<IPAddress>& list, const std::optional<IPAddress>& address) {
+    return address && std::ranges::find(list, *address) != list.end();
+}
+
 /// One block of the file while it is read.
 struct Block {
     Lease lease;
     std::string interfaceName;
+    std::optional<IPAddress> address;
     bool passed = false;
 };
 
@@ -82,6 +87,7 @@ Statement statementIn(std::string_view line) {
 void readStatement(std::string_view line, Block& block, std::int64_t now) {
     const auto [name, value] = statementIn(line);
     if (name == "interface") block.interfaceName = textFrom(value);
+    if (name == "fixed-address") block.address = IPAddress::fromText(value);
     if (name == "expire") block.passed = hasPassed(value, now);
     if (name == "domain-name-servers") addServers(value, block.lease.servers);
     if (name == "vendor-encapsulated-options" || name == "vendor-class-identifier")
@@ -137,8 +143,8 @@ void readStatement6(std::string_view line, Block6& block) {
 
 bool isInForce(const Grant& grant, const std::vector<IPAddress>& assigned, std::int64_t now) {
     constexpr std::uint32_t kWithoutEnd = 0xFFFFFFFF;
-    const bool isHere = grant.address && std::ranges::find(assigned, *grant.address) != assigned.end();
-    return isHere && (grant.seconds == kWithoutEnd || std::int64_t{grant.starts} + grant.seconds > now);
+    return contains(assigned, grant.address) &&
+           (grant.seconds == kWithoutEnd || std::int64_t{grant.starts} + grant.seconds > now);
 }
 
 /// The first that can be read and holds a lease.
@@ -159,7 +165,7 @@ std::string portalUriFrom(std::string_view text) {
 }
 
 std::optional<Lease> readDhclientLeases(std::string_view text, std::string_view interfaceName,
-                                        std::int64_t now) {
+                                        const std::vector<IPAddress>& assigned, std::int64_t now) {
     std::optional<Lease> last;
     std::optional<Block> block;
     for (std::string_view line : linesOf(text)) {
@@ -167,12 +173,9 @@ std::optional<Lease> readDhclientLeases(std::string_view text, std::string_view 
         if (line.starts_with("lease ") && line.ends_with("{")) {
             block.emplace();
         } else if (line == "}" && block) {
-            if (block->interfaceName == interfaceName) {
-                if (block->passed)
-                    last.reset();
-                else
-                    last = std::move(block->lease);
-            }
+            const bool counts = !block->passed && contains(assigned, block->address);
+            if (block->interfaceName == interfaceName)
+                last = counts ? std::optional(std::move(block->lease)) : std::nullopt;
             block.reset();
         } else if (block) {
             readStatement(line, *block, now);
@@ -204,12 +207,13 @@ std::optional<Lease> readDhclient6Leases(std::string_view text, std::string_view
     return last;
 }
 
-std::optional<Lease> findLease(const std::string& interfaceName, std::int64_t now, const std::string& root) {
+std::optional<Lease> findLease(const std::string& interfaceName, const std::vector<IPAddress>& assigned,
+                               std::int64_t now, const std::string& root) {
     return firstOf(
         root,
         {"/var/lib/dhcp/dhclient." + interfaceName + ".leases", "/var/lib/dhcp/dhclient.leases",
          "/var/lib/dhclient/dhclient-" + interfaceName + ".leases", "/var/lib/dhclient/dhclient.leases"},
-        [&](const std::string& text) { return readDhclientLeases(text, interfaceName, now); });
+        [&](const std::string& text) { return readDhclientLeases(text, interfaceName, assigned, now); });
 }
 
 std::optional<Lease> findLease6(const std::string& interfaceName, const std::vector<IPAddress>& assigned,

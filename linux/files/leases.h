@@ -21,21 +21,22 @@ struct Lease {
 /// off it would lead elsewhere. *Any* thread.
 std::string portalUriFrom(std::string_view text);
 
-/// The last lease for the interface in the form that dhclient keeps; nothing where there is none, or its
-/// end has passed. \param now seconds since 1970-01-01 UTC. *Any* thread.
+/// The last lease for the interface in the form that dhclient keeps; nothing where there is none, its end has passed, or
+/// it grants an address that the interface does not have: it is then another network's. *Any* thread.
+/// \param assigned the interface's addresses
+/// \param now seconds since 1970-01-01 UTC
 std::optional<Lease> readDhclientLeases(std::string_view text, std::string_view interfaceName,
-                                        std::int64_t now);
+                                        const std::vector<IPAddress>& assigned, std::int64_t now);
 
 /// The same of DHCPv6, which dhclient keeps in a file of its own. It is in force where the interface has an address that it
-/// grants, and that address's time is not over. A lease without addresses (of a network where addresses come from
-/// advertisements) does not tell how long it holds, nor of which network it is, and counts for nothing.
-/// \param assigned the interface's addresses
+/// grants, and that address's time is not over. One without addresses counts for nothing: where dhclient asks for none (of a
+/// network where addresses come from advertisements) it keeps no lease.
 std::optional<Lease> readDhclient6Leases(std::string_view text, std::string_view interfaceName,
                                          const std::vector<IPAddress>& assigned, std::int64_t now);
 
 /// Looks for the interface's lease in the places where dhclient keeps them, below a root folder.
-std::optional<Lease> findLease(const std::string& interfaceName, std::int64_t now,
-                               const std::string& root = "");
+std::optional<Lease> findLease(const std::string& interfaceName, const std::vector<IPAddress>& assigned,
+                               std::int64_t now, const std::string& root = "");
 /// The same of DHCPv6.
 std::optional<Lease> findLease6(const std::string& interfaceName, const std::vector<IPAddress>& assigned,
                                 std::int64_t now, const std::string& root = "");

@@ -1,3 +1,4 @@
+#include "linux/files/interfaces_file.h"
 #include "linux/files/leases.h"
 #include "linux/files/networkd.h"
 #include "linux/files/proxy_settings.h"
@@ -7,9 +8,14 @@ using namespace wp;
 /// What other programs leave in files.
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     const std::string text(reinterpret_cast<const char*>(data), size);
-    readDhclientLeases(text, "wlan0", 1'795'199'400);
-    readDhclient6Leases(text, "wlan0", {*IPAddress::fromText("2001:db8::7")}, 1'795'199'400);
+    const std::vector<IPAddress> assigned{*IPAddress::fromText("192.168.1.20"),
+                                          *IPAddress::fromText("2001:db8::7")};
+    readDhclientLeases(text, "wlan0", assigned, 1'795'199'400);
+    readDhclient6Leases(text, "wlan0", assigned, 1'795'199'400);
     serversFromResolverFile(text);
+    InterfacesFile interfaces;
+    readInterfaces(text, interfaces);
+    planIn(interfaces, logicalNameIn(interfaces, "wlan0"));
     UnitFile settings;
     readUnitFile(text, settings);
     methodsFromNetworkd(settings);

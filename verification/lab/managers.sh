@@ -65,6 +65,13 @@ iwd() {
     wait_for 60 iwd_joined "$1" || { cat /run/lab/iwd.log; return 1; }
 }
 
+# ifupdown WORD < /etc/network/interfaces: starts an interface as ifup is told to by that word, as "wlan0" or "wlan0=home".
+ifupdown() {
+    mkdir -p /etc/network /run/network /run/lab
+    cat > /etc/network/interfaces
+    "$LAB_PROGRAMS/sbin/ifup" --no-scripts "$1" > /run/lab/ifup.log 2>&1 || { cat /run/lab/ifup.log; return 1; }
+}
+
 # dhclient_lease X: an address from ISC's client, which keeps the lease, and asks for a portal's API and vendor's text too.
 dhclient_lease() {
     printf '%s\n' 'request subnet-mask, routers, domain-name-servers, default-url, vendor-encapsulated-options;' \

@@ -30,11 +30,13 @@ lease {
 }
 lease {
   interface "eth0";
+  fixed-address 10.0.0.20;
   option domain-name-servers 10.0.0.1;
   expire never;
 }
 lease {
   interface "wlan0";
+  fixed-address 192.168.1.21;
   option domain-name-servers 192.168.1.3;
   option vendor-encapsulated-options "EXAMPLE_METERED";
   option unknown-114 "https://p.example/api";
@@ -43,31 +45,50 @@ lease {
 )";
 constexpr std::int64_t kSixThirtyPm = 1'795'199'400;  // 2026-11-20 18:30:00 UTC
 
+std::optional<Lease> lease4(const std::string& text, const char* interfaceName, const char* address,
+                            std::int64_t now) {
+    return readDhclientLeases(text, interfaceName, {*IPAddress::fromText(address)}, now);
+}
+
 TEST(Leases, TheLastLeaseOfTheInterfaceCounts) {
-    const auto lease = readDhclientLeases(kLeases, "wlan0", kSixThirtyPm);
+    const auto lease = lease4(kLeases, "wlan0", "192.168.1.21", kSixThirtyPm);
     ASSERT_TRUE(lease);
     EXPECT_EQ(textsOf(lease->servers), "192.168.1.3 ");
     EXPECT_EQ(lease->vendorText, "EXAMPLE_METERED");
     EXPECT_EQ(lease->portalApi, "https://p.example/api");
-    EXPECT_EQ(textsOf(readDhclientLeases(kLeases, "eth0", kSixThirtyPm)->servers), "10.0.0.1 ");
-    EXPECT_FALSE(readDhclientLeases(kLeases, "wlan1", kSixThirtyPm));
+    EXPECT_EQ(textsOf(lease4(kLeases, "eth0", "10.0.0.20", kSixThirtyPm)->servers), "10.0.0.1 ");
+    EXPECT_FALSE(lease4(kLeases, "wlan1", "192.168.1.21", kSixThirtyPm));
+}
+
+TEST(Leases, OneOfAnAddressThatTheInterfaceDoesNotHaveIsNone) {
+    EXPECT_FALSE(lease4(kLeases, "wlan0", "192.168.1.22", kSixThirtyPm));
+    EXPECT_FALSE(lease4(kLeases, "wlan0", "192.168.1.20", 0)) << "another was granted since";
+    EXPECT_FALSE(readDhclientLeases(kLeases, "wlan0", {}, kSixThirtyPm));
+    EXPECT_FALSE(lease4("lease {\ninterface \"w\";\nexpire never;\n}\n", "w", "0.0.0.0", 0));
 }
 
 TEST(Leases, OneThatHasEndedIsNone) {
-    EXPECT_TRUE(readDhclientLeases(kLeases, "wlan0", kSixThirtyPm + 3599));
-    EXPECT_FALSE(readDhclientLeases(kLeases, "wlan0", kSixThirtyPm + 3600));
-    EXPECT_FALSE(readDhclientLeases("lease {\ninterface \"w\";\nexpire epoch 100; # old\n}\n", "w", 101));
-    EXPECT_FALSE(readDhclientLeases("lease {\ninterface \"w\";\nexpire 5 2026/13/40 1:2:3;\n}\n", "w", 0));
-    EXPECT_FALSE(
-        readDhclientLeases("lease {\ninterface \"w\";\nexpire 5 2026/11/20 999999998:0:0;\n}\n", "w", 0));
-    EXPECT_FALSE(readDhclientLeases("lease {\ninterface \"w\";\nexpire 5 2026/11/20 -1:0:0;\n}\n", "w", 0));
+    const auto ending = [](const std::string& expiry, std::int64_t now) {
+        const std::string head = "lease {\ninterface \"w\";\nfixed-address 10.0.0.2;\nexpire ";
+        return lease4(head + expiry + ";\n}\n", "w", "10.0.0.2", now).has_value();
+    };
+    EXPECT_TRUE(ending("5 2026/11/20 19:30:00", kSixThirtyPm + 3599));
+    EXPECT_FALSE(ending("5 2026/11/20 19:30:00", kSixThirtyPm + 3600));
+    EXPECT_TRUE(ending("never", std::int64_t{1} << 40));
+    EXPECT_TRUE(ending("epoch 102; # old", 101));
+    EXPECT_FALSE(ending("epoch 100; # old", 101));
+    EXPECT_FALSE(ending("5 2026/13/40 1:2:3", 0));
+    EXPECT_FALSE(ending("5 2026/11/20 999999998:0:0", 0));
+    EXPECT_FALSE(ending("5 2026/11/20 -1:0:0", 0));
 }
 
 TEST(Leases, CutAndBrokenFilesAreReadAsFarAsTheyGo) {
     const std::string whole = kLeases;
     for (std::size_t size = 0; size < whole.size(); ++size)
-        readDhclientLeases(whole.substr(0, size), "wlan0", 0);
-    EXPECT_FALSE(readDhclientLeases("}\n}\nlease {\nlease {\n", "wlan0", 0));
+        EXPECT_EQ(lease4(whole.substr(0, size), "wlan0", "192.168.1.21", 0).has_value(),
+                  size + 1 >= whole.size())
+            << size;
+    EXPECT_FALSE(lease4("}\n}\nlease {\nlease {\n", "wlan0", "10.0.0.2", 0));
 }
 
 /// As dhclient 4.4 writes it.
@@ -140,7 +161,7 @@ TEST(Leases, APortalsAddressIsReadWholeOrNotAtAll) {
     for (const std::string& each : {longest, longest + "a"}) {
         const std::string expected = each.size() > 2048 ? "" : each;
         const auto lease =
-            readDhclientLeases(replaced(kLeases, "https://p.example/api", each), "wlan0", kSixThirtyPm);
+            lease4(replaced(kLeases, "https://p.example/api", each), "wlan0", "192.168.1.21", kSixThirtyPm);
         ASSERT_TRUE(lease);
         EXPECT_EQ(lease->portalApi, expected);
         const auto six =
@@ -256,9 +277,11 @@ TEST_F(Root, WithoutANetworkFileIsNotManagedByNetworkd) {
 }
 
 TEST_F(Root, KeepsALeaseWhereItsClientPutsIt) {
+    const std::vector<IPAddress> assigned{*IPAddress::fromText("192.168.1.21")};
     write("/var/lib/dhcp/dhclient.wlan0.leases", kLeases);
-    EXPECT_TRUE(findLease("wlan0", kSixThirtyPm, root_));
-    EXPECT_FALSE(findLease("wlan0", kSixThirtyPm + 3600, root_));
+    EXPECT_TRUE(findLease("wlan0", assigned, kSixThirtyPm, root_));
+    EXPECT_FALSE(findLease("wlan0", assigned, kSixThirtyPm + 3600, root_));
+    EXPECT_FALSE(findLease("wlan0", {}, kSixThirtyPm, root_));
 }
 
 /// A process of a program with arguments, as /proc shows it.
@@ -290,6 +313,21 @@ TEST_F(Root, HasADhcpClientForAllInterfacesWhereItNamesNone) {
     EXPECT_TRUE(dhcpClientsOf("wlan0", root_).any);
     write("/proc/13/cmdline", commandOf({"grep", "connmand.conf"}));
     EXPECT_FALSE(dhcpClientsOf("wlan0", root_).any);
+}
+
+TEST_F(Root, HasADhcpClientOfIPv6ThatDoesNotAskForIPv4) {
+    const auto asksForIPv4 = [&](const std::string& command) {
+        write("/proc/12/cmdline", command);
+        const DhcpClients clients = dhcpClientsOf("wlan0", root_);
+        EXPECT_TRUE(clients.any);
+        return clients.ipv4;
+    };
+    EXPECT_TRUE(asksForIPv4(commandOf({"/sbin/dhclient", "-4", "wlan0"})));
+    EXPECT_FALSE(asksForIPv4(commandOf({"/sbin/dhclient", "-6", "-S", "wlan0"})));
+    EXPECT_TRUE(asksForIPv4(commandOf({"/bin/busybox", "udhcpc", "-i", "wlan0"})));
+    EXPECT_FALSE(asksForIPv4(commandOf({"/bin/busybox", "udhcpc6", "-i", "wlan0"})));
+    EXPECT_TRUE(asksForIPv4("dhcpcd: wlan0 [ip4] [ip6]"));
+    EXPECT_FALSE(asksForIPv4("dhcpcd: wlan0 [ip6]"));
 }
 
 TEST_F(Root, HasADhcpClientThatShowsATitleInPlaceOfItsCommandLine) {

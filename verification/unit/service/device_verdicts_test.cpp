@@ -52,6 +52,42 @@ TEST(AddressConfiguration, AnEndlessIPv4AddressWithoutALeaseIsStatic) {
     EXPECT_FALSE(methodFromIPv4Addresses({}, false));
 }
 
+TEST(AddressConfiguration, AFileSaysHowIPv4IsSetUpWhereThereIsNoAddress) {
+    const AssignedAddress local{address("169.254.7.7"), true, false};
+    EXPECT_EQ(*methodFromIPv4Addresses({}, false, {"auto", {}, false}), "auto");
+    EXPECT_EQ(*methodFromIPv4Addresses({}, false, {"manual", {address("10.0.0.7")}, false}), "manual");
+    EXPECT_EQ(*methodFromIPv4Addresses({local}, false, {"link-local", {}, true}), "link-local");
+    EXPECT_EQ(*methodFromIPv4Addresses({}, true, {"manual", {address("10.0.0.7")}, false}), "dynamic")
+        << "a client looks for one";
+}
+
+TEST(AddressConfiguration, AnAddressThatStandsInAFileWasEnteredThere) {
+    const FamilyPlan plan{"manual", {address("10.0.0.7"), address("2001:db8::7")}, false};
+    const AssignedAddress four{address("10.0.0.7"), true, false}, six{address("2001:db8::7"), true, false},
+        granted{address("10.0.0.8"), false, false};
+    EXPECT_EQ(*methodFromIPv4Addresses({four}, false, plan), "manual");
+    EXPECT_EQ(*methodFromIPv4Addresses({four}, true, plan), "manual") << "a client runs beside it";
+    EXPECT_EQ(*methodFromIPv4Addresses({granted}, false, plan), "dynamic") << "the file is not in force";
+    EXPECT_EQ(*methodFromIPv6Addresses({six}, {.setByClient = true}, plan), "manual");
+}
+
+TEST(AddressConfiguration, AnEndlessAddressOfAnInterfaceThatAsksForOneTellsNothing) {
+    const AssignedAddress endless{address("10.0.0.7"), true, false};
+    EXPECT_EQ(methodFromIPv4Addresses({endless}, false, {"auto", {}, true}).error().code,
+              static_cast<int>(Reason::unavailable));
+    EXPECT_EQ(*methodFromIPv4Addresses({endless}, true, {"auto", {}, true}), "dynamic");
+    EXPECT_EQ(*methodFromIPv4Addresses({endless}, false, {"auto", {}, false}), "static")
+        << "it was never started";
+}
+
+TEST(AddressConfiguration, AFileSaysHowIPv6IsSetUpWhereThereIsNoGlobalAddress) {
+    const AssignedAddress local{address("fe80::5"), true, true}, byHand{address("2001:db8::6"), true, false};
+    EXPECT_EQ(*methodFromIPv6Addresses({local}, {}, {"manual", {address("2001:db8::7")}, false}), "manual");
+    EXPECT_EQ(*methodFromIPv6Addresses({local}, {false, false}, {"auto", {}, false}), "auto");
+    EXPECT_EQ(*methodFromIPv6Addresses({byHand}, {}, {"auto", {}, true}), "static");
+    EXPECT_EQ(*methodFromIPv6Addresses({local}, {true, false}, {"auto", {}, false}), "disabled");
+}
+
 TEST(AddressConfiguration, IPv6OfARoutersAdvertisementIsDynamicEvenWithoutAnEnd) {
     const AssignedAddress advertised{address("2001:db8::5"), true, true},
         byHand{address("2001:db8::6"), true, false};

@@ -1,0 +1,19 @@
+#pragma once
+
+#include "linux/dbus/bus.h"
+#include "linux/stop_signal.h"
+#include "service/facts.h"
+
+namespace wp {
+
+using Servers = std::vector<IPAddress>;
+
+/// Adds those that are not there yet. *Any* thread.
+void add(Servers& servers, const Servers& more);
+
+/// The name servers that are asked: those of the resolver's file; in place of a resolver on the device those that it asks for
+/// the link. Where it does not tell, its own address stays. *Any* thread; blocks while the bus is asked.
+/// \param ofManager what the interface's manager hands to a resolver that cannot be asked
+Servers effectiveServers(Known<Bus>& bus, const Link& link, const Servers& ofManager, const Until& until);
+
+}  // namespace wp

@@ -1,0 +1,175 @@
+#include "linux/files/interfaces_file.h"
+
+#include <fnmatch.h>
+
+#include <algorithm>
+#include <optional>
+
+#include "linux/files/key_value_file.h"
+
+namespace wp {
+namespace {
+
+// More is no configuration of a device, but an attempt to keep its reader busy.
+constexpr std::size_t kMostStanzas = 1000, kMostWords = 10'000, kMostIncludes = 256;
+constexpr int kDeepestInheritance = 8;
+
+/// The lines without comments; one that ends in a backslash goes on with the next.
+std::vector<std::string> logicalLines(std::string_view text) {
+    std::vector<std::string> lines;
+    bool goesOn = false;
+    for (std::string_view line : linesOf(text)) {
+        if (!goesOn && trimmed(line).starts_with("#")) continue;
+        if (!goesOn) lines.emplace_back();
+        goesOn = line.ends_with("\\");
+        if (goesOn) line.remove_suffix(1);
+        lines.back() += line;
+    }
+    return lines;
+}
+
+void addWords(const std::vector<std::string>& words, std::vector<std::string>& into) {
+    for (auto word = words.begin() + 1; word != words.end() && into.size() < kMostWords; ++word)
+        into.push_back(*word);
+}
+
+/// "iface NAME [FAMILY METHOD] [inherits PARENT]"
+InterfaceStanza stanzaFrom(const std::vector<std::string>& words) {
+    InterfaceStanza stanza;
+    if (words.size() > 1) stanza.name = words[1];
+    const auto inherits = std::ranges::find(words, "inherits");
+    if (inherits - words.begin() >= 4) {
+        stanza.family = words[2];
+        stanza.method = words[3];
+    }
+    if (words.end() - inherits > 1) stanza.parent = inherits[1];
+    return stanza;
+}
+
+/// Reads line after line; knows whose options follow.
+class Reader {
+  public:
+    explicit Reader(InterfacesFile& into) : into_(into) {}
+
+    void read(const std::string& line) {
+        const auto words = wordsOf(line);
+        if (words.empty()) return;
+        const std::string& first = words[0];
+        if (first == "auto" || first.starts_with("allow-")) {
+            addWords(words, into_.started);
+        } else if (first == "mapping") {
+            addWords(words, into_.mappings);
+        } else if (first == "source" || first == "source-directory") {
+            for (auto path = words.begin() + 1; path != words.end() && into_.includes.size() < kMostIncludes;
+                 ++path)
+                into_.includes.push_back({*path, first == "source-directory"});
+        } else if (first == "iface") {
+            hasStanza_ = into_.stanzas.size() < kMostStanzas;
+            if (hasStanza_) into_.stanzas.push_back(stanzaFrom(words));
+            return;
+        } else if (first != "no-auto-down" && first != "no-scripts" && first != "rename") {
+            readOption(line, first);
+            return;
+        }
+        hasStanza_ = false;
+    }
+
+  private:
+    void readOption(const std::string& line, const std::string& name) {
+        if (!hasStanza_) return;
+        std::string& value = into_.stanzas.back().options[name];
+        // An option may be given more than once.
+        if (!value.empty()) value += ' ';
+        value += trimmed(trimmed(line).substr(name.size()));
+    }
+
+    InterfacesFile& into_;
+    bool hasStanza_ = false;
+};
+
+/// "NAME", or "/PATTERN[/N]"; patterns over anything but names are nothing that a file alone can answer.
+bool matches(const std::string& word, const std::string& interfaceName) {
+    if (!word.starts_with("/")) return word == interfaceName;
+    const std::string pattern = word.substr(1, word.find('/', 1) - 1);
+    return ::fnmatch(pattern.c_str(), interfaceName.c_str(), 0) == 0;
+}
+
+/// The stanza together with what it inherits.
+InterfaceStanza whole(const InterfacesFile& file, InterfaceStanza stanza) {
+    for (int depth = 0; depth < kDeepestInheritance && !stanza.parent.empty(); ++depth) {
+        const auto parent = std::ranges::find_if(file.stanzas, [&](const InterfaceStanza& each) {
+            return each.name == stanza.parent && (stanza.family.empty() || each.family == stanza.family);
+        });
+        if (parent == file.stanzas.end()) break;
+        if (stanza.method.empty()) {
+            stanza.family = parent->family;
+            stanza.method = parent->method;
+        }
+        stanza.options.insert(parent->options.begin(), parent->options.end());
+        stanza.parent = parent->parent;
+    }
+    return stanza;
+}
+
+/// The method in the connection manager's words; empty for one that leaves the address to others.
+std::string methodOf(const InterfaceStanza& stanza) {
+    const std::string& name = stanza.method;
+    if (name == "dhcp" || name == "bootp" || name == "auto") return "auto";
+    if (name == "static") return "manual";
+    return name == "ipv4ll" ? "link-local" : "";
+}
+
+void addStanza(const InterfaceStanza& stanza, FamilyPlan& plan) {
+    const std::string method = methodOf(stanza);
+    // What was entered by hand counts beside what comes by itself.
+    if (plan.method.empty() || method == "manual") plan.method = method;
+    if (method != "manual") return;
+    const auto address = stanza.options.find("address");
+    if (address == stanza.options.end()) return;
+    for (const std::string& word : wordsOf(address->second))
+        if (const auto read = IPAddress::fromText(word.substr(0, word.find('/'))))
+            plan.addresses.push_back(*read);
+}
+
+void addServers(const InterfaceStanza& stanza, std::vector<IPAddress>& servers) {
+    for (const char* name : {"dns-nameservers", "dns-nameserver"}) {
+        const auto option = stanza.options.find(name);
+        if (option == stanza.options.end()) continue;
+        for (const std::string& word : wordsOf(option->second))
+            if (const auto address = IPAddress::fromText(word)) servers.push_back(*address);
+    }
+}
+
+}  // namespace
+
+void readInterfaces(std::string_view text, InterfacesFile& into) {
+    Reader reader(into);
+    for (const std::string& line : logicalLines(text)) reader.read(line);
+}
+
+std::string logicalNameIn(const InterfacesFile& file, const std::string& interfaceName) {
+    std::string name = interfaceName;
+    for (const std::string& word : file.started) {
+        const std::size_t equals = word.find('=');
+        if (equals == word.npos || !matches(word.substr(0, equals), interfaceName)) continue;
+        name = word.substr(equals + 1);
+        break;
+    }
+    for (const std::string& pattern : file.mappings)
+        if (::fnmatch(pattern.c_str(), name.c_str(), 0) == 0) return "";
+    return name;
+}
+
+InterfacePlan planIn(const InterfacesFile& file, const std::string& logicalName) {
+    InterfacePlan plan;
+    for (const InterfaceStanza& each : file.stanzas) {
+        if (each.name != logicalName) continue;
+        const InterfaceStanza stanza = whole(file, each);
+        if (stanza.family == "inet") addStanza(stanza, plan.ipv4);
+        if (stanza.family == "inet6") addStanza(stanza, plan.ipv6);
+        addServers(stanza, plan.servers);
+    }
+    return plan;
+}
+
+}  // namespace wp

@@ -1,0 +1,47 @@
+#pragma once
+
+#include <map>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "service/address_configuration.h"
+
+namespace wp {
+
+/// One "iface" of `/etc/network/interfaces`, as ifupdown and busybox read that file.
+struct InterfaceStanza {
+    std::string name;    ///< of a logical interface, often that of the real one
+    std::string family;  ///< "inet" or "inet6"; empty where it is inherited together with the method
+    std::string method;
+    std::string parent;  ///< whose options it inherits; empty where it inherits none
+    std::map<std::string, std::string> options;
+};
+
+/// What other files a line includes.
+struct InterfacesInclude {
+    std::string
+        path;  ///< as it is written: it may have shell's patterns, and be relative to the file's folder
+    bool isFolder = false;  ///< all files of the folder
+};
+
+/// The content of the file, and of those that it includes.
+struct InterfacesFile {
+    std::vector<InterfaceStanza> stanzas;
+    std::vector<std::string>
+        started;  ///< the words of "auto" and "allow-...": interfaces, patterns, "PATTERN=LOGICAL"
+    std::vector<std::string>
+        mappings;  ///< patterns of interfaces for which a script chooses the logical name
+    std::vector<InterfacesInclude> includes;
+};
+
+/// Reads such a text in addition to what was read. *Any* thread.
+void readInterfaces(std::string_view text, InterfacesFile& into);
+
+/// The logical name under which an interface would be started; empty where a script chooses it. *Any* thread.
+std::string logicalNameIn(const InterfacesFile& file, const std::string& interfaceName);
+
+/// What the file says of a logical interface; all absent or empty where it says nothing. *Any* thread.
+InterfacePlan planIn(const InterfacesFile& file, const std::string& logicalName);
+
+}  // namespace wp
