@@ -8,51 +8,14 @@
 #include "host/files.h"
 #include "host/output_file.h"
 #include "host/preparation.h"
+#include "host/recorded_evidence.h"
 #include "host/report/catalogue_text.h"
 #include "host/report/html/html_form.h"
 #include "host/report/report.h"
 #include "host/report/text_form.h"
-#include "host/run.h"
 
 namespace wp::host {
 namespace {
-
-constexpr std::int64_t kMaxScanCacheAge = 60;
-
-/// The request with which most of the recording's answers match: the first network and age that they name.
-DictionaryPointer requestFor(const Recording& recording) {
-    DictionaryPointer parameters = Dictionary::make();
-    parameters->setValue("reprofileWithUI", false);
-    parameters->setValue("maxScanCacheAge", kMaxScanCacheAge);
-    constexpr int kListsTest = 31;
-    for (auto answer = recording.answers.rbegin(); answer != recording.answers.rend(); ++answer) {
-        if (answer->networkName) parameters->setValue("networkName", *answer->networkName);
-        if (answer->maxScanCacheAge && answer->test != kListsTest)
-            parameters->setValue("maxScanCacheAge", *answer->maxScanCacheAge);
-    }
-    return parameters;
-}
-
-/// The list's scans are no part of a run without the list, but what they heard is worth telling.
-void addListScan(const Recording& recording, Evidence& evidence) {
-    constexpr int kListsTest = 31;
-    for (const RecordedAnswer& answer : recording.answers)
-        if (answer.test == kListsTest)
-            evidence.answers.push_back(answerFrom(kListsTest, std::nullopt, answer.response));
-}
-
-Evidence evidenceFromRecording(Recording recording, const ReportOptions& options) {
-    for (RecordedAnswer& answer : recording.answers) answer.delay = {};
-    Preparation prepared;
-    prepared.parameters = requestFor(recording);
-    prepared.locale = localeChoice(options.locale);
-    prepared.recording = std::make_shared<const Recording>(std::move(recording));
-    RunOptions run;
-    run.extension = options.extension;
-    Evidence evidence = replayedEvidence(run, prepared);
-    addListScan(*prepared.recording, evidence);
-    return evidence;
-}
 
 bool isRecording(const Value& json) {
     const DictionaryPointer* object = json.as<DictionaryPointer>();
