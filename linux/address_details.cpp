@@ -3,8 +3,7 @@
 #include <linux/if_addr.h>
 #include <linux/rtnetlink.h>
 
-#include "linux/netlink_socket.h"
-#include "linux/radio_socket.h"
+#include "linux/route_dump.h"
 #include "linux/route_messages.h"
 
 namespace wp {
@@ -36,28 +35,13 @@ std::optional<AddressDetails> detailsOf(const ifaddrmsg& header, const Attribute
                           (flags & IFA_F_NOPREFIXROUTE) == 0};
 }
 
-template <class Header>
-Known<std::vector<std::uint8_t>> dump(std::uint16_t type, const char* what, const Until& until) {
-    Known<NetlinkSocket> socket = NetlinkSocket::open(NETLINK_ROUTE);
-    if (!socket) return socket.error();
-    NetlinkRequest request(type, NLM_F_DUMP);
-    request.header<Header>() = {};  // of both families
-    NetlinkAnswer answer = socket->ask(request, until);
-    if (answer.error != 0) return failureOf(answer.error, what);
-    return std::move(answer.messages);
-}
-
 }  // namespace
 
 std::vector<AddressDetails> readAddressDetails(Bytes buffer, std::uint32_t interfaceIndex) {
     std::vector<AddressDetails> all;
-    forEachContent(buffer, [&](const NetlinkMessage& message) {
-        ifaddrmsg header{};
-        if (message.type != RTM_NEWADDR || message.payload.size() < sizeof header) return;
-        std::memcpy(&header, message.payload.data(), sizeof header);
+    forEachOfType<ifaddrmsg>(RTM_NEWADDR, buffer, [&](const ifaddrmsg& header, const Attributes& attributes) {
         if (header.ifa_index != interfaceIndex) return;
-        if (auto details = detailsOf(header, message.attributesAfter(NLMSG_ALIGN(sizeof header))))
-            all.push_back(*details);
+        if (const auto details = detailsOf(header, attributes)) all.push_back(*details);
     });
     return all;
 }
@@ -73,13 +57,13 @@ std::vector<AssignedAddress> assignedOf(const std::vector<AddressDetails>& detai
 }
 
 Known<std::vector<AddressDetails>> gatherAddressDetails(std::uint32_t interfaceIndex, const Until& until) {
-    const auto messages = dump<ifaddrmsg>(RTM_GETADDR, "addresses", until);
+    const auto messages = routeDump<ifaddrmsg>(RTM_GETADDR, "addresses", until);
     if (!messages) return messages.error();
     return readAddressDetails(*messages, interfaceIndex);
 }
 
 Known<WaysOut> gatherWaysOut(std::uint32_t interfaceIndex, const Until& until) {
-    const auto messages = dump<rtmsg>(RTM_GETROUTE, "routes", until);
+    const auto messages = routeDump<rtmsg>(RTM_GETROUTE, "routes", until);
     if (!messages) return messages.error();
     WaysOut ways;
     for (const Gateway& each : readGateways(*messages, interfaceIndex))

@@ -9,7 +9,7 @@
 #include <algorithm>
 #include <cmath>
 
-#include "linux/netlink_socket.h"
+#include "linux/route_dump.h"
 #include "linux/route_messages.h"
 #include "service/ip_address.h"
 
@@ -55,18 +55,6 @@ Known<RadioInterface> chooseInterface(const std::vector<RadioInterface>& station
     }
     if (stations.empty()) return failure(Reason::noInterface, "no Wi-Fi interface");
     return stations.front();
-}
-
-/// All messages of one kind about addresses or routes.
-template <class Header>
-Known<std::vector<std::uint8_t>> routeDump(std::uint16_t type, const std::string& what, const Until& until) {
-    Known<NetlinkSocket> socket = NetlinkSocket::open(NETLINK_ROUTE);
-    if (!socket) return socket.error();
-    NetlinkRequest request(type, NLM_F_DUMP);
-    request.header<Header>() = {};  // of both families
-    const NetlinkAnswer answer = socket->ask(request, until);
-    if (answer.error != 0) return failureOf(answer.error, what);
-    return answer.messages;
 }
 
 /// Waits until the radio has been at home for so long from now on.

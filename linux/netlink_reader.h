@@ -86,4 +86,16 @@ void forEachContent(Bytes buffer, Visit visit) {
     }
 }
 
+/// Calls `visit(header, attributes)` for each message of this type that has room for the header.
+template <class Header, class Visit>
+void forEachOfType(std::uint16_t type, Bytes buffer, Visit visit) {
+    constexpr std::size_t kAligned = (sizeof(Header) + 3) & ~std::size_t{3};
+    forEachContent(buffer, [&](const NetlinkMessage& message) {
+        Header header;
+        if (message.type != type || message.payload.size() < sizeof header) return;
+        std::memcpy(&header, message.payload.data(), sizeof header);
+        visit(header, message.attributesAfter(kAligned));
+    });
+}
+
 }  // namespace wp

@@ -17,6 +17,16 @@ void forEachOf(std::uint8_t command, Bytes buffer, Visit visit) {
     });
 }
 
+/// Calls `visit(frequency, information)` for each channel of a survey.
+template <class Visit>
+void forEachSurveyed(Bytes buffer, Visit visit) {
+    forEachOf(NL80211_CMD_NEW_SURVEY_RESULTS, buffer, [&](const Attributes& message) {
+        const Attributes info = message.nested(NL80211_ATTR_SURVEY_INFO);
+        if (const auto frequency = info.number<std::uint32_t>(NL80211_SURVEY_INFO_FREQUENCY))
+            visit(*frequency, info);
+    });
+}
+
 std::optional<MacAddress> addressIn(std::optional<Bytes> content) {
     MacAddress address;
     if (!content || content->size() != address.size()) return std::nullopt;
@@ -202,11 +212,8 @@ std::optional<Station> readStation(Bytes buffer) {
 
 Survey readSurvey(Bytes buffer) {
     Survey survey;
-    forEachOf(NL80211_CMD_NEW_SURVEY_RESULTS, buffer, [&](const Attributes& message) {
-        const Attributes info = message.nested(NL80211_ATTR_SURVEY_INFO);
-        const auto frequency = info.number<std::uint32_t>(NL80211_SURVEY_INFO_FREQUENCY);
-        if (!frequency) return;
-        SurveyedChannel channel{*frequency, info.has(NL80211_SURVEY_INFO_IN_USE), std::nullopt};
+    forEachSurveyed(buffer, [&](std::uint32_t frequency, const Attributes& info) {
+        SurveyedChannel channel{frequency, info.has(NL80211_SURVEY_INFO_IN_USE), std::nullopt};
         if (const auto noise = info.number<std::int8_t>(NL80211_SURVEY_INFO_NOISE)) channel.noise = *noise;
         survey.push_back(channel);
     });
@@ -215,13 +222,11 @@ Survey readSurvey(Bytes buffer) {
 
 Airtime readAirtime(Bytes buffer) {
     Airtime airtime;
-    forEachOf(NL80211_CMD_NEW_SURVEY_RESULTS, buffer, [&](const Attributes& message) {
-        const Attributes info = message.nested(NL80211_ATTR_SURVEY_INFO);
-        const auto frequency = info.number<std::uint32_t>(NL80211_SURVEY_INFO_FREQUENCY);
+    forEachSurveyed(buffer, [&](std::uint32_t frequency, const Attributes& info) {
         const auto time = info.number<std::uint64_t>(NL80211_SURVEY_INFO_TIME);
-        if (!frequency || !time) return;
+        if (!time) return;
         ChannelTime channel;
-        channel.frequency = *frequency;
+        channel.frequency = frequency;
         channel.inUse = info.has(NL80211_SURVEY_INFO_IN_USE);
         channel.time = *time;
         channel.busy = info.number<std::uint64_t>(NL80211_SURVEY_INFO_TIME_BUSY);

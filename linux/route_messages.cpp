@@ -11,14 +11,6 @@
 namespace wp {
 namespace {
 
-template <class Header>
-std::optional<Header> headerOf(const NetlinkMessage& message) {
-    Header header;
-    if (message.payload.size() < sizeof header) return std::nullopt;
-    std::memcpy(&header, message.payload.data(), sizeof header);
-    return header;
-}
-
 std::optional<Address::Family> familyOf(unsigned char family) {
     if (family == AF_INET) return Address::Family::ipv4;
     if (family == AF_INET6) return Address::Family::ipv6;
@@ -76,14 +68,11 @@ bool isDefaultRoute(const rtmsg& header) {
     return header.rtm_dst_len == 0 && header.rtm_type == RTN_UNICAST;
 }
 
-std::optional<Gateway> gatewayOf(const NetlinkMessage& message, std::uint32_t interfaceIndex) {
-    const std::optional<rtmsg> header = headerOf<rtmsg>(message);
-    if (message.type != RTM_NEWROUTE || !header || !isDefaultRoute(*header)) return std::nullopt;
-    const std::optional<Address::Family> family = familyOf(header->rtm_family);
-    const Attributes attributes = message.attributesAfter(NLMSG_ALIGN(sizeof(rtmsg)));
-    if (!family || attributes.number<std::uint32_t>(RTA_TABLE).value_or(header->rtm_table) != RT_TABLE_MAIN) {
-        return std::nullopt;
-    }
+std::optional<Gateway> gatewayOf(const rtmsg& header, const Attributes& attributes,
+                                 std::uint32_t interfaceIndex) {
+    const std::optional<Address::Family> family = familyOf(header.rtm_family);
+    const std::uint32_t table = attributes.number<std::uint32_t>(RTA_TABLE).value_or(header.rtm_table);
+    if (!isDefaultRoute(header) || !family || table != RT_TABLE_MAIN) return std::nullopt;
     std::optional<Gateway> gateway;
     if (const auto hops = attributes.find(RTA_MULTIPATH)) {
         gateway = nextHopAmong(*family, *hops, interfaceIndex);
@@ -94,23 +83,26 @@ std::optional<Gateway> gatewayOf(const NetlinkMessage& message, std::uint32_t in
     return gateway;
 }
 
+template <class Visit>
+void forEachRoute(Bytes buffer, Visit visit) {
+    forEachOfType<rtmsg>(RTM_NEWROUTE, buffer, visit);
+}
+
 }  // namespace
 
 Addresses readAddresses(Bytes buffer, std::uint32_t interfaceIndex) {
     Addresses addresses;
-    forEachContent(buffer, [&](const NetlinkMessage& message) {
-        const std::optional<ifaddrmsg> header = headerOf<ifaddrmsg>(message);
-        if (message.type != RTM_NEWADDR || !header || header->ifa_index != interfaceIndex) return;
-        const auto address = addressOf(*header, message.attributesAfter(NLMSG_ALIGN(sizeof(ifaddrmsg))));
-        if (address) addresses.push_back(*address);
+    forEachOfType<ifaddrmsg>(RTM_NEWADDR, buffer, [&](const ifaddrmsg& header, const Attributes& attributes) {
+        if (header.ifa_index != interfaceIndex) return;
+        if (const auto address = addressOf(header, attributes)) addresses.push_back(*address);
     });
     return addresses;
 }
 
 std::vector<Gateway> readGateways(Bytes buffer, std::uint32_t interfaceIndex) {
     std::vector<Gateway> gateways;
-    forEachContent(buffer, [&](const NetlinkMessage& message) {
-        std::optional<Gateway> gateway = gatewayOf(message, interfaceIndex);
+    forEachRoute(buffer, [&](const rtmsg& header, const Attributes& attributes) {
+        std::optional<Gateway> gateway = gatewayOf(header, attributes, interfaceIndex);
         if (gateway) gateways.push_back(std::move(*gateway));
     });
     std::ranges::stable_sort(gateways, [](const Gateway& left, const Gateway& right) {
@@ -122,24 +114,19 @@ std::vector<Gateway> readGateways(Bytes buffer, std::uint32_t interfaceIndex) {
 
 bool leadsElsewhere(Bytes buffer, std::uint32_t interfaceIndex) {
     bool found = false;
-    forEachContent(buffer, [&](const NetlinkMessage& message) {
-        const std::optional<rtmsg> header = headerOf<rtmsg>(message);
-        if (message.type != RTM_NEWROUTE || !header || !isDefaultRoute(*header)) return;
-        const Attributes attributes = message.attributesAfter(NLMSG_ALIGN(sizeof(rtmsg)));
+    forEachRoute(buffer, [&](const rtmsg& header, const Attributes& attributes) {
+        if (!isDefaultRoute(header)) return;
         const auto out = attributes.number<std::uint32_t>(RTA_OIF);
         // A route with several next hops leads over several interfaces as a rule.
-        found |= out ? *out != interfaceIndex : attributes.find(RTA_MULTIPATH).has_value();
+        found |= out ? *out != interfaceIndex : attributes.has(RTA_MULTIPATH);
     });
     return found;
 }
 
 bool hasAdvertisedRoute(Bytes buffer, std::uint32_t interfaceIndex) {
     bool found = false;
-    forEachContent(buffer, [&](const NetlinkMessage& message) {
-        const std::optional<rtmsg> header = headerOf<rtmsg>(message);
-        if (message.type != RTM_NEWROUTE || !header) return;
-        if (header->rtm_family != AF_INET6 || header->rtm_protocol != RTPROT_RA) return;
-        const Attributes attributes = message.attributesAfter(NLMSG_ALIGN(sizeof(rtmsg)));
+    forEachRoute(buffer, [&](const rtmsg& header, const Attributes& attributes) {
+        if (header.rtm_family != AF_INET6 || header.rtm_protocol != RTPROT_RA) return;
         const auto hops = attributes.find(RTA_MULTIPATH);
         found |= hops ? nextHopAmong(Address::Family::ipv6, *hops, interfaceIndex).has_value()
                       : attributes.number<std::uint32_t>(RTA_OIF) == interfaceIndex;
@@ -149,12 +136,10 @@ bool hasAdvertisedRoute(Bytes buffer, std::uint32_t interfaceIndex) {
 
 bool isReachable(Bytes buffer, std::uint32_t interfaceIndex, Bytes address) {
     bool found = false;
-    forEachContent(buffer, [&](const NetlinkMessage& message) {
-        const std::optional<ndmsg> header = headerOf<ndmsg>(message);
-        if (message.type != RTM_NEWNEIGH || !header) return;
-        if (header->ndm_ifindex != static_cast<int>(interfaceIndex)) return;
-        const auto of = message.attributesAfter(NLMSG_ALIGN(sizeof(ndmsg))).find(NDA_DST);
-        found |= of && std::ranges::equal(*of, address) && (header->ndm_state & NUD_REACHABLE) != 0;
+    forEachOfType<ndmsg>(RTM_NEWNEIGH, buffer, [&](const ndmsg& header, const Attributes& attributes) {
+        if (header.ndm_ifindex != static_cast<int>(interfaceIndex)) return;
+        const auto of = attributes.find(NDA_DST);
+        found |= of && std::ranges::equal(*of, address) && (header.ndm_state & NUD_REACHABLE) != 0;
     });
     return found;
 }
