@@ -23,16 +23,21 @@ Error withLoss(const Gathering& g, Error error) {
 }
 
 template <class T>
+Store kept(Known<T> Facts::*place, Known<T> found) {
+    return [place, found = std::move(found)](Facts& into) { into.*place = found; };
+}
+
+template <class T>
 Store stored(const Gathering& g, Known<T> Facts::*place, Known<T> found) {
     if (!found) found = withLoss(g, found.error());
-    return [place, found = std::move(found)](Facts& into) { into.*place = found; };
+    return kept(place, std::move(found));
 }
 
 /// A store of what the function makes of the link, or of the reason why there is no link.
 template <class T, class Gather>
 Store fromLink(const Gathering& g, Known<T> Facts::*place, Gather gather) {
     if (g.facts.link) return stored(g, place, Known<T>(gather(*g.facts.link)));
-    return [place, why = g.facts.link.error()](Facts& into) { into.*place = why; };
+    return kept<T>(place, g.facts.link.error());
 }
 
 Known<Link> linkOf(const Gathering& g) {
@@ -156,8 +161,7 @@ Store outsideEcho(const Gathering& g) {
 /// A store of what the function makes of the link and its set-up, or of the reason why one of them is missing.
 template <class T, class Gather>
 Store fromSetup(const Gathering& g, Known<T> Facts::*place, Gather gather) {
-    if (g.facts.link && !g.facts.setup)
-        return [place, why = g.facts.setup.error()](Facts& into) { into.*place = why; };
+    if (g.facts.link && !g.facts.setup) return kept<T>(place, g.facts.setup.error());
     return fromLink(g, place, [&](const Link& found) -> Known<T> { return gather(found, *g.facts.setup); });
 }
 

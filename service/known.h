@@ -1,8 +1,8 @@
 #pragma once
 
+#include <optional>
 #include <string>
 #include <utility>
-#include <variant>
 
 #include "platform/error.h"
 
@@ -30,21 +30,23 @@ inline Error failure(Reason reason, std::string message) {
 template <class T>
 class Known {
   public:
-    Known() : content_(failure(Reason::unavailable, "not looked for")) {}
-    Known(T value) : content_(std::move(value)) {}
-    Known(Error error) : content_(std::move(error)) {}
+    Known() : error_(failure(Reason::unavailable, "not looked for")) {}
+    Known(T value) : value_(std::move(value)) {}
+    Known(Error error) : error_(std::move(error)) {}
 
-    explicit operator bool() const { return content_.index() == 0; }
+    explicit operator bool() const { return value_.has_value(); }
     /// The value; only where there is one.
-    const T& operator*() const { return *std::get_if<0>(&content_); }
-    const T* operator->() const { return std::get_if<0>(&content_); }
-    T& operator*() { return *std::get_if<0>(&content_); }
-    T* operator->() { return std::get_if<0>(&content_); }
+    const T& operator*() const { return *value_; }
+    const T* operator->() const { return &*value_; }
+    T& operator*() { return *value_; }
+    T* operator->() { return &*value_; }
     /// The reason; only where there is no value.
-    const Error& error() const { return *std::get_if<1>(&content_); }
+    const Error& error() const { return error_; }
 
   private:
-    std::variant<T, Error> content_;
+    // No variant: to copy and move one takes the compiler twice as long, for every kind of fact.
+    std::optional<T> value_;
+    Error error_;
 };
 
 }  // namespace wp
