@@ -1,6 +1,6 @@
 # Access points of the demo recordings, for scripts inside the lab: . air.sh
 
-# wpa2 X 'SSID' SIGNAL 'more hostapd lines' [ADDRESS/24]: an access point secured with WPA2.
+# wpa2 X 'SSID' SIGNAL 'more hostapd lines' [ADDRESS/24]: an access point secured with WPA2, which tells its maker by WPS.
 wpa2() {
     ap "$1" "${5:--}" <<< "ssid=$2
 country_code=US
@@ -12,6 +12,11 @@ wpa=2
 wpa_key_mgmt=WPA-PSK
 rsn_pairwise=CCMP
 wpa_passphrase=correct horse
+eap_server=1
+wps_state=2
+manufacturer=Fernleigh Networks
+model_name=FN-20
+device_name=Router
 $4" && signal "$1" "$3"
 }
 # open X 'SSID' SIGNAL 'more hostapd lines' [ADDRESS/24]: an access point without security.
