@@ -8,6 +8,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <map>
 
 #include "linux/route_dump.h"
 #include "linux/route_messages.h"
@@ -36,15 +37,6 @@ bool isUp(const std::string& interfaceName) {
     return ioctl(any.number(), SIOCGIFFLAGS, &request) == 0 && (request.ifr_flags & IFF_UP) != 0;
 }
 
-/// Of several access points that one link is joined to at once, the strongest.
-std::optional<AccessPoint> joinedAmong(std::vector<AccessPoint> accessPoints) {
-    std::optional<AccessPoint> joined;
-    for (AccessPoint& each : accessPoints) {
-        if (each.joined && (!joined || each.signal > joined->signal)) joined = std::move(each);
-    }
-    return joined;
-}
-
 Known<RadioInterface> chooseInterface(const std::vector<RadioInterface>& stations,
                                       const std::optional<std::string>& wanted) {
     if (wanted) {
@@ -68,11 +60,20 @@ Wait waitAtHome(milliseconds wanted, const HomeChannel::Stay& stay, const Until&
     }
 }
 
+/// Its access point tells whether it has joined: the interface itself does not always name its network.
+Use useOf(RadioSocket& radio, const RadioInterface& interface, const Until& until) {
+    if (!isUp(interface.name)) return Use::down;
+    const Known<std::optional<AccessPoint>> joined = radio.joined(interface.index, until);
+    return joined && *joined ? Use::joined : Use::up;
+}
+
 Known<std::vector<RadioInterface>> stationInterfaces(RadioSocket& radio, const Until& until) {
     Known<std::vector<RadioInterface>> interfaces = radio.interfaces(until);
     if (!interfaces) return interfaces;
     std::erase_if(*interfaces, [](const RadioInterface& each) { return !each.isStation(); });
-    putInUseFirst(*interfaces, isUp);
+    // There is nothing to ask where there is nothing to choose.
+    if (interfaces->size() > 1)
+        putInUseFirst(*interfaces, [&](const RadioInterface& each) { return useOf(radio, each, until); });
     return interfaces;
 }
 
@@ -131,11 +132,10 @@ Known<std::vector<RadioInterface>> gatherStationInterfaces(const Until& until) {
 }
 
 void putInUseFirst(std::vector<RadioInterface>& interfaces,
-                   const std::function<bool(const std::string& name)>& isInterfaceUp) {
-    const auto rank = [&](const RadioInterface& each) {
-        return each.joinedName ? 0 : isInterfaceUp(each.name) ? 1 : 2;
-    };
-    std::ranges::stable_sort(interfaces, {}, rank);
+                   const std::function<Use(const RadioInterface&)>& useOf) {
+    std::map<std::uint32_t, Use> uses;
+    for (const RadioInterface& each : interfaces) uses[each.index] = useOf(each);
+    std::ranges::stable_sort(interfaces, {}, [&](const RadioInterface& each) { return uses[each.index]; });
 }
 
 Known<Link> gatherLink(const std::optional<std::string>& wantedInterface, const Until& until) {
@@ -147,9 +147,9 @@ Known<Link> gatherLink(const std::optional<std::string>& wantedInterface, const 
     if (!chosen) return chosen.error();
     Link link{chosen->name, chosen->index, chosen->radio, isUp(chosen->name), std::nullopt};
     if (!link.up) return link;
-    Known<std::vector<AccessPoint>> known = radio->accessPoints(link.interfaceIndex, until);
-    if (!known) return known.error();
-    link.joined = joinedAmong(std::move(*known));
+    Known<std::optional<AccessPoint>> joined = radio->joined(link.interfaceIndex, until);
+    if (!joined) return joined.error();
+    link.joined = std::move(*joined);
     return link;
 }
 

@@ -36,8 +36,11 @@ Known<AllowedChannels> gatherAllowedChannels(const Link& link, const Until& unti
 
 /// All station interfaces of this machine, those in use first.
 Known<std::vector<RadioInterface>> gatherStationInterfaces(const Until& until);
+/// What an interface is used for, the most first.
+enum class Use { joined, up, down };
 /// Joined ones first, then those that are up, each in the kernel's order; the first is the one that is looked at.
+/// @param useOf asked once for each
 void putInUseFirst(std::vector<RadioInterface>& interfaces,
-                   const std::function<bool(const std::string& name)>& isInterfaceUp);
+                   const std::function<Use(const RadioInterface&)>& useOf);
 
 }  // namespace wp

@@ -181,7 +181,6 @@ std::vector<RadioInterface> readInterfaces(Bytes buffer) {
         interface.radio = message.number<std::uint32_t>(NL80211_ATTR_WIPHY).value_or(0);
         interface.type = message.number<std::uint32_t>(NL80211_ATTR_IFTYPE).value_or(0);
         interface.frequency = message.number<std::uint32_t>(NL80211_ATTR_WIPHY_FREQ);
-        if (const auto joined = message.find(NL80211_ATTR_SSID)) interface.joinedName.emplace(*joined);
         interfaces.push_back(std::move(interface));
     });
     return interfaces;

@@ -26,7 +26,6 @@ struct RadioInterface {
     std::uint32_t index = 0;
     std::uint32_t radio = 0;
     std::uint32_t type = 0;
-    std::optional<NetworkName> joinedName;   ///< of the network that a station has joined
     std::optional<std::uint32_t> frequency;  ///< MHz, while it has a channel
     bool isStation() const;
 };

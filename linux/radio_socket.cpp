@@ -137,6 +137,15 @@ Known<std::vector<AccessPoint>> RadioSocket::accessPoints(std::uint32_t interfac
     return readAccessPoints(answer.messages, bootMilliseconds());
 }
 
+Known<std::optional<AccessPoint>> RadioSocket::joined(std::uint32_t interfaceIndex, const Until& until) {
+    Known<std::vector<AccessPoint>> known = accessPoints(interfaceIndex, until);
+    if (!known) return known.error();
+    std::optional<AccessPoint> joined;
+    for (AccessPoint& each : *known)
+        if (each.joined && (!joined || each.signal > joined->signal)) joined = std::move(each);
+    return joined;
+}
+
 Known<Station> RadioSocket::station(std::uint32_t interfaceIndex, const Until& until) {
     const NetlinkAnswer answer = ask(NL80211_CMD_GET_STATION, NLM_F_DUMP, interfaceIndex, until);
     if (answer.error != 0) return failureOf(answer.error, "link");

@@ -28,6 +28,8 @@ class RadioSocket {
 
     Known<std::vector<RadioInterface>> interfaces(const Until& until);
     Known<std::vector<AccessPoint>> accessPoints(std::uint32_t interfaceIndex, const Until& until);
+    /// The access point that the interface is joined to, of several at once the strongest; nothing where it has not joined.
+    Known<std::optional<AccessPoint>> joined(std::uint32_t interfaceIndex, const Until& until);
     Known<Station> station(std::uint32_t interfaceIndex, const Until& until);
     Known<Survey> survey(std::uint32_t interfaceIndex, const Until& until);
     Known<Airtime> airtime(std::uint32_t interfaceIndex, const Until& until);

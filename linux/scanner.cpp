@@ -127,17 +127,14 @@ class ScanRun {
         return order;
     }
 
-    /// The channel on which an interface of the radio is joined to a network. Its access point tells: the interface
-    /// itself does not always name its network.
+    /// The channel on which an interface of the radio is joined to a network.
     std::optional<std::uint32_t> homeOfRadio() {
         const Known<std::vector<RadioInterface>> interfaces = radio_.interfaces(until_);
         if (!interfaces) return std::nullopt;
         for (const RadioInterface& each : *interfaces) {
             if (each.radio != wish_.radio || !each.isStation()) continue;
-            const Known<std::vector<AccessPoint>> known = radio_.accessPoints(each.index, until_);
-            if (!known) continue;
-            const auto joined = std::ranges::find_if(*known, &AccessPoint::joined);
-            if (joined != known->end()) return joined->frequency;
+            const Known<std::optional<AccessPoint>> joined = radio_.joined(each.index, until_);
+            if (joined && *joined) return (*joined)->frequency;
         }
         return std::nullopt;
     }

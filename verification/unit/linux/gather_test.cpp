@@ -450,13 +450,13 @@ TEST_F(Driver, WithoutASwitchIsNoGuess) {
 /// The names in the order of use, of interfaces named after what they are.
 std::string inOrderOfUse(const std::vector<std::string>& names) {
     std::vector<RadioInterface> interfaces;
-    for (const std::string& name : names) {
-        RadioInterface interface;
-        interface.name = name;
-        if (name.starts_with("joined")) interface.joinedName = NetworkName();
-        interfaces.push_back(interface);
-    }
-    putInUseFirst(interfaces, [](const std::string& name) { return !name.starts_with("down"); });
+    for (const std::string& name : names)
+        interfaces.push_back({name, static_cast<std::uint32_t>(interfaces.size()), 0, 0, {}});
+    putInUseFirst(interfaces, [](const RadioInterface& each) {
+        return each.name.starts_with("joined") ? Use::joined
+               : each.name.starts_with("up")   ? Use::up
+                                               : Use::down;
+    });
     std::string order;
     for (const RadioInterface& each : interfaces) order += each.name + ' ';
     return order;

@@ -24,14 +24,12 @@ TEST(RadioMessages, FindTheFamilyAndItsGroups) {
     EXPECT_TRUE(family->groups.contains("mlme"));
 }
 
-TEST(RadioMessages, TellTheInterfaceAndWhatItHasJoined) {
+TEST(RadioMessages, TellTheInterfaceAndItsChannel) {
     const auto interfaces = readInterfaces(captured("good-home-interface"));
 
     ASSERT_EQ(1U, interfaces.size());
     EXPECT_EQ("wlan0", interfaces[0].name);
     EXPECT_TRUE(interfaces[0].isStation());
-    ASSERT_TRUE(interfaces[0].joinedName);
-    EXPECT_EQ("Northlight", textFromName(*interfaces[0].joinedName));
     EXPECT_EQ(2437U, interfaces[0].frequency);
 }
 
@@ -39,7 +37,7 @@ TEST(RadioMessages, TellAnInterfaceThatHasJoinedNothing) {
     const auto interfaces = readInterfaces(captured("not-joined-interface"));
 
     ASSERT_EQ(1U, interfaces.size());
-    EXPECT_FALSE(interfaces[0].joinedName);
+    EXPECT_FALSE(interfaces[0].frequency);
 }
 
 TEST(RadioMessages, TellTheJoinedAccessPoint) {
