@@ -126,9 +126,10 @@ std::optional<ScanEvent::Kind> scanEventKind(Bytes payload) {
 }
 
 void addScanEvent(std::vector<ScanEvent>& events, ScanEvent::Kind kind, const Attributes& message) {
-    const auto index = message.number<std::uint32_t>(NL80211_ATTR_IFINDEX);
-    if (!index) return;
-    ScanEvent event{kind, *index, numbersOf(message.nested(NL80211_ATTR_SCAN_FREQUENCIES)), false};
+    const auto radio = message.number<std::uint32_t>(NL80211_ATTR_WIPHY);
+    if (!radio) return;
+    ScanEvent event{kind, message.number<std::uint32_t>(NL80211_ATTR_IFINDEX).value_or(0),
+                    numbersOf(message.nested(NL80211_ATTR_SCAN_FREQUENCIES)), false, *radio};
     message.nested(NL80211_ATTR_SCAN_SSIDS).forEach([&](std::uint16_t, Bytes name) {
         if (name.empty()) event.probedForAll = true;
     });

@@ -71,9 +71,10 @@ std::optional<RadioAbilities> readAbilities(Bytes buffer, std::uint32_t radio);
 struct ScanEvent {
     enum class Kind { started, finished, aborted };
     Kind kind = Kind::finished;
-    std::uint32_t interfaceIndex = 0;
+    std::uint32_t interfaceIndex = 0;        ///< 0 of a peer-to-peer device, which has none
     std::vector<std::uint32_t> frequencies;  ///< MHz, of the channels that the scan was to visit
     bool probedForAll = false;               ///< whether it asked for networks of any name
+    std::uint32_t radio = 0;
 };
 std::vector<ScanEvent> readScanEvents(Bytes buffer);
 

@@ -48,6 +48,10 @@ void putFlags(NetlinkRequest& request, const ScanOrder& order) {
     if (visits6GHz) request.put(NL80211_ATTR_SCAN_FLAGS, std::uint32_t{NL80211_SCAN_FLAG_COLOCATED_6GHZ});
 }
 
+bool isStart(const ScanEvent& event) {
+    return event.kind == ScanEvent::Kind::started;
+}
+
 /// What a reader made of an answer, or why there is none.
 template <class T>
 Known<T> orReason(std::optional<T> read, const std::string& what) {
@@ -202,10 +206,9 @@ void RadioSocket::receiveWaitingEvents() {
 }
 
 void RadioSocket::forgetEventsBeforeTheLatestStart(std::uint32_t interfaceIndex) {
-    const auto isStart = [&](const ScanEvent& event) {
-        return event.kind == ScanEvent::Kind::started && event.interfaceIndex == interfaceIndex;
-    };
-    const auto latest = std::find_if(arrived_.rbegin(), arrived_.rend(), isStart);
+    const auto latest = std::find_if(arrived_.rbegin(), arrived_.rend(), [&](const ScanEvent& each) {
+        return each.interfaceIndex == interfaceIndex && isStart(each);
+    });
     if (latest != arrived_.rend()) arrived_.erase(arrived_.begin(), latest.base());
 }
 
@@ -224,20 +227,27 @@ bool RadioSocket::listenForScans() {
 }
 
 Known<ScanEvent> RadioSocket::nextScanStart(std::uint32_t interfaceIndex, const Until& until) {
-    return nextScanEvent(interfaceIndex, true, until);
+    return nextScanEvent(
+        [=](const ScanEvent& each) { return each.interfaceIndex == interfaceIndex && isStart(each); }, until);
 }
 
 Known<ScanEvent> RadioSocket::nextScanEnd(std::uint32_t interfaceIndex, const Until& until) {
-    return nextScanEvent(interfaceIndex, false, until);
+    return nextScanEvent(
+        [=](const ScanEvent& each) { return each.interfaceIndex == interfaceIndex && !isStart(each); },
+        until);
 }
 
-Known<ScanEvent> RadioSocket::nextScanEvent(std::uint32_t interfaceIndex, bool start, const Until& until) {
+Known<ScanEvent> RadioSocket::nextScanEndOfRadio(std::uint32_t radio, const Until& until) {
+    return nextScanEvent([=](const ScanEvent& each) { return each.radio == radio && !isStart(each); }, until);
+}
+
+Known<ScanEvent> RadioSocket::nextScanEvent(const std::function<bool(const ScanEvent&)>& isWanted,
+                                            const Until& until) {
     for (;;) {
         while (!arrived_.empty()) {
             const ScanEvent event = arrived_.front();
             arrived_.pop_front();
-            const bool isStart = event.kind == ScanEvent::Kind::started;
-            if (event.interfaceIndex == interfaceIndex && isStart == start) return event;
+            if (isWanted(event)) return event;
         }
         const NetlinkAnswer answer = events_->receive(until);
         // Too many messages at once: some are lost, and the end of a scan may be among them.

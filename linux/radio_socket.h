@@ -1,6 +1,7 @@
 #pragma once
 
 #include <deque>
+#include <functional>
 #include <vector>
 
 #include "linux/netlink_socket.h"
@@ -37,7 +38,7 @@ class RadioSocket {
     Known<RadioAbilities> abilities(std::uint32_t radio, const Until& until);
 
     /// Starts a scan; 0 or an errno, `EBUSY` while another one runs. What was told of earlier scans is forgotten,
-    /// so that the next event is this scan's, or, with `EBUSY`, the running one's.
+    /// so that the next event of the radio is this scan's, or, with `EBUSY`, the running one's.
     int startScan(std::uint32_t interfaceIndex, const ScanOrder& order, const Until& until);
     /// Ends a scan that was started here.
     void abortScan(std::uint32_t interfaceIndex);
@@ -48,13 +49,15 @@ class RadioSocket {
     Known<ScanEvent> nextScanStart(std::uint32_t interfaceIndex, const Until& until);
     /// The end of a scan of this interface.
     Known<ScanEvent> nextScanEnd(std::uint32_t interfaceIndex, const Until& until);
+    /// The end of a scan of any interface of the radio: as long as one of them scans, no other may.
+    Known<ScanEvent> nextScanEndOfRadio(std::uint32_t radio, const Until& until);
 
   private:
     RadioSocket(NetlinkSocket questions, RadioFamily family);
 
     NetlinkAnswer ask(std::uint8_t command, std::uint16_t flags, std::uint32_t interfaceIndex,
                       const Until& until);
-    Known<ScanEvent> nextScanEvent(std::uint32_t interfaceIndex, bool start, const Until& until);
+    Known<ScanEvent> nextScanEvent(const std::function<bool(const ScanEvent&)>& isWanted, const Until& until);
     void receiveWaitingEvents();
     void forgetEventsBeforeTheLatestStart(std::uint32_t interfaceIndex);
     NetlinkAnswer askAboutRadio(std::uint8_t command, std::uint32_t radio, const Until& until);

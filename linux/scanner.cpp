@@ -16,11 +16,11 @@ using std::chrono::milliseconds;
 constexpr int kListenAttempts = 3;
 // Managers put a scan off for some seconds when another one has just ended.
 constexpr std::chrono::seconds kManagersDelay{10};
-// A manager's scan calls: 30 to 110 ms on each of some 40 channels, more slowly while it is joined.
+// A scan of others mostly calls: 30 to 110 ms on each of some 40 channels, more slowly while the radio is joined.
 constexpr std::chrono::seconds kLongestRunningScan{8};
 
-bool isCancelled(const Error& error) {
-    return error.code == static_cast<int>(Reason::cancelled);
+bool is(const Error& error, Reason reason) {
+    return error.code == static_cast<int>(reason);
 }
 
 bool hearsOthers(const std::vector<AccessPoint>& found) {
@@ -113,7 +113,7 @@ class ScanRun {
     Known<ScanEvent> runningScansEnd(const Error& refusal) {
         const Known<ScanEvent> end =
             radio_.nextScanEnd(wish_.interfaceIndex, until_.within(kLongestRunningScan));
-        return end || isCancelled(end.error()) ? end : Known<ScanEvent>(refusal);
+        return end || is(end.error(), Reason::cancelled) ? end : Known<ScanEvent>(refusal);
     }
 
     ScanOrder fullOrder() const {
@@ -172,7 +172,7 @@ class ScanRun {
             if (waitReadable(-1, until_.within(row.pause())) == Wait::stopped)
                 return waitFailure(Wait::stopped, "scan");
             if (std::optional<Error> error = visit(row)) {
-                wasCutShort_ = error->code == static_cast<int>(Reason::timeout);
+                wasCutShort_ = is(*error, Reason::timeout);
                 return error;
             }
         }
@@ -186,18 +186,28 @@ class ScanRun {
         if (const Wait wait = leave(row, away); wait != Wait::ready) return waitFailure(wait, "scan");
         const int error = radio_.startScan(wish_.interfaceIndex, row.next(), until_);
         if (error == EINVAL && row.skip()) return std::nullopt;
-        if (error != 0 && error != EBUSY) return startFailure(error);
-        if (error == EBUSY) {
-            away.takenByOthers();
-            keepHeard();
-        }
-        const Known<ScanEvent> event = radio_.nextScanEnd(wish_.interfaceIndex, until_);
-        if (event) {
-            row.ended(error == 0 ? ScanRow::Whose::own : ScanRow::Whose::others, *event);
+        if (error == EBUSY) return waitForOthers(row, away);
+        if (error != 0) return startFailure(error);
+        const Known<ScanEvent> end = radio_.nextScanEnd(wish_.interfaceIndex, until_);
+        if (end) {
+            row.ended(ScanRow::Whose::own, *end);
             return std::nullopt;
         }
-        if (error == 0) radio_.abortScan(wish_.interfaceIndex);
-        return event.error();
+        radio_.abortScan(wish_.interfaceIndex);
+        return end.error();
+    }
+
+    /// Waits until the scan that is in the way has ended, on whichever interface of the radio. Where nobody tells its end
+    /// the row asks again.
+    std::optional<Error> waitForOthers(ScanRow& row, Away& away) {
+        away.takenByOthers();
+        keepHeard();
+        const Known<ScanEvent> end =
+            radio_.nextScanEndOfRadio(wish_.radio, until_.within(kLongestRunningScan));
+        const bool isUntold = !end && is(end.error(), Reason::timeout) && Clock::now() < until_.deadline;
+        if (!end && !isUntold) return end.error();
+        row.ended(ScanRow::Whose::others, end ? *end : ScanEvent{ScanEvent::Kind::aborted, 0, {}, false, 0});
+        return std::nullopt;
     }
 
     Wait leave(const ScanRow& row, Away& away) {
@@ -280,7 +290,7 @@ bool sees(const std::vector<AccessPoint>& found, const std::optional<NetworkName
 }
 
 bool isNotPermitted(const Known<ScanReport>& report) {
-    return !report && report.error().code == static_cast<int>(Reason::notPermitted);
+    return !report && is(report.error(), Reason::notPermitted);
 }
 
 /// What the system itself has heard lately, where that is young enough and more than the joined access point.

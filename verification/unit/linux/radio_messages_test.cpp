@@ -1,9 +1,12 @@
 #include "linux/radio_messages.h"
 
 #include <gtest/gtest.h>
+#include <linux/genetlink.h>
+#include <linux/nl80211.h>
 
 #include <algorithm>
 
+#include "linux/netlink_socket.h"
 #include "verification/unit/linux/captured.h"
 
 namespace wp {
@@ -187,6 +190,19 @@ TEST(RadioMessages, TellStartAndEndOfScans) {
     EXPECT_TRUE(events[3].probedForAll);
     EXPECT_GT(events[3].frequencies.size(), 11U);
     EXPECT_EQ(2412U, events[3].frequencies.front());
+}
+
+TEST(RadioMessages, TellTheEndOfAScanByAPeerToPeerDeviceThoughItHasNoInterface) {
+    NetlinkRequest message(0x1C, 0);
+    message.header<genlmsghdr>() = {NL80211_CMD_NEW_SCAN_RESULTS, 1, 0};
+    message.put(NL80211_ATTR_WIPHY, 3U);
+    const auto* begin = reinterpret_cast<const std::uint8_t*>(&message.message());
+
+    const auto events = readScanEvents({begin, message.message().nlmsg_len});
+
+    ASSERT_EQ(1U, events.size());
+    EXPECT_EQ(3U, events[0].radio);
+    EXPECT_EQ(0U, events[0].interfaceIndex);
 }
 
 TEST(RadioMessages, SurviveAnyCutOfADump) {
