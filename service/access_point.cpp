@@ -51,6 +51,22 @@ bool hides(const NetworkName& beacon, const NetworkName& answered) {
     return beacon.absent() || (beacon == NetworkName(kBlank) && !answered.absent() && answered != beacon);
 }
 
+/// What a beacon says, completed by the latest frame; of an access point of which no beacon was heard that frame. Broken
+/// off where both are.
+Elements united(const Elements& latest, const std::optional<Elements>& beacon) {
+    if (!beacon) return latest;
+    Elements elements = *beacon;
+    addMissingElements(elements, latest);
+    elements.malformed &= latest.malformed;
+    return elements;
+}
+
+std::optional<Elements> decodeBeacon(const Elements& inLatest, Bytes latest, std::optional<Bytes> beacon) {
+    if (!beacon) return std::nullopt;
+    // The latest frame often is the beacon.
+    return std::ranges::equal(*beacon, latest) ? inLatest : decodeElements(*beacon);
+}
+
 void readNames(Advertised& says, const Elements& latest, const std::optional<Elements>& beacon) {
     says.name = nameIn(latest);
     if (beacon) {
@@ -76,19 +92,12 @@ std::string textOf(const MacAddress& address) {
 }
 
 Advertised decodeAdvertised(std::uint16_t capability, Bytes latest, std::optional<Bytes> beacon) {
-    Elements elements = decodeElements(latest);
-    std::optional<Elements> inBeacon;
-    if (beacon) {
-        // The latest frame often is the beacon.
-        inBeacon = std::ranges::equal(*beacon, latest) ? elements : decodeElements(*beacon);
-    }
+    const Elements inLatest = decodeElements(latest);
+    const std::optional<Elements> inBeacon = decodeBeacon(inLatest, latest, beacon);
+    const Elements elements = united(inLatest, inBeacon);
     Advertised says;
-    readNames(says, elements, inBeacon);
-    if (inBeacon) {
-        says.dtimPeriod = byteAt(inBeacon->trafficMap, 1);
-        addMissingElements(elements, *inBeacon);
-        elements.malformed |= inBeacon->malformed;
-    }
+    readNames(says, inLatest, inBeacon);
+    if (inBeacon) says.dtimPeriod = byteAt(inBeacon->trafficMap, 1);
     readRates(says, elements.rates.bytes());
     readRates(says, elements.extendedRates.bytes());
     says.security = decodeSecurity(capability, elements);
@@ -103,8 +112,13 @@ Advertised decodeAdvertised(std::uint16_t capability, Bytes latest, std::optiona
     says.hotspot = elements.hotspot.present();
     says.onlineSignUp = elements.onlineSignUp.present();
     says.interworking = elements.interworking.present();
-    says.malformed = elements.malformed;
+    says.malformed = inLatest.malformed || (inBeacon && inBeacon->malformed);
     return says;
+}
+
+Elements elementsOf(const AccessPoint& accessPoint) {
+    const Elements inLatest = decodeElements(accessPoint.elements);
+    return united(inLatest, decodeBeacon(inLatest, accessPoint.elements, accessPoint.beaconElements));
 }
 
 std::string phyModesOf(const AccessPoint& accessPoint) {

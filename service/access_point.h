@@ -51,16 +51,20 @@ struct AccessPoint {
     std::optional<int> signal;             ///< dBm
     std::optional<std::int64_t> lastSeen;  ///< ms on the clock that counts suspended time too
     bool joined = false;                   ///< this device is joined to it
-    std::vector<std::uint8_t> elements;    ///< of the latest frame, beacon or probe response
+    std::vector<std::uint8_t> elements;    ///< of the latest probe response, else of the latest beacon
     std::optional<std::vector<std::uint8_t>> beaconElements;  ///< absent while no beacon was heard
     Advertised says;
 
     Band band() const { return bandOf(frequency); }
 };
 
-/// Reads the elements of a frame and, where one was heard, of a beacon, which complete each other. *Any*
-/// thread.
+/// Reads the elements of the latest frame, as far as the kernel tells, and of a beacon, where one was heard. They complete
+/// each other, and the beacon comes first: once a probe was answered the kernel keeps that answer for the latest frame
+/// however many beacons follow, hours later too where the access point is the joined one. *Any* thread.
 Advertised decodeAdvertised(std::uint16_t capability, Bytes latest, std::optional<Bytes> beacon);
+
+/// All elements of its beacon and of what else it sent, in the same order, as places in the access point. *Any* thread.
+Elements elementsOf(const AccessPoint& accessPoint);
 
 /// The modes that the access point offers, oldest first, for example "b/g/n" or "a/n/ac". 802.11ac has no
 /// place below 5 GHz and is not counted there.

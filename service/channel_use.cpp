@@ -61,7 +61,7 @@ ChannelUse byHt(const AccessPoint& accessPoint) {
 ChannelUse channelUseOf(const AccessPoint& accessPoint) {
     const Band band = accessPoint.band();
     if (band != Band::ghz5 && band != Band::ghz6) return byHt(accessPoint);
-    const Elements elements = decodeElements(accessPoint.elements);
+    const Elements elements = elementsOf(accessPoint);
     if (const auto use = byEht(band, elements.ehtOperation.bytes())) return *use;
     const auto use =
         band == Band::ghz5 ? byVht(elements.vhtOperation.bytes()) : byHe(elements.heOperation.bytes());

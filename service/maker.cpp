@@ -113,7 +113,8 @@ HotspotMatches hotspotMatches(const AccessPoint& accessPoint, const Known<std::s
                    std::equal(prefix.begin(), prefix.end(), accessPoint.address.begin());
         });
     matches.element = std::any_of(vendor.elements.begin(), vendor.elements.end(), [&](const auto& wanted) {
-        return hasElement(accessPoint.elements, wanted);
+        return hasElement(accessPoint.elements, wanted) ||
+               (accessPoint.beaconElements && hasElement(*accessPoint.beaconElements, wanted));
     });
     matches.leaseText =
         leaseText &&

@@ -392,6 +392,15 @@ TEST(ChannelUse, OfSixGigahertzIsInTheHeOperation) {
     EXPECT_EQ(use(6135, element(255, {36, 0, 0, 2, 0, 0, 0, 37, 2})).width, 20U);
 }
 
+TEST(ChannelUse, OfTheBeaconComesBeforeThatOfAnOldAnswer) {
+    AccessPoint moved = heard(element(192, {1, 42, 0, 0, 0}), 5180);
+    moved.elements = element(192, {0, 0, 0, 0, 0});
+    EXPECT_EQ(channelUseOf(moved).width, 80U);
+    moved.beaconElements = nameElement("Northlight");
+    moved.elements = element(192, {1, 42, 0, 0, 0});
+    EXPECT_EQ(channelUseOf(moved).width, 80U);
+}
+
 TEST(ChannelUse, OfTheLatestModeComesFirst) {
     const Frame eht = element(255, {106, 1, 0, 0, 0, 0, 4, 47, 31});
     EXPECT_EQ(use(6135, he6(3, 39, 47, false) + eht).width, 320U);

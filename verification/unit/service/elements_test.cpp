@@ -84,6 +84,32 @@ TEST(Elements, OfAnAnswerAreCompletedByTheBeacon) {
     EXPECT_EQ(3, elements.trafficMap.data[1]);
 }
 
+/// BSS Load of so many 255ths.
+Frame loadElement(std::uint8_t utilisation) {
+    return element(11, {2, 0, utilisation, 0, 0});
+}
+
+TEST(Advertised, OfAFreshBeaconCountsMoreThanThatOfAnOldAnswer) {
+    const Frame answer = nameElement("Home") + element(7, {'D', 'E', ' '}) + loadElement(20) +
+                         element(61, {6, 0}) + element(107, {0});
+    const Frame beacon = nameElement("") + element(5, {0, 3, 0, 0}) + loadElement(200) + element(61, {6, 1});
+
+    const Advertised says = decodeAdvertised(0, answer, Bytes(beacon));
+
+    EXPECT_EQ(200, says.load);
+    EXPECT_EQ(1, says.htSecondary);
+    EXPECT_EQ(3, says.dtimPeriod);
+    EXPECT_EQ(nameFromText("Home"), says.name);
+    EXPECT_EQ(true, says.hidesName);
+    EXPECT_EQ((CountryCode{'D', 'E'}), says.country);
+    EXPECT_TRUE(says.interworking);
+}
+
+TEST(Advertised, OfEitherFrameAloneIsWhatItSays) {
+    EXPECT_EQ(20, decodeAdvertised(0, loadElement(20), std::nullopt).load);
+    EXPECT_EQ(200, decodeAdvertised(0, {}, Bytes(loadElement(200))).load);
+}
+
 TEST(Elements, ReadNoByteBeyondAnyPrefixOfAFrame) {
     const Frame frame = nameElement("Home") + rsnElement(4, {4, 2}, {2, 8}) + wpaElement({2}, {2}) +
                         element(7, {'U', 'S', ' '}) + element(255, {35, 1});

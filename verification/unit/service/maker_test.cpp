@@ -107,6 +107,22 @@ TEST(VendorHotspot, IsKnownByAnElementAnAddressOrALease) {
     EXPECT_FALSE(found(isVendorHotspot(phone, std::string(), {{}, {}, {"EXAMPLE_METERED", ""}})));
 }
 
+TEST(VendorHotspot, IsKnownByAnElementInEitherFrame) {
+    const Vendors::Hotspot byElement{{{{0xAA, 0xBB, 0xCC}, std::uint8_t{9}}}, {}, {}};
+    AccessPoint phone = heard(vendorElement(0xAABBCC09));
+    phone.elements = nameElement("Phone");
+    EXPECT_TRUE(found(isVendorHotspot(phone, std::string(), byElement)));
+    std::swap(phone.elements, *phone.beaconElements);
+    EXPECT_TRUE(found(isVendorHotspot(phone, std::string(), byElement)));
+}
+
+TEST(VendorBaseStation, IsNamedByTheAnswerWhoseBeaconOnlySaysThatItHasWps) {
+    AccessPoint ours = heard(vendorElement(kWps, attribute(0x1044, "\x02")));
+    ours.elements = vendorElement(kWps, attribute(0x1021, "Example Networks") + attribute(0x1023, "Base 5"));
+    EXPECT_EQ(informationOf(isVendorBaseStation(ours, kSilent, kExample), "MarlixModelName"),
+              Value("Base 5"));
+}
+
 TEST(VendorHotspot, WithoutALeaseCannotBeToldWhereOnlyALeaseCould) {
     AccessPoint phone = heard(nameElement("Phone"));
     phone.address = {0x02, 0x1A, 0x11, 0xF0, 0x01, 0x02};
