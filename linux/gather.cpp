@@ -200,10 +200,14 @@ Known<AllowedChannels> gatherAllowedChannels(const Link& link, const Until& unti
     if (!radio) return radio.error();
     const Known<RadioAbilities> abilities = radio->abilities(link.radio, until);
     if (!abilities) return abilities.error();
+    return allowedAmong(abilities->channels);
+}
+
+AllowedChannels allowedAmong(const std::vector<RadioChannel>& channels) {
     AllowedChannels allowed;
-    for (const RadioChannel& each : abilities->channels) {
-        if (!each.disabled) allowed.push_back({each.frequency, each.passive, each.radar});
-    }
+    for (const RadioChannel& each : channels)
+        if (!each.disabled && each.carriesNetworks())
+            allowed.push_back({each.frequency, each.passive, each.radar});
     return allowed;
 }
 

@@ -31,8 +31,9 @@ bool answersAsNeighbour(const Link& link, const std::string& address, const Unti
 /// What the radio counted within one second on the channel of the joined network; nothing where none is joined or nothing
 /// is counted. Visits to other channels in between only make it longer.
 Known<Airtime> gatherAirtime(const Link& link, HomeChannel::Stay& stay, const Until& until);
-/// The channels that the radio and the regulatory domain allow.
+/// The channels on which radio and regulatory domain allow a network.
 Known<AllowedChannels> gatherAllowedChannels(const Link& link, const Until& until);
+AllowedChannels allowedAmong(const std::vector<RadioChannel>& channels);
 
 /// All station interfaces of this machine, those in use first.
 Known<std::vector<RadioInterface>> gatherStationInterfaces(const Until& until);

@@ -85,7 +85,7 @@ std::optional<int> stationSignal(const Attributes& station) {
 RadioChannel channelOf(const Attributes& frequency) {
     return {frequency.number<std::uint32_t>(NL80211_FREQUENCY_ATTR_FREQ).value_or(0),
             frequency.has(NL80211_FREQUENCY_ATTR_DISABLED), frequency.has(NL80211_FREQUENCY_ATTR_NO_IR),
-            frequency.has(NL80211_FREQUENCY_ATTR_RADAR)};
+            frequency.has(NL80211_FREQUENCY_ATTR_RADAR), frequency.has(NL80211_FREQUENCY_ATTR_NO_20MHZ)};
 }
 
 void addChannels(std::vector<RadioChannel>& channels, const Attributes& bands) {
@@ -145,6 +145,7 @@ bool RadioInterface::isStation() const {
 bool RadioChannel::carriesNetworks() const {
     constexpr std::uint32_t kMetersUntil = 1000, kVehiclesFrom = 5850, kVehiclesUntil = 5925,
                             kChannel149 = 5745;
+    if (narrow) return false;
     if (frequency < kVehiclesFrom || frequency > kVehiclesUntil) return frequency > kMetersUntil;
     return (frequency - kChannel149) % 20 == 0;
 }

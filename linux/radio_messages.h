@@ -51,6 +51,7 @@ struct RadioChannel {
     bool disabled = false;        ///< by the regulatory domain
     bool passive = false;         ///< nothing may be sent before a beacon was heard
     bool radar = false;
+    bool narrow = false;  ///< not allowed for 20 MHz
     /// Whether a network of a home can be there. From 5850 MHz on kernels also list the channels of vehicles, 5 and
     /// 10 MHz wide, between those of 20 MHz (IEEE 802.11, operating class 125), and below 1 GHz those of meters.
     bool carriesNetworks() const;

@@ -6,6 +6,7 @@
 
 #include <algorithm>
 
+#include "linux/gather.h"
 #include "linux/netlink_socket.h"
 #include "verification/unit/linux/captured.h"
 
@@ -13,6 +14,10 @@ namespace wp {
 namespace {
 
 using Buffer = std::vector<std::uint8_t>;
+
+Bytes messageBytes(NetlinkRequest& message) {
+    return {reinterpret_cast<const std::uint8_t*>(&message.message()), message.message().nlmsg_len};
+}
 
 const AccessPoint& joinedIn(const std::vector<AccessPoint>& accessPoints) {
     return *std::ranges::find_if(accessPoints, &AccessPoint::joined);
@@ -167,6 +172,39 @@ TEST(RadioMessages, KnowTheChannelsOfVehiclesFromThoseOfNetworks) {
     EXPECT_LT(leftOut.back(), 5955U);
 }
 
+TEST(RadioMessages, TellAChannelThatIsTooNarrowForNetworks) {
+    NetlinkRequest message(0x1C, 0);
+    message.header<genlmsghdr>() = {NL80211_CMD_NEW_WIPHY, 1, 0};
+    message.put(NL80211_ATTR_WIPHY, 0U);
+    nlattr* const bands = message.beginNest(NL80211_ATTR_WIPHY_BANDS);
+    nlattr* const band = message.beginNest(NL80211_BAND_5GHZ);
+    nlattr* const channels = message.beginNest(NL80211_BAND_ATTR_FREQS);
+    for (const std::uint16_t number : {0, 1}) {
+        nlattr* const channel = message.beginNest(number);
+        message.put(NL80211_FREQUENCY_ATTR_FREQ, 5845U + 20 * number);
+        if (number == 1) message.put(NL80211_FREQUENCY_ATTR_NO_20MHZ, Bytes());
+        message.endNest(channel);
+    }
+    for (nlattr* const nest : {channels, band, bands}) message.endNest(nest);
+
+    const auto abilities = readAbilities(messageBytes(message), 0);
+
+    ASSERT_TRUE(abilities);
+    ASSERT_EQ(2U, abilities->channels.size());
+    EXPECT_TRUE(abilities->channels[0].carriesNetworks());
+    EXPECT_FALSE(abilities->channels[1].carriesNetworks());
+}
+
+TEST(AllowedChannels, AreThoseOnWhichNetworksCanBe) {
+    const AllowedChannels allowed = allowedAmong(readAbilities(captured("good-home-wiphy"), 0)->channels);
+
+    std::vector<std::uint32_t> highest;
+    for (const auto& each : allowed)
+        if (each.frequency > 5805) highest.push_back(each.frequency);
+    EXPECT_EQ((std::vector<std::uint32_t>{5825, 5845, 5865, 5885}), highest);
+    EXPECT_EQ(2412U, allowed.front().frequency);
+}
+
 TEST(RadioMessages, KnowTheFifteenChannelsOf6GHzOnWhichNetworksAnnounceThemselves) {
     std::vector<std::uint32_t> announcing;
     for (std::uint32_t frequency = 5955; frequency <= 7115; frequency += 20)
@@ -196,9 +234,8 @@ TEST(RadioMessages, TellTheEndOfAScanByAPeerToPeerDeviceThoughItHasNoInterface) 
     NetlinkRequest message(0x1C, 0);
     message.header<genlmsghdr>() = {NL80211_CMD_NEW_SCAN_RESULTS, 1, 0};
     message.put(NL80211_ATTR_WIPHY, 3U);
-    const auto* begin = reinterpret_cast<const std::uint8_t*>(&message.message());
 
-    const auto events = readScanEvents({begin, message.message().nlmsg_len});
+    const auto events = readScanEvents(messageBytes(message));
 
     ASSERT_EQ(1U, events.size());
     EXPECT_EQ(3U, events[0].radio);
