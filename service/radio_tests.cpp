@@ -15,8 +15,13 @@ constexpr std::uint8_t kSecondaryBelow = 3;
 constexpr std::uint8_t kOlderStationsPresent = 1;
 constexpr std::uint8_t kProtectionInUse = 2;
 
-constexpr int kLowestSignal = -110;
-constexpr int kHighestSignal = -1;
+// dBm, of signal and noise. Beyond that are the numbers of drivers that do not measure, above all 0.
+constexpr int kLowestLevel = -110;
+constexpr int kHighestLevel = -1;
+
+bool isSensible(int level) {
+    return level >= kLowestLevel && level <= kHighestLevel;
+}
 
 /// World-wide and combined regulatory domains name no country that others could contradict.
 bool isCountry(const std::string& code) {
@@ -69,7 +74,8 @@ Known<int> signalOf(const Facts& facts, const AccessPoint& judged) {
 std::optional<int> noiseOf(const Facts& facts, const AccessPoint& judged) {
     if (!facts.survey) return std::nullopt;
     for (const SurveyedChannel& channel : *facts.survey) {
-        if (channel.frequency == judged.frequency && channel.noise) return channel.noise;
+        if (channel.frequency == judged.frequency && channel.noise && isSensible(*channel.noise))
+            return channel.noise;
     }
     return std::nullopt;
 }
@@ -122,9 +128,8 @@ Outcome signalIsPoor(const Facts& facts) {
     if (!judged) return judged.error();
     const Known<int> signal = signalOf(facts, **judged);
     if (!signal) return signal.error();
-    if (*signal < kLowestSignal || *signal > kHighestSignal) {
+    if (!isSensible(*signal))
         return failure(Reason::malformed, "the driver names a signal of " + std::to_string(*signal) + " dBm");
-    }
     Dictionary::Entries info{{"RSSI", std::int64_t{*signal}}};
     const std::optional<int> noise = noiseOf(facts, **judged);
     if (noise) info.emplace("Noise", std::int64_t{*noise});

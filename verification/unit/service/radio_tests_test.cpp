@@ -104,6 +104,17 @@ TEST(RadioTests, FindASignalPoorTooCloseToTheNoise) {
     EXPECT_TRUE(resultOf(32, facts));
 }
 
+TEST(RadioTests, TakeANoiseThatNoRadioHearsForNone) {
+    Facts facts = joinedTo({heard(kName, 2437, -50)});
+    for (const int noise : {0, 3, -111}) {
+        facts.survey = Survey{{2437, true, noise}};
+        EXPECT_FALSE(resultOf(32, facts)) << noise;
+        EXPECT_EQ(Value(), infoOf(32, facts, "Noise")) << noise;
+    }
+    facts.survey = Survey{{2437, false, 0}, {2437, true, -95}};
+    EXPECT_EQ(Value(-95), infoOf(32, facts, "Noise"));
+}
+
 TEST(RadioTests, NeverInventANoise) {
     Facts facts = joinedTo({heard(kName, 2437, -70)});
     facts.survey = Survey{{2437, true, std::nullopt}};
