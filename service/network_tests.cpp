@@ -22,7 +22,8 @@ bool differInSecurity(const std::vector<const AccessPoint*>& network) {
 
 Outcome securityProblem(const SecuritySuites& suites, bool found) {
     // What was read before the element broke off proves a finding, not the lack of one.
-    if (suites.malformed && !found) return failure(Reason::malformed, "the security element ends too early");
+    if (suites.malformed && !found)
+        return failure(Reason::malformed, "what the access point says of its security breaks off");
     return problem(found, {{"Security", nameOf(securityOf(suites))}});
 }
 
@@ -62,8 +63,11 @@ Outcome dtimIntervalIsLong(const Facts& facts) {
 Outcome securityIsOpen(const Facts& facts) {
     const Known<const AccessPoint*> judged = judgedAccessPoint(facts);
     if (!judged) return judged.error();
-    const Security security = securityOf((*judged)->says.security);
-    return problem(classOf(security) == SecurityClass::open, {{"Security", nameOf(security)}});
+    const SecuritySuites& suites = (*judged)->says.security;
+    const Security security = securityOf(suites);
+    // Whatever breaks off, one of these says that it is not open.
+    if (suites.privacy || suites.rsn || suites.wpa) return problem(false, {{"Security", nameOf(security)}});
+    return securityProblem(suites, classOf(security) == SecurityClass::open);
 }
 
 Outcome securityIsWep(const Facts& facts) {

@@ -157,6 +157,8 @@ Security personal(const SecuritySuites& suites) {
 SecuritySuites decodeSecurity(std::uint16_t capability, const Elements& elements) {
     SecuritySuites suites;
     suites.privacy = capability & kPrivacyBit;
+    // What broke off may have held one of them.
+    suites.malformed = elements.malformed && !elements.rsn.present() && !elements.wpa.present();
     suites.wapi = elements.wapi.present();
     suites.onlineSignUp = elements.onlineSignUp.present();
     suites.oweTransition = elements.oweTransition.present();

@@ -26,7 +26,7 @@ struct SecuritySuites {
     bool wapi = false;           ///< a WAPI element is there
     bool onlineSignUp = false;   ///< an online sign-up network, encrypted in a way of its own
     bool oweTransition = false;  ///< names an encrypted twin
-    bool malformed = false;      ///< a security element ended too early; what it says is incomplete
+    bool malformed = false;  ///< a security element, or the elements before it, ended too early; incomplete
     bool frameProtectionRequired = false;
     std::uint16_t keyManagement = 0;     ///< of the RSN element
     std::uint16_t wpaKeyManagement = 0;  ///< of the WPA element

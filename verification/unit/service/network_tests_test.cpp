@@ -136,6 +136,15 @@ TEST(NetworkTests, CannotTellAHiddenNameFromAnAnswerWithAName) {
     EXPECT_EQ(5, errorOf(43, joinedTo({answered})));
 }
 
+TEST(NetworkTests, CannotTellASecurityBeforeWhichTheElementsBreakOff) {
+    const Frame cut = nameElement("Home") + Frame{48, 20, 1, 0};
+    const Facts hidden = joinedTo({heard(cut, 2412, -50, kPrivacy)});
+    EXPECT_FALSE(resultOf(38, hidden));
+    EXPECT_EQ(10, errorOf(39, hidden));
+    EXPECT_EQ(10, errorOf(40, hidden));
+    EXPECT_EQ(10, errorOf(38, joinedTo({heard(cut)})));
+}
+
 TEST(NetworkTests, TellAHotspotFromItsSignUpNetwork) {
     EXPECT_TRUE(resultOf(45, joinedTo({heard(vendorElement(0x506F9A10, {0}))})));
     EXPECT_FALSE(resultOf(45, joinedTo({heard(vendorElement(0x506F9A10, {0}) + vendorElement(0x506F9A12))})));

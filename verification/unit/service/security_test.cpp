@@ -66,6 +66,24 @@ TEST(Security, IsUnknownWhenAnElementEndsWithinAField) {
     }
 }
 
+TEST(Security, IsUnknownWhenTheElementsBreakOffBeforeAnyOfSecurity) {
+    const Frame cut = nameElement("Home") + Frame{48, 20, 1, 0};
+    for (const std::uint16_t capability : {std::uint16_t{0}, kPrivacy})
+        EXPECT_EQ("Unknown", classified({"", capability, cut}));
+    EXPECT_EQ("WPA2 Personal", classified({"", kPrivacy, rsnElement(4, {4}, {2}) + cut}));
+}
+
+TEST(Security, IsKnownWhereOneOfTwoFramesIsWhole) {
+    const Frame whole = nameElement("Home");
+    const Frame cut = whole + Frame{48, 20, 1, 0};
+    for (const auto& says :
+         {decodeAdvertised(kPrivacy, whole, Bytes(cut)), decodeAdvertised(kPrivacy, cut, Bytes(whole))}) {
+        EXPECT_EQ(Security::wep, securityOf(says.security));
+        EXPECT_TRUE(says.malformed);
+    }
+    EXPECT_EQ(Security::unknown, securityOf(decodeAdvertised(kPrivacy, cut, Bytes(cut)).security));
+}
+
 TEST(Security, OfAPasswordWithSaeBesideItIsOneKindWithEither) {
     EXPECT_EQ(classOf(Security::wpa2Personal), classOf(Security::mixedWpa2Wpa3Personal));
     EXPECT_EQ(classOf(Security::wpa3Personal), classOf(Security::mixedWpa2Wpa3Personal));
