@@ -75,6 +75,12 @@ Known<Descriptor> ipSocket(int type, const IPAddress& address, const std::string
     return socket;
 }
 
+std::optional<Error> refusalOf(const std::string& interfaceName) {
+    if (interfaceName.empty()) return std::nullopt;
+    const auto socket = ipSocket(SOCK_DGRAM, *IPAddress::fromText("0.0.0.0"), interfaceName);
+    return socket ? std::nullopt : std::optional(socket.error());
+}
+
 Wait exchangeDatagrams(const Descriptor& socket, const SocketAddress& target, Bytes request,
                        const std::vector<std::chrono::milliseconds>& pauses, const AcceptDatagram& accept,
                        const Until& until) {

@@ -32,6 +32,10 @@ struct SocketAddress {
 /// \param type SOCK_DGRAM or SOCK_STREAM
 Known<Descriptor> ipSocket(int type, const IPAddress& address, const std::string& interfaceName);
 
+/// Why no socket can be bound to the interface; nothing where one can, or where none is named. Kernels before 5.7 want
+/// CAP_NET_RAW for it. Whoever leaves this out tells of a network that was never asked. *Any* thread.
+std::optional<Error> refusalOf(const std::string& interfaceName);
+
 /// Looks at one answer and where it came from; true ends the exchange.
 using AcceptDatagram = std::function<bool(Bytes message, const SocketAddress& sender)>;
 

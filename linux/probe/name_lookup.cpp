@@ -77,6 +77,7 @@ int bindToInterface(ares_socket_t socket, int, void* name) {
 /// \param whom outlives the channel
 /// \param moreFlags of the library, beyond that the name is taken as it is
 Known<Channel> openChannel(const NameServerSet& whom, int tries, int moreFlags = 0) {
+    if (const auto refusal = refusalOf(whom.interfaceName)) return *refusal;
     static const LibraryUser user;
     ares_options options{};
     char lookups[] = "b";

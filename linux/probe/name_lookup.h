@@ -18,7 +18,8 @@ struct NameServerSet {
 
 /// Asks for the name's addresses of both families at once, each server 2 s, twice. No cache and no hosts file of
 /// this device is looked into. What the servers say, and that none of them answers, are both answers; that there
-/// is none to be asked too. An error is only that the lookup was stopped, or could not begin. *Any* thread.
+/// is none to be asked too. An error is only that the lookup was stopped, or could not begin, above all because it may
+/// not go over the interface. *Any* thread.
 Known<NameAnswer> lookUpName(const std::string& name, const NameServerSet& whom, const Until& until);
 
 enum class RecordType : int { a = 1, aaaa = 28 };

@@ -7,6 +7,7 @@
 
 #include "linux/probe/connect_race.h"
 #include "linux/probe/http_answer.h"
+#include "linux/probe/ip_socket.h"
 #include "linux/probe/web_place.h"
 #include "linux/probe/web_stream.h"
 #include "linux/wait_any.h"
@@ -270,6 +271,8 @@ Known<std::vector<WebAnswer>> runWebRequests(const std::vector<WebRequest>& requ
         answers.push_back(std::nullopt);
         if (!place)
             answers.back() = failed("its URL is none of http or https");
+        else if (const auto refusal = refusalOf(request.interfaceName))
+            return *refusal;
         else if (addressesOf(request, *place).empty())
             answers.back() = failed("the name of its host has no address");
     }

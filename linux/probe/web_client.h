@@ -55,7 +55,8 @@ struct WebAnswer {
 using Conclusive = std::function<bool(const std::vector<std::optional<WebAnswer>>& answers)>;
 
 /// Runs the requests at once. An answer whose head has come counts with as much of its body as has come by the deadline,
-/// or before the connection broke. An error is only that all was stopped. *Any* thread.
+/// or before the connection broke. An error is only that all was stopped, or that nothing may go over the interface. *Any*
+/// thread.
 Known<std::vector<WebAnswer>> runWebRequests(const std::vector<WebRequest>& requests, const Until& until,
                                              const Conclusive& conclusive = nullptr);
 

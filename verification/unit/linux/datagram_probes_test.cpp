@@ -5,6 +5,7 @@
 
 #include "linux/probe/name_lookup.h"
 #include "linux/probe/translation_probes.h"
+#include "verification/unit/linux/fakes/refusing_kernel.h"
 #include "verification/unit/linux/fakes/udp_server.h"
 #include "verification/unit/linux/stop.h"
 
@@ -283,11 +284,19 @@ TEST(NameLookup, GoesOverNoOtherInterfaceWhereItsOwnIsGone) {
     gone.interfaceName = "none0";
     const auto answer = lookUpName("host.example", gone, patience());
     const auto each = askEachServer("host.example", gone, patience());
-    ASSERT_TRUE(answer && each);
-    EXPECT_TRUE(answer->addresses.empty());
-    EXPECT_EQ(answer->why, "Could not contact DNS servers");
-    EXPECT_FALSE(each->front().answered);
-    EXPECT_EQ(each->front().code, "unreachable");
+    ASSERT_FALSE(answer || each);
+    for (const Error& why : {answer.error(), each.error()})
+        EXPECT_EQ(why.text(), "cannot send over none0: No such device (code 1)");
+}
+
+TEST(NameLookup, ThatMayNotGoOverTheInterfaceTellsNothingOfTheNetwork) {
+    const UdpServer server([](const Message& query) { return dnsAnswer(query, {203, 0, 113, 7}, {}); });
+    NameServerSet bound = serverAt(server);
+    bound.interfaceName = "lo";
+    const auto answer =
+        fakes::whereBindingsAreRefused([&] { return lookUpName("host.example", bound, patience()); });
+    ASSERT_FALSE(answer);
+    EXPECT_EQ(answer.error().text(), "cannot send over lo: Operation not permitted (code 6)");
 }
 
 TEST(NameLookup, ALinkLocalServerIsOneLikeAnyOther) {

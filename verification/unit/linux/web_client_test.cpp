@@ -7,6 +7,7 @@
 #include <fstream>
 
 #include "verification/unit/fakes/temporary_folder.h"
+#include "verification/unit/linux/fakes/refusing_kernel.h"
 #include "verification/unit/linux/fakes/restless_server.h"
 #include "verification/unit/linux/fakes/web_server.h"
 #include "verification/unit/linux/stop.h"
@@ -233,6 +234,13 @@ TEST_F(WebClient, TriesTheNextAddressWhereOneFails) {
     request.addresses.pop_back();
     EXPECT_EQ(ask(request).end, End::failed);
     EXPECT_TRUE(ask(request).why.starts_with("no connection to 240.0.0.1: ")) << ask(request).why;
+}
+
+TEST_F(WebClient, ThatMayNotGoOverTheInterfaceTellsNothingOfTheNetwork) {
+    const auto answers =
+        fakes::whereBindingsAreRefused([] { return runWebRequests({plain("/204")}, patience()); });
+    ASSERT_FALSE(answers);
+    EXPECT_EQ(answers.error().text(), "cannot send over lo: Operation not permitted (code 6)");
 }
 
 TEST_F(WebClient, ASecureConnectionNeedsACertificateOfTheHost) {
