@@ -64,10 +64,16 @@ Known<WebRequest> requestFor(const std::string& url, const Link& link, const Lin
     return request;
 }
 
+/// A certificate that does not hold comes from somebody else or from the clock of this device.
+PortalAnswer::End portalEnd(const WebAnswer& answer, const WebRequest& request) {
+    if (answer.end == WebAnswer::End::answered) return PortalAnswer::End::answered;
+    const bool isAsked = !request.url.empty() && answer.end == WebAnswer::End::failed;
+    return isAsked ? PortalAnswer::End::noAnswer : PortalAnswer::End::untold;
+}
+
 PortalAnswer portalAnswer(const WebAnswer& answer, const WebRequest& request) {
     PortalAnswer portal;
-    portal.end =
-        answer.end == WebAnswer::End::answered ? PortalAnswer::End::answered : PortalAnswer::End::noAnswer;
+    portal.end = portalEnd(answer, request);
     portal.status = answer.status;
     portal.bodySize = answer.body.size();
     portal.location = answer.location;
@@ -100,10 +106,11 @@ Known<PortalDeclaration> askPortalApi(const Link& link, const LinkSetup& setup, 
     return declaration;
 }
 
-/// An open, redirecting or refusing plain answer decides alone; an empty page needs the other.
+/// A redirecting or refusing plain answer is a portal's, whatever the other says. An empty one is none, but how far the
+/// network reaches only both tell; the vendor's service is waited for as long.
 bool decides(const std::optional<WebAnswer>& plain) {
     if (!plain || plain->end != WebAnswer::End::answered) return false;
-    return plain->status == 204 || plain->status == 511 || (plain->status >= 300 && plain->status <= 399) ||
+    return plain->status == 511 || (plain->status >= 300 && plain->status <= 399) ||
            (plain->status == 200 && plain->body.size() > 1);
 }
 

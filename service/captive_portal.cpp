@@ -84,12 +84,12 @@ std::optional<Connectivity> connectivityOf(const PortalEvidence& evidence) {
     const auto judged = judgePortal(evidence);
     if (judged && judged->captive) return Connectivity::portal;
     const PortalAnswer& plain = evidence.plain;
+    if (evidence.secure.end == End::untold) return std::nullopt;
     const bool secure = opens(evidence.secure);
     if (!isAnswer(plain)) return secure ? Connectivity::partial : Connectivity::none;
-    if (plain.status == 204) return Connectivity::full;
-    const bool empty = isEmptyPage(plain);
-    if (secure) return empty ? Connectivity::full : Connectivity::partial;
-    return empty ? std::optional(Connectivity::partial) : std::nullopt;
+    const bool isThrough = plain.status == 204 || isEmptyPage(plain);
+    if (isThrough) return secure ? Connectivity::full : Connectivity::partial;
+    return secure ? std::optional(Connectivity::partial) : std::nullopt;
 }
 
 Outcome isCaptive(const Known<PortalEvidence>& evidence, const Known<SavedNetworks>& saved,

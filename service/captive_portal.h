@@ -11,7 +11,11 @@ namespace wp {
 
 /// What one request for the portal probe's page got. No redirect was followed.
 struct PortalAnswer {
-    enum class End { answered, noAnswer };
+    enum class End {
+        answered,
+        noAnswer,
+        untold,  ///< it was not asked, or this device could not judge who answered
+    };
     End end = End::noAnswer;
     int status = 0;
     std::uint64_t bodySize = 0;                 ///< as far as it came, whatever was announced
@@ -46,8 +50,8 @@ struct PortalVerdict {
     std::string why;
 };
 
-/// How far the joined network reaches, by the portal's probes: `partial` where only one of HTTP and HTTPS gets
-/// through, `none` where nothing answers.
+/// How far the joined network reaches, by the portal's probes: `full` where both HTTP and HTTPS get through, `partial` where
+/// only one of them does, `none` where nothing answers.
 enum class Connectivity { full, partial, portal, none };
 
 /// The network's own word comes first. Then the plain answer: 204 is open; a redirect or 511 is a portal; any other
@@ -60,7 +64,8 @@ enum class Connectivity { full, partial, portal, none };
 /// manager do.)
 Known<PortalVerdict> judgePortal(const PortalEvidence& evidence);
 
-/// What the probes say about the reach; nothing where a page that is neither empty nor a portal's tells nothing.
+/// What the probes say about the reach; nothing where a page that is neither empty nor a portal's tells nothing, or where
+/// nobody knows of HTTPS.
 std::optional<Connectivity> connectivityOf(const PortalEvidence& evidence);
 
 /// Test 46 for the joined network. Information: "PreferredNetwork", the remembered network.

@@ -247,6 +247,21 @@ TEST_F(GatherWeb, AnEmptyPageWaitsForTheSecureAnswer) {
     EXPECT_EQ(evidence.secure.status, 204);
 }
 
+TEST_F(GatherWeb, ThatHTTPGetsThroughSaysNothingOfHTTPS) {
+    EXPECT_EQ(connectivityOf(portal(endpoints())), Connectivity::full);
+    Endpoints closed = endpoints();
+    closed.portalSecure = "https://127.0.0.9:1/";  // nobody listens there
+    EXPECT_EQ(connectivityOf(portal(closed)), Connectivity::partial);
+    Endpoints stranger = endpoints();
+    stranger.certificateAuthorities.clear();
+    EXPECT_EQ(connectivityOf(portal(stranger)), std::nullopt) << "its certificate is nobody's";
+    stranger.certificateAuthorities = "/no/such/folder";
+    EXPECT_EQ(connectivityOf(portal(stranger)), std::nullopt);
+    Endpoints plainAlone = endpoints();
+    plainAlone.portalSecure.clear();
+    EXPECT_EQ(connectivityOf(portal(plainAlone)), std::nullopt);
+}
+
 TEST_F(GatherWeb, TheNetworksOwnWordIsAskedForOverASecureConnectionAlone) {
     LinkSetup setup;
     setup.portalApi = server_->secure("/api");

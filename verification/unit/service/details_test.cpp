@@ -158,11 +158,21 @@ TEST(Details, OfAPortalAreItsKindItsPageAndTheReach) {
 TEST(Details, TellHowFarTheNetworkReaches) {
     const PortalAnswer silent;
     const PortalAnswer open = answered(204);
+    PortalAnswer untold;
+    untold.end = PortalAnswer::End::untold;
     const std::tuple<PortalAnswer, PortalAnswer, const char*> rows[] = {
-        {answered(204), silent, R"("full")"},     {answered(200, 1), open, R"("full")"},
-        {silent, open, R"("partial")"},           {answered(200, 0), silent, R"("partial")"},
-        {answered(500, 9), open, R"("partial")"}, {silent, silent, R"("none")"},
-        {answered(302), open, R"("portal")"},     {answered(500, 9), silent, ""},
+        {open, open, R"("full")"},
+        {open, silent, R"("partial")"},
+        {open, untold, ""},
+        {silent, untold, ""},
+        {answered(302), untold, R"("portal")"},
+        {answered(200, 1), open, R"("full")"},
+        {silent, open, R"("partial")"},
+        {answered(200, 0), silent, R"("partial")"},
+        {answered(500, 9), open, R"("partial")"},
+        {silent, silent, R"("none")"},
+        {answered(302), open, R"("portal")"},
+        {answered(500, 9), silent, ""},
     };
     for (const auto& [plain, secure, expected] : rows)
         EXPECT_EQ(detail(46, withPortal(plain, secure), "connectivity"), expected) << plain.status;
