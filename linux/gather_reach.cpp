@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <ctime>
 #include <future>
+#include <system_error>
 
 #include "linux/address_details.h"
 #include "linux/probe/name_lookup.h"
@@ -54,9 +55,10 @@ Known<std::vector<IPAddress>> addressesOf(const std::string& host, const Link& l
 /// A request to a URL of the configuration, with the addresses of its host.
 Known<WebRequest> requestFor(const std::string& url, const Link& link, const LinkSetup& setup,
                              const Endpoints& endpoints, const Until& until) {
+    WebRequest request;
+    if (url.empty()) return request;
     const auto addresses = addressesOf(hostOf(url), link, setup, until);
     if (!addresses) return addresses.error();
-    WebRequest request;
     request.url = url;
     request.interfaceName = link.interfaceName;
     request.addresses = *addresses;
@@ -160,10 +162,14 @@ Known<ServiceContact> contact(const std::string& url, bool connectOnly, const Li
     return contactOf(answers->front());
 }
 
-/// Runs the function on a thread of its own.
+/// Runs the function on a thread of its own; where the system has none left, once its result is wanted.
 template <class Function>
 auto beside(Function function) {
-    return std::async(std::launch::async, std::move(function));
+    try {
+        return std::async(std::launch::async, function);
+    } catch (const std::system_error&) {
+        return std::async(std::launch::deferred, function);
+    }
 }
 
 template <class T>

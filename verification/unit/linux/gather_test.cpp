@@ -14,6 +14,7 @@
 #include "linux/gather_setup.h"
 #include "verification/unit/fakes/temporary_folder.h"
 #include "verification/unit/linux/fakes/loopback_socket.h"
+#include "verification/unit/linux/fakes/refusing_kernel.h"
 #include "verification/unit/linux/fakes/udp_server.h"
 #include "verification/unit/linux/fakes/web_server.h"
 #include "verification/unit/linux/stop.h"
@@ -199,6 +200,18 @@ TEST(GatherReach, EndpointsThatAreEmptyCannotBeTold) {
     EXPECT_EQ(textOf(contacts->retrieve), "no endpoint is configured for the vendor's service (code 9)");
 }
 
+TEST(GatherReach, AnEndpointThatIsEmptyIsNotLookedUp) {
+    Endpoints none;
+    none.portalPlain = none.portalSecure = "";
+    LinkSetup setup;
+    setup.servers = {*IPAddress::fromText("192.0.2.1")};
+    setup.portalApi = "urn:ietf:params:capport:unrestricted";
+    // To ask for a name would end as an error there.
+    const auto evidence =
+        fakes::whereBindingsAreRefused([&] { return gatherPortal(loopback(), setup, none, patience()); });
+    EXPECT_EQ(textOf(evidence), "known");
+}
+
 TEST(GatherReach, ALinkWithoutNameServersHasNoAnswer) {
     const auto answer = gatherNameAnswer(loopback(), {}, {}, patience());
     ASSERT_TRUE(answer);
@@ -260,6 +273,14 @@ TEST_F(GatherWeb, ThatHTTPGetsThroughSaysNothingOfHTTPS) {
     Endpoints plainAlone = endpoints();
     plainAlone.portalSecure.clear();
     EXPECT_EQ(connectivityOf(portal(plainAlone)), std::nullopt);
+}
+
+TEST_F(GatherWeb, NeedsNoFurtherThread) {
+    const auto contacts = fakes::whereThreadsAreRefused(
+        [] { return gatherVendorService(loopback(), {}, endpoints(), patience()); });
+    ASSERT_TRUE(contacts && contacts->reach && contacts->retrieve);
+    EXPECT_EQ(contacts->reach->end, ServiceContact::End::reached);
+    EXPECT_EQ(contacts->retrieve->status, 200);
 }
 
 TEST_F(GatherWeb, TheNetworksOwnWordIsAskedForOverASecureConnectionAlone) {
