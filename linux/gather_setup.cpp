@@ -139,8 +139,9 @@ Known<WebProxyPlaces> allProxies(const Known<BusValue>& settings) {
 }
 
 bool isPeerLink(std::uint32_t type) {
-    constexpr std::uint32_t kClient = 8, kOwner = 9, kAwareness = 12;  // nl80211_iftype
-    return type == kClient || type == kOwner || type == kAwareness;
+    // Neighbour awareness has no interface, and the kernel tells no channel of it.
+    constexpr std::uint32_t kClient = 8, kOwner = 9;  // nl80211_iftype
+    return type == kClient || type == kOwner;
 }
 
 }  // namespace

@@ -9,7 +9,7 @@
 
 namespace wp {
 
-/// A direct link to another device (Wi-Fi Direct or neighbour awareness) that shares the station's radio.
+/// A direct link to another device (Wi-Fi Direct) that shares the station's radio.
 struct PeerLink {
     std::string interfaceName;
     std::uint32_t frequency = 0;  ///< MHz; 0 while the link is not active
