@@ -23,11 +23,12 @@ std::string errorText() {
 class NewFile {
   public:
     explicit NewFile(const std::string& path) {
-        fs::path wanted(path);
+        fs::path folder = fs::path(path).parent_path();
         for (int attempt = 0; attempt < 100 && descriptor_ < 0; ++attempt) {
-            std::string name = "." + wanted.filename().string() + ".new-" + std::to_string(getpid()) + "-" +
-                               std::to_string(attempt);
-            path_ = (wanted.parent_path() / name).string();
+            // A name of its own: with anything added the wanted file's could be too long.
+            std::string name =
+                ".wifi-profile-" + std::to_string(getpid()) + "-" + std::to_string(attempt) + ".new";
+            path_ = (folder / name).string();
             descriptor_ = open(path_.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
             if (descriptor_ < 0 && errno != EEXIST) return;
         }

@@ -108,6 +108,15 @@ TEST_F(OutputFileTest, EverySpellingOfAPathLeadsToTheSameFile) {
     EXPECT_NE(finalFile(path("other.json")), result);
 }
 
+TEST_F(OutputFileTest, TheLongestNameOfAllIsWritten) {
+    std::string longest(255, 'x');
+
+    OutputFile("--output", path(longest)).write("new");
+
+    EXPECT_EQ(content(path(longest)), "new");
+    EXPECT_EQ(filesInFolder(), 1u);
+}
+
 TEST_F(OutputFileTest, AFailedWriteLeavesTheOldFileAndNoOther) {
     put("result.json", "old");
     OutputFile file("--output", path("result.json"));
