@@ -22,9 +22,10 @@ DiagnosticsTestResponse Journal::runTestRequests(const std::vector<DiagnosticsTe
 
 DiagnosticsStatusResponse Journal::queryStatus() {
     DiagnosticsStatusResponse response = client_.queryStatus();
-    if (response.status) {
+    // What stands beside an error the diagnostic does not take for the joined network, either.
+    if (!response.error || response.error->code == 0) {
         std::lock_guard lock(mutex_);
-        joinedName_ = response.status->ssid;
+        joinedName_ = response.status ? response.status->ssid : std::nullopt;
     }
     return response;
 }
