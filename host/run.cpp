@@ -52,6 +52,25 @@ std::unique_ptr<Transcript> transcriptOf(const RunOptions& options, const Prepar
 /// Whether somebody watches the run, or its evidence alone is wanted, at once and without a word.
 enum class Purpose { run, evidence };
 
+/// Things to do one after another, whatever becomes of the others.
+class Attempts {
+  public:
+    void make(const std::function<void()>& attempt) {
+        try {
+            attempt();
+        } catch (const Exit&) {
+            if (!failure_) failure_ = std::current_exception();
+        }
+    }
+    /// Throws what the first that failed threw.
+    void end() const {
+        if (failure_) std::rethrow_exception(failure_);
+    }
+
+  private:
+    std::exception_ptr failure_;
+};
+
 /// One run: all that a diagnostic sees, in the order in which it is made.
 class Run {
   public:
@@ -80,8 +99,7 @@ class Run {
                     backgroundQueue_,
                     log_,
                     localization_,
-                    screen_},
-          transcript_(transcriptOf(options, prepared)) {
+                    screen_} {
         if (purpose == Purpose::evidence) log_.mute();
     }
 
@@ -127,7 +145,7 @@ class Run {
     int conclude(const std::optional<std::string>& obstacle);
     void presentResult();
     void closeScreen();
-    void writeOutputs(bool withResult);
+    void writeRecords(Attempts& attempts);
     void writeResult();
     Evidence evidence() const;
     Report report(const Evidence& found) const;
@@ -200,6 +218,8 @@ std::optional<std::string> Run::drive() {
     frontEnd_ = makeFrontEnd(prepared_.screen, screen_, mainQueue_, localization_, log_);
     if (prepared_.screen == ScreenChoice::terminal && isatty(STDERR_FILENO)) log_.hold();
     if (isWatched() && !asksForList(*prepared_.parameters)) showRunningPage();
+    // A run that is refused has left an earlier transcript as it was.
+    transcript_ = transcriptOf(options_, prepared_);
     isUnderWay_ = true;
     if (!isBrokenOff()) controller_->start();
     remote::RemoteControl remote({screen_, *frontEnd_, mainQueue_, activity_, [this] { return isOver(); },
@@ -237,7 +257,9 @@ int Run::conclude(const std::optional<std::string>& obstacle) {
         presentResult();
     } else {
         closeScreen();
-        writeOutputs(false);
+        Attempts attempts;
+        writeRecords(attempts);
+        attempts.end();
     }
     if (interrupted) return *interrupted;
     if (hasLeft_) return exit_status::leftByUser;
@@ -251,12 +273,15 @@ void Run::presentResult() {
     bool hasPage = !options_.noClosingPage && isWatched();
     bool isPrintedLater = hasPage && !prepared_.output && isatty(STDOUT_FILENO);
     if (!hasPage) closeScreen();
-    writeOutputs(!isPrintedLater);
+    Attempts attempts;
+    if (!isPrintedLater) attempts.make([this] { writeResult(); });
+    writeRecords(attempts);
     if (hasPage)
         showClosingPage(std::make_shared<ClosingPage>(report(evidence()), texts_), screen_, *frontEnd_,
                         kClosingPageTime, [this] { return interruption_->exitStatus().has_value(); });
     closeScreen();
-    if (isPrintedLater) writeResult();
+    if (isPrintedLater) attempts.make([this] { writeResult(); });
+    attempts.end();
 }
 
 void Run::closeScreen() {
@@ -264,20 +289,10 @@ void Run::closeScreen() {
     log_.release();
 }
 
-/// Writes each of the three, whatever becomes of the others; the first that could not be written fails the run.
-void Run::writeOutputs(bool withResult) {
-    std::exception_ptr failure;
-    auto attempt = [&failure](const std::function<void()>& write) {
-        try {
-            write();
-        } catch (const Exit&) {
-            if (!failure) failure = std::current_exception();
-        }
-    };
-    if (withResult) attempt([this] { writeResult(); });
-    attempt([this] { automation_.write(); });
-    attempt([this] { services_->writeRecording(); });
-    if (failure) std::rethrow_exception(failure);
+/// Beside the result.
+void Run::writeRecords(Attempts& attempts) {
+    attempts.make([this] { automation_.write(); });
+    attempts.make([this] { services_->writeRecording(); });
 }
 
 Evidence Run::evidence() const {

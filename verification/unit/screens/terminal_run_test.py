@@ -159,6 +159,16 @@ class TerminalRun(unittest.TestCase):
         self.assertEqual(terminal.waitForFile("status"), "0")
         self.assertIn("The signal is weak.", terminal.waitFor(OVER))
 
+    def testPrintsTheResultThoughAnotherFileCannotBeWritten(self):
+        terminal = self.start(QUICK, "--screen terminal --format text --automation /dev/full", output="")
+        terminal.waitFor("The test is finished")
+        terminal.press("Enter")
+        self.assertEqual(terminal.waitForFile("status"), "1")
+        self.assertRestored(terminal)
+        picture = terminal.picture("-S", "-200")
+        self.assertIn("The signal is weak.", picture)
+        self.assertIn("--automation: /dev/full: not written: No space left on device", picture)
+
     def testKeepsTheResultThatASignalFindsOnTheClosingPage(self):
         terminal = self.start(QUICK, "--screen terminal", output="")
         terminal.waitFor("The test is finished")
