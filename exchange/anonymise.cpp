@@ -82,10 +82,11 @@ class NameCollector {
 
 class Anonymiser {
   public:
-    explicit Anonymiser(const Recording& recording) : names_(NameCollector().collect(recording)) {}
+    explicit Anonymiser(const std::set<std::string>& names) : names_(names) {}
 
     void replaceIn(Recording& recording) {
         recording.description = sentence(recording.description);
+        for (std::string& device : recording.wifi.devices) device = addresses_.replacedWithin(device);
         for (DiagnosticsStatusResponse& status : recording.status) {
             if (status.status) status.status = std::make_shared<const WiFiStatus>(record(*status.status));
             replaceIn(status.error);
@@ -124,7 +125,7 @@ class Anonymiser {
     Value replaced(const Value& value) {
         if (const auto* text = value.as<std::string>()) {
             std::string name = names_.replaced(*text);
-            return name == *text ? addresses_.replacedWithin(*text) : name;
+            return name == *text ? sentence(name) : name;
         }
         if (const auto* array = value.as<ArrayPointer>(); array && *array) {
             Array elements;
@@ -168,6 +169,11 @@ class Anonymiser {
             if (copy->ssid) copy->ssid = names_.replaced(*copy->ssid);
             return copy;
         }
+        if (auto pinged = value.asRecord<PingStatistics>()) {
+            auto copy = std::make_shared<PingStatistics>(*pinged);
+            if (copy->interfaceName) copy->interfaceName = addresses_.replacedWithin(*copy->interfaceName);
+            return copy;
+        }
         return value;
     }
 
@@ -185,10 +191,16 @@ class Anonymiser {
 
 }  // namespace
 
-Recording anonymised(const Recording& recording) {
+Recording anonymised(const Recording& recording, const std::set<std::string>& otherNames) {
+    std::set<std::string> names = networkNamesIn(recording);
+    names.insert(otherNames.begin(), otherNames.end());
     Recording copy = recording;
-    Anonymiser(recording).replaceIn(copy);
+    Anonymiser(names).replaceIn(copy);
     return copy;
+}
+
+std::set<std::string> networkNamesIn(const Recording& recording) {
+    return NameCollector().collect(recording);
 }
 
 }  // namespace wp

@@ -2,6 +2,7 @@
 
 #include <arpa/inet.h>
 
+#include <algorithm>
 #include <array>
 #include <cstdio>
 
@@ -32,6 +33,19 @@ std::string hardwareDigits(std::string_view word) {
         if (!isSeparator) digits += c >= 'A' && c <= 'F' ? static_cast<char>(c - 'A' + 'a') : c;
     }
     return digits;
+}
+
+constexpr std::size_t kInterfacePrefix = 3;
+
+/// The name of an interface after its hardware address, as the system calls adapters without a fixed place, where
+/// the text begins with one; else empty.
+std::string_view addressedInterface(std::string_view text) {
+    std::string_view name = text.substr(0, kInterfacePrefix + 12);
+    bool isKind = name.starts_with("wlx") || name.starts_with("enx") || name.starts_with("wwx");
+    if (!isKind || name.size() < kInterfacePrefix + 12) return {};
+    if (!std::ranges::all_of(name.substr(kInterfacePrefix), isHex)) return {};
+    bool goesOn = text.size() > name.size() && isWordByte(static_cast<unsigned char>(text[name.size()]));
+    return goesOn ? std::string_view() : name;
 }
 
 /// The number of the key, counted from 1 in the order of first use.
@@ -101,6 +115,15 @@ std::string AnonymousAddresses::ipv6(const std::string& word) {
     return text.data();
 }
 
+std::string AnonymousAddresses::interfaceName(std::string_view name) {
+    std::string address;
+    for (std::size_t i = kInterfacePrefix; i < name.size(); i += 2)
+        address += (address.empty() ? "" : ":") + std::string(name.substr(i, 2));
+    std::string digits = hardwareAddress(address);
+    std::erase(digits, ':');
+    return std::string(name.substr(0, kInterfacePrefix)) + digits;
+}
+
 std::string AnonymousAddresses::replacement(const std::string& word) {
     if (!hardwareDigits(word).empty()) return hardwareAddress(word);
     std::size_t colon = word.find(':');
@@ -114,6 +137,13 @@ std::string AnonymousAddresses::replacedWithin(std::string_view text) {
     std::string out;
     std::size_t i = 0;
     while (i < text.size()) {
+        bool beginsWord = i == 0 || !isWordByte(static_cast<unsigned char>(text[i - 1]));
+        std::string_view name = beginsWord ? addressedInterface(text.substr(i)) : std::string_view();
+        if (!name.empty()) {
+            out += interfaceName(name);
+            i += name.size();
+            continue;
+        }
         std::size_t end = i;
         while (end < text.size() && isAddressByte(text[end])) ++end;
         if (end == i) {  // a word that is no address is copied as a whole, its hexadecimal letters too

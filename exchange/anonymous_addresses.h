@@ -14,10 +14,12 @@ class AnonymousAddresses {
     /// The replacement of a BSSID field, whatever its form.
     std::string hardwareAddress(const std::string& address);
 
-    /// The text with each address in it replaced.
+    /// The text with each address in it replaced, and each in the name of an interface that is made from one
+    /// ("wlx" and its digits).
     std::string replacedWithin(std::string_view text);
 
   private:
+    std::string interfaceName(std::string_view name);
     std::string replacement(const std::string& word);
     std::string ipv4(const std::string& word);
     std::string ipv6(const std::string& word);

@@ -3,6 +3,8 @@
 #include <chrono>
 #include <mutex>
 #include <optional>
+#include <set>
+#include <string>
 
 #include "exchange/anonymise.h"
 #include "exchange/live.h"
@@ -66,9 +68,10 @@ class RecordedServices final : public Services {
         : services_(std::move(services)),
           recorder_(services_->diagnosticsClient(), services_->wifiManager(), services_->capabilities()),
           file_(*prepared.record),
-          isAnonymous_(options.anonymise) {
+          isAnonymous_(options.anonymise),
+          replayed_(prepared.recording) {
         recorder_.setAutomation(isAutomated() || options.automationFile);
-        if (prepared.recording) recorder_.setDescription(prepared.recording->description);
+        if (replayed_) recorder_.setDescription(replayed_->description);
     }
 
     DiagnosticsClient& diagnosticsClient() override { return recorder_.diagnostics(); }
@@ -82,14 +85,20 @@ class RecordedServices final : public Services {
     void writeRecording() override {
         stopRecording();
         const Recording& recording = *stopped_;
-        file_.write(recordingText(isAnonymous_ ? anonymised(recording) : recording));
+        file_.write(recordingText(isAnonymous_ ? withoutNames(recording) : recording));
     }
 
   private:
+    /// The description may tell of networks that this run did not come upon.
+    Recording withoutNames(const Recording& recording) const {
+        return anonymised(recording, replayed_ ? networkNamesIn(*replayed_) : std::set<std::string>());
+    }
+
     std::unique_ptr<Services> services_;
     Recorder recorder_;
     OutputFile file_;
     bool isAnonymous_;
+    std::shared_ptr<const Recording> replayed_;  ///< null: the run is live
     std::mutex mutex_;
     std::optional<Recording> stopped_;
 };

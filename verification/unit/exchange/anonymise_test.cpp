@@ -5,6 +5,7 @@
 #include "exchange/anonymous_addresses.h"
 #include "exchange/anonymous_names.h"
 #include "platform/json_writer.h"
+#include "platform/records.h"
 #include "verification/unit/exchange/recordings.h"
 
 namespace wp {
@@ -109,6 +110,61 @@ TEST(Anonymise, ReplacesPublicIPAddressesAndKeepsPrivateOnes) {
     EXPECT_EQ(addresses.replacedWithin("fe80::1%wlan0"), "fe80::1%wlan0");
     EXPECT_EQ(addresses.replacedWithin("[2a00:1450:0::9]:443"), "[2001:db8::2]:443");
     EXPECT_EQ(addresses.replacedWithin("fd12:3456::1"), "fd00::3");
+}
+
+TEST(Anonymise, ReplacesTheHardwareAddressInTheNameOfAnInterface) {
+    AnonymousAddresses addresses;
+
+    EXPECT_EQ(addresses.replacedWithin("wlx1c61b4a1b2c3 (1c:61:b4:a1:b2:c3), enx00e04c680001: down"),
+              "wlx020000000001 (02:00:00:00:00:01), enx020000000002: down");
+    for (const char* kept :
+         {"wlan0", "wlp3s0", "enx00e04c68000", "enx00e04c680001a", "awlx1c61b4a1b2c3", "wlx1c61b4a1b2cg"})
+        EXPECT_EQ(addresses.replacedWithin(kept), kept);
+}
+
+TEST(Anonymise, ReplacesNamesOfInterfacesWhereverTheyStand) {
+    auto pinged = std::make_shared<PingStatistics>();
+    pinged->interfaceName = "wlx1c61b4a1b2c3";
+    Recording recording;
+    recording.description = "wlx1c61b4a1b2c3 at home";
+    recording.wifi.devices = {"wlx1c61b4a1b2c3", "wlan1"};
+    recording.answers.emplace_back();
+    recording.answers[0].response.error = Error{1, "enx1c61b4a1b2c3 is down"};
+    recording.answers[0].response.results =
+        DiagnosticsTestResults{std::make_shared<DiagnosticsTestResult>(DiagnosticsTestResult{
+            true, true,
+            Dictionary::make({{"PingResult", pinged},
+                              {"Details", Dictionary::make({{"links", Array{"wlx1c61b4a1b2c3"}}})}})})};
+
+    const Recording without = anonymised(recording);
+
+    EXPECT_EQ(without.wifi.devices, (std::vector<std::string>{"wlx020000000001", "wlan1"}));
+    EXPECT_EQ(recordingText(without).find("1c61b4a1b2c3"), std::string::npos) << recordingText(without);
+    EXPECT_EQ(recordingText(without), recordingText(anonymised(without)));
+}
+
+TEST(Anonymise, ReplacesNamesInTheMiddleOfAnInfoText) {
+    Recording recording;
+    auto joined = std::make_shared<WiFiStatus>();
+    joined->ssid = "Office";
+    recording.status = {{joined, std::nullopt}};
+    recording.answers.emplace_back();
+    recording.answers[0].response.results =
+        DiagnosticsTestResults{std::make_shared<DiagnosticsTestResult>(DiagnosticsTestResult{
+            true, true, Dictionary::make({{"Text", "The Office net"}, {"Security", "Office"}})})};
+
+    const Recording without = anonymised(recording);
+
+    EXPECT_EQ(jsonText(without.answers[0].response.results->front()->info, JSONStyle::compact),
+              R"({"Security":"Office","Text":"The Net 0001 net"})");
+}
+
+TEST(Anonymise, TakesNamesThatItIsToldForNetworksToo) {
+    Recording recording;
+    recording.description = "Loft beside Cellar";
+
+    EXPECT_EQ(anonymised(recording, {"Loft", "Cellar"}).description, "Net 0002 beside Net 0001");
+    EXPECT_EQ(anonymised(recording).description, "Loft beside Cellar");
 }
 
 TEST(Anonymise, TakesNothingElseForAnAddress) {
