@@ -3,6 +3,7 @@
 #include <csignal>
 #include <exception>
 #include <string>
+#include <system_error>
 #include <vector>
 
 #include "host/arguments.h"
@@ -51,6 +52,9 @@ int guarded(const std::vector<std::string>& words) {
     } catch (const Exit& exit) {
         log.message(exit.what());
         return exit.status();
+    } catch (const std::system_error& error) {
+        log.message(std::string("cannot go on: the system refuses a thread or a lock: ") + error.what());
+        return exit_status::failure;
     } catch (const std::exception& exception) {
         log.message(std::string("cannot go on: ") + exception.what());
         return exit_status::failure;

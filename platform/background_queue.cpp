@@ -1,6 +1,13 @@
 #include "platform/background_queue.h"
 
+#include <system_error>
+
 namespace wp {
+
+BackgroundQueue::BackgroundQueue(Activity& activity, Delays delays) : activity_(activity), delays_(delays) {
+    std::lock_guard lock(mutex_);
+    makeThread();
+}
 
 BackgroundQueue::~BackgroundQueue() {
     std::vector<std::thread> threads;
@@ -51,10 +58,17 @@ void BackgroundQueue::after(std::chrono::milliseconds delay, Block block) {
 void BackgroundQueue::makeThreadIfNeeded() {
     // One thread more than there is ready work for keeps watch over the delayed blocks.
     std::size_t wanted = ready_.size() + (delayed_.empty() ? 0 : 1);
-    if (waiting_ < wanted) {
-        ++waiting_;
-        threads_.emplace_back([this] { work(); });
+    if (waiting_ >= wanted) return;
+    try {
+        makeThread();
+    } catch (const std::system_error&) {
+        // The threads that there are come to the block after their own.
     }
+}
+
+void BackgroundQueue::makeThread() {
+    threads_.emplace_back([this] { work(); });
+    ++waiting_;
 }
 
 void BackgroundQueue::work() {

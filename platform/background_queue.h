@@ -13,13 +13,14 @@
 namespace wp {
 
 /// The global background queue: concurrent, so that a block that waits for a service never keeps another from
-/// running. Threads are made as they are needed and reused. *Any* thread.
+/// running. Threads are made as they are needed and reused; where the system refuses another one, blocks wait for
+/// those that there are. *Any* thread.
 class BackgroundQueue final : public Queue {
   public:
     /// With `Delays::skipped` a delayed block is ready at once: for a run whose end nobody watches.
     enum class Delays { kept, skipped };
-    explicit BackgroundQueue(Activity& activity, Delays delays = Delays::kept)
-        : activity_(activity), delays_(delays) {}
+    /// Makes the first thread. Throws std::system_error where the system refuses even that.
+    explicit BackgroundQueue(Activity& activity, Delays delays = Delays::kept);
     /// Waits for the blocks that run; drops those that have not begun.
     ~BackgroundQueue() override;
 
@@ -36,6 +37,7 @@ class BackgroundQueue final : public Queue {
 
     void work();
     void makeThreadIfNeeded();
+    void makeThread();
     void dropDelayed(std::unique_lock<std::mutex>& lock);
 
     Activity& activity_;

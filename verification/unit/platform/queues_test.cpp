@@ -1,7 +1,11 @@
 #include <gtest/gtest.h>
+#include <sys/resource.h>
+#include <unistd.h>
 
 #include <atomic>
 #include <latch>
+#include <system_error>
+#include <thread>
 #include <vector>
 
 #include "platform/background_queue.h"
@@ -139,6 +143,48 @@ TEST(BackgroundQueue, DropsDelayedBlocksWhenItIsDrainedForGood) {
 
     EXPECT_FALSE(ran);
     EXPECT_TRUE(activity.idle());
+}
+
+/// From here on the system refuses this process every further thread.
+void letNoMoreThreadsBeMade() {
+    const rlimit none{0, 0};
+    ASSERT_EQ(setrlimit(RLIMIT_NPROC, &none), 0);
+    constexpr uid_t nobody = 65534;
+    // The limit does not hold for root.
+    if (geteuid() == 0) {
+        ASSERT_EQ(setresuid(nobody, nobody, nobody), 0);
+    }
+    ASSERT_THROW(std::thread([] {}).join(), std::system_error);
+}
+
+TEST(BackgroundQueue, RunsItsBlocksOnOneThreadWhereTheSystemRefusesMore) {
+    const auto runBlocks = [] {
+        Activity activity;
+        BackgroundQueue queue(activity);
+        letNoMoreThreadsBeMade();
+        std::atomic<int> count = 0;
+
+        queue.after(1ms, [&] { ++count; });
+        queue.async([&] {
+            ++count;
+            queue.async([&] { ++count; });
+        });
+        queue.drain(BackgroundQueue::Delayed::keep);
+        while (!activity.idle()) std::this_thread::sleep_for(1ms);
+
+        _exit(testing::Test::HasFailure() ? 1 : count.load());
+    };
+    EXPECT_EXIT(runBlocks(), testing::ExitedWithCode(3), "");
+}
+
+TEST(BackgroundQueue, IsNotMadeWhereTheSystemRefusesAThread) {
+    const auto make = [] {
+        letNoMoreThreadsBeMade();
+        Activity activity;
+        EXPECT_THROW(BackgroundQueue queue(activity), std::system_error);
+        _exit(testing::Test::HasFailure() ? 1 : 0);
+    };
+    EXPECT_EXIT(make(), testing::ExitedWithCode(0), "");
 }
 
 TEST(Activity, TellsWhenTheLastWorkEnds) {
