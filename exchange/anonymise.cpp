@@ -16,7 +16,8 @@ constexpr std::array<std::string_view, 6> kKeptKeys{"AdoptedCountryCode", "IPv4C
                                                     "Security",           "SupportedPHYModes"};
 /// Info keys whose texts are network names, also of networks that nothing else mentions.
 constexpr std::array<std::string_view, 4> kNameKeys{"NetworkName", "SSID", "networkName", "ssid"};
-constexpr std::string_view kDetails = "Details", kDetailName = "ssid", kDetailPage = "url";
+constexpr std::string_view kDetails = "Details", kDetailName = "ssid", kDetailPage = "url",
+                           kDetailWhy = "why";
 
 template <std::size_t count>
 bool contains(const std::array<std::string_view, count>& keys, std::string_view key) {
@@ -141,10 +142,12 @@ class Anonymiser {
         return replacedRecord(value);
     }
 
-    /// Details hold names under one key alone; any other text may equal a name by chance and is a word of its own.
+    /// Details hold names under one key alone, and the words of others under another; any other text may equal a name
+    /// by chance and is a word of its own.
     Value replacedInDetails(std::string_view key, const Value& value) {
         if (const auto* text = value.as<std::string>()) {
             if (key == kDetailName) return names_.replaced(*text);
+            if (key == kDetailWhy) return sentence(*text);
             return key == kDetailPage ? hiddenPage(*text) : addresses_.replacedWithin(*text);
         }
         if (const auto* array = value.as<ArrayPointer>(); array && *array) {

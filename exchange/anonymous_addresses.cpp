@@ -13,39 +13,61 @@ bool isHex(char c) {
     return (c >= '0' && c <= '9') || (c >= 'a' && c <= 'f') || (c >= 'A' && c <= 'F');
 }
 
-bool isAddressByte(char c) {
-    return isHex(c) || c == ':' || c == '.' || c == '-';
-}
-
 bool isWordByte(unsigned char c) {
-    return (c >= '0' && c <= '9') || (c >= 'A' && c <= 'Z') || (c >= 'a' && c <= 'z') || c == '_' ||
-           c >= 0x80;
+    return (c >= '0' && c <= '9') || (c >= 'A' && c <= 'Z') || (c >= 'a' && c <= 'z') || c >= 0x80;
 }
 
-/// Six pairs of hexadecimal digits with one kind of separator; the digits in lower case, else empty.
+bool isWordByteAt(std::string_view text, std::size_t i) {
+    return i < text.size() && isWordByte(static_cast<unsigned char>(text[i]));
+}
+
+/// The forms of a hardware address; a digit of it stands for each 'h'.
+constexpr std::array<std::string_view, 4> kHardwareForms{"hh:hh:hh:hh:hh:hh", "hh-hh-hh-hh-hh-hh",
+                                                         "hhhh.hhhh.hhhh", "hhhhhhhhhhhh"};
+
+bool hasForm(std::string_view word, std::string_view form) {
+    for (std::size_t i = 0; i < form.size(); ++i)
+        if (i >= word.size() || (form[i] == 'h' ? !isHex(word[i]) : word[i] != form[i])) return false;
+    return true;
+}
+
+/// The form in which the text begins; empty without one.
+std::string_view hardwareForm(std::string_view text) {
+    for (std::string_view form : kHardwareForms)
+        if (hasForm(text, form)) return form;
+    return {};
+}
+
+/// The hexadecimal digits of the word, in lower case.
 std::string hardwareDigits(std::string_view word) {
     std::string digits;
-    if (word.size() != 17 || (word[2] != ':' && word[2] != '-')) return {};
-    for (std::size_t i = 0; i < word.size(); ++i) {
-        bool isSeparator = i % 3 == 2;
-        if (isSeparator ? word[i] != word[2] : !isHex(word[i])) return {};
-        char c = word[i];
-        if (!isSeparator) digits += c >= 'A' && c <= 'F' ? static_cast<char>(c - 'A' + 'a') : c;
-    }
+    for (char c : word)
+        if (isHex(c)) digits += c >= 'A' && c <= 'F' ? static_cast<char>(c - 'A' + 'a') : c;
     return digits;
 }
 
-constexpr std::size_t kInterfacePrefix = 3;
+/// Whether the separator stands here with one more number of a row behind it.
+bool numberFollows(std::string_view text, std::size_t end, char separator, std::size_t mostDigits) {
+    if (end >= text.size() || text[end] != separator) return false;
+    std::size_t last = end + 1;
+    while (last < text.size() && isHex(text[last])) ++last;
+    std::size_t digits = last - end - 1;
+    return digits > 0 && digits <= mostDigits && !isWordByteAt(text, last);
+}
 
-/// The name of an interface after its hardware address, as the system calls adapters without a fixed place, where
-/// the text begins with one; else empty.
-std::string_view addressedInterface(std::string_view text) {
-    std::string_view name = text.substr(0, kInterfacePrefix + 12);
-    bool isKind = name.starts_with("wlx") || name.starts_with("enx") || name.starts_with("wwx");
-    if (!isKind || name.size() < kInterfacePrefix + 12) return {};
-    if (!std::ranges::all_of(name.substr(kInterfacePrefix), isHex)) return {};
-    bool goesOn = text.size() > name.size() && isWordByte(static_cast<unsigned char>(text[name.size()]));
-    return goesOn ? std::string_view() : name;
+/// Whether one more number of a row stands before, with the separator behind it.
+bool numberPrecedes(std::string_view text, std::size_t begin, char separator, std::size_t mostDigits) {
+    if (begin == 0 || text[begin - 1] != separator) return false;
+    std::size_t first = begin - 1;
+    while (first > 0 && isHex(text[first - 1])) --first;
+    std::size_t digits = begin - 1 - first;
+    return digits > 0 && digits <= mostDigits && (first == 0 || !isWordByteAt(text, first - 1));
+}
+
+bool isInRow(std::string_view text, std::size_t begin, std::size_t end, char separator,
+             std::size_t mostDigits) {
+    return numberPrecedes(text, begin, separator, mostDigits) ||
+           numberFollows(text, end, separator, mostDigits);
 }
 
 /// The number of the key, counted from 1 in the order of first use.
@@ -53,12 +75,13 @@ std::uint32_t numberOf(std::map<std::string, std::uint32_t>& numbers, const std:
     return numbers.try_emplace(key, static_cast<std::uint32_t>(numbers.size() + 1)).first->second;
 }
 
-std::string locallyAdministered(std::uint32_t number, char separator) {
-    std::array<char, 24> text{};
-    std::snprintf(text.data(), text.size(), "02%c00%c%02x%c%02x%c%02x%c%02x", separator, separator,
-                  number >> 24 & 0xFF, separator, number >> 16 & 0xFF, separator, number >> 8 & 0xFF,
-                  separator, number & 0xFF);
-    return text.data();
+/// A locally administered address in that form.
+std::string locallyAdministered(std::uint32_t number, std::string_view form) {
+    std::array<char, 16> digits{};
+    std::snprintf(digits.data(), digits.size(), "0200%08x", number);
+    std::string text;
+    for (std::size_t next = 0; char c : form) text += c == 'h' ? digits[next++] : c;
+    return text;
 }
 
 /// Addresses that belong to nobody: private, shared, loopback, link-local, multicast, reserved, any.
@@ -84,10 +107,11 @@ bool isNobodys(std::uint32_t address) {
 }  // namespace
 
 std::string AnonymousAddresses::hardwareAddress(const std::string& address) {
-    std::string digits = hardwareDigits(address);
+    std::string_view form = hardwareForm(address);
+    bool isPlain = !form.empty() && form.size() == address.size();
+    std::string digits = isPlain ? hardwareDigits(address) : address;
     if (digits == "000000000000" || digits == "ffffffffffff" || address.empty()) return address;
-    return locallyAdministered(numberOf(hardware_, digits.empty() ? address : digits),
-                               digits.empty() ? ':' : address[2]);
+    return locallyAdministered(numberOf(hardware_, digits), isPlain ? form : kHardwareForms[0]);
 }
 
 std::string AnonymousAddresses::ipv4(const std::string& word) {
@@ -115,52 +139,50 @@ std::string AnonymousAddresses::ipv6(const std::string& word) {
     return text.data();
 }
 
-std::string AnonymousAddresses::interfaceName(std::string_view name) {
-    std::string address;
-    for (std::size_t i = kInterfacePrefix; i < name.size(); i += 2)
-        address += (address.empty() ? "" : ":") + std::string(name.substr(i, 2));
-    std::string digits = hardwareAddress(address);
-    std::erase(digits, ':');
-    return std::string(name.substr(0, kInterfacePrefix)) + digits;
+/// An address that stands by itself, or behind the letters with which interfaces begin that are named after it.
+AnonymousAddresses::Found AnonymousAddresses::hardwareAt(std::string_view text, std::size_t begin) {
+    std::string_view rest = text.substr(begin);
+    std::string prefix;
+    for (std::string_view kind : {"wlx", "enx", "wwx"})
+        if (rest.starts_with(kind)) prefix = kind;
+    rest.remove_prefix(prefix.size());
+    std::string_view form = prefix.empty() ? hardwareForm(rest) : kHardwareForms.back();
+    if (form.empty() || !hasForm(rest, form)) return {};
+    std::size_t end = begin + prefix.size() + form.size();
+    std::size_t digits = form.find_first_not_of('h');
+    bool isSplit = digits != std::string_view::npos;
+    if (isWordByteAt(text, end) || (isSplit && isInRow(text, begin, end, form[digits], digits))) return {};
+    return {end - begin, prefix + hardwareAddress(std::string(rest.substr(0, form.size())))};
 }
 
-std::string AnonymousAddresses::replacement(const std::string& word) {
-    if (!hardwareDigits(word).empty()) return hardwareAddress(word);
-    std::size_t colon = word.find(':');
-    bool mayHavePort = colon != std::string::npos && colon == word.rfind(':');
-    if (mayHavePort) return ipv4(word.substr(0, colon)) + word.substr(colon);
-    std::string other = ipv4(word);
-    return other == word ? ipv6(word) : other;
+/// The longest IP address that begins here and does not go on behind.
+AnonymousAddresses::Found AnonymousAddresses::internetAt(std::string_view text, std::size_t begin) {
+    std::size_t end = begin;
+    std::size_t longest = std::min<std::size_t>(text.size(), begin + INET6_ADDRSTRLEN);
+    while (end < longest && (isHex(text[end]) || text[end] == ':' || text[end] == '.')) ++end;
+    for (; end > begin; --end) {
+        if (isWordByteAt(text, end) || isInRow(text, begin, end, '.', 3)) continue;
+        std::string word(text.substr(begin, end - begin));
+        in6_addr address{};
+        if (::inet_pton(AF_INET, word.c_str(), &address) == 1) return {word.size(), ipv4(word)};
+        if (isInRow(text, begin, end, ':', 4)) continue;
+        if (::inet_pton(AF_INET6, word.c_str(), &address) == 1) return {word.size(), ipv6(word)};
+    }
+    return {};
+}
+
+AnonymousAddresses::Found AnonymousAddresses::addressAt(std::string_view text, std::size_t begin) {
+    if (begin > 0 && isWordByteAt(text, begin - 1)) return {};
+    Found found = hardwareAt(text, begin);
+    return found.length > 0 ? found : internetAt(text, begin);
 }
 
 std::string AnonymousAddresses::replacedWithin(std::string_view text) {
     std::string out;
-    std::size_t i = 0;
-    while (i < text.size()) {
-        bool beginsWord = i == 0 || !isWordByte(static_cast<unsigned char>(text[i - 1]));
-        std::string_view name = beginsWord ? addressedInterface(text.substr(i)) : std::string_view();
-        if (!name.empty()) {
-            out += interfaceName(name);
-            i += name.size();
-            continue;
-        }
-        std::size_t end = i;
-        while (end < text.size() && isAddressByte(text[end])) ++end;
-        if (end == i) {  // a word that is no address is copied as a whole, its hexadecimal letters too
-            do {
-                out += text[i++];
-            } while (i < text.size() && isWordByte(static_cast<unsigned char>(text[i - 1])) &&
-                     isWordByte(static_cast<unsigned char>(text[i])));
-            continue;
-        }
-        std::size_t length = end - i;
-        while (length > 1 && (text[i + length - 1] == '.' || text[i + length - 1] == '-' ||
-                              (text[i + length - 1] == ':' && text[i + length - 2] != ':')))
-            --length;  // punctuation behind it
-        bool goesOn = i + length < text.size() && isWordByte(static_cast<unsigned char>(text[i + length]));
-        std::string word(text.substr(i, length));
-        out += goesOn ? word : replacement(word);
-        i += length;
+    for (std::size_t i = 0; i < text.size();) {
+        Found found = addressAt(text, i);
+        out += found.length > 0 ? found.replacement : std::string(1, text[i]);
+        i += std::max<std::size_t>(found.length, 1);
     }
     return out;
 }

@@ -14,13 +14,19 @@ class AnonymousAddresses {
     /// The replacement of a BSSID field, whatever its form.
     std::string hardwareAddress(const std::string& address);
 
-    /// The text with each address in it replaced, and each in the name of an interface that is made from one
-    /// ("wlx" and its digits).
+    /// The text with each address in it replaced: hardware addresses in each of their usual forms, also where an
+    /// interface is named after its own ("wlx" and twelve digits), and IP addresses.
     std::string replacedWithin(std::string_view text);
 
   private:
-    std::string interfaceName(std::string_view name);
-    std::string replacement(const std::string& word);
+    /// A piece of a text, and what takes its place.
+    struct Found {
+        std::size_t length = 0;
+        std::string replacement;
+    };
+    Found addressAt(std::string_view text, std::size_t begin);
+    Found hardwareAt(std::string_view text, std::size_t begin);
+    Found internetAt(std::string_view text, std::size_t begin);
     std::string ipv4(const std::string& word);
     std::string ipv6(const std::string& word);
 

@@ -167,6 +167,35 @@ TEST(Anonymise, TakesNamesThatItIsToldForNetworksToo) {
     EXPECT_EQ(anonymised(recording).description, "Loft beside Cellar");
 }
 
+TEST(Anonymise, FindsAddressesInEveryFormAndBesideOtherWords) {
+    AnonymousAddresses addresses;
+
+    EXPECT_EQ(
+        addresses.replacedWithin("mac:aa:bb:cc:dd:ee:ff AABB.CCDD.EEFF aabbccddeeff aa-bb-cc-dd-ee-ff-wlan0"),
+        "mac:02:00:00:00:00:01 0200.0000.0001 020000000001 02-00-00-00-00-01-wlan0");
+    EXPECT_EQ(addresses.replacedWithin("/run/p2p-dev-wlxAABBCCDDEEFF.lease"),
+              "/run/p2p-dev-wlx020000000001.lease");
+    EXPECT_EQ(addresses.replacedWithin("gateway:8.8.8.8 host-8.8.8.8 8.8.4.4-8.8.8.8 ns.8.8.8.8 ip_8.8.8.8_"),
+              "gateway:198.18.0.1 host-198.18.0.1 198.18.0.2-198.18.0.1 ns.198.18.0.1 ip_198.18.0.1_");
+    EXPECT_EQ(addresses.replacedWithin("to:2a00::1-2a00::2, ::ffff:8.8.8.8:53 2a00::1:"),
+              "to:2001:db8::1-2001:db8::2, ::ffff:198.18.0.1:53 2001:db8::1:");
+}
+
+TEST(Anonymise, ReplacesNamesInTheWordsWithWhichAServerRefused) {
+    Recording recording;
+    auto joined = std::make_shared<WiFiStatus>();
+    joined->ssid = "Rose Hotel";
+    recording.status.emplace_back().status = joined;
+    recording.answers.emplace_back();
+    recording.answers[0].response.results =
+        DiagnosticsTestResults{std::make_shared<DiagnosticsTestResult>(DiagnosticsTestResult{
+            true, false, Dictionary::make({{"Details", Dictionary::make({{"why", "of Rose Hotel: no"}})}})})};
+
+    std::string text = recordingText(anonymised(recording));
+
+    EXPECT_NE(text.find(R"("why": "of Net 0001 nearby: no")"), std::string::npos) << text;
+}
+
 TEST(Anonymise, TakesNothingElseForAnAddress) {
     AnonymousAddresses addresses;
     for (const char* text : {"802.11ac", "1.2.3", "12:30:45", "dead beef", "x02:00:00:00:00:01", "8.8.8.8x",
