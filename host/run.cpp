@@ -224,7 +224,12 @@ std::optional<std::string> Run::drive() {
     if (!isBrokenOff()) controller_->start();
     remote::RemoteControl remote({screen_, *frontEnd_, mainQueue_, activity_, [this] { return isOver(); },
                                   [this](std::string_view line) { transcript_->add(line); }});
-    return remote.play(prepared_.script);
+    try {
+        return remote.play(prepared_.script);
+    } catch (const Exit& exit) {
+        // A snapshot that cannot be written: what was recorded until then is kept.
+        return exit.what();
+    }
 }
 
 void Run::showRunningPage() {
