@@ -157,6 +157,10 @@ class OptionsReader {
     bool readInto(Options& options) {
         while (next_ < words_.size()) {
             if (words_[next_] == "--help" || words_[next_] == "-h") return true;
+            if (words_[next_] == "--") {
+                while (++next_ < words_.size()) takeFile(words_[next_]);
+                return false;
+            }
             readOne(options);
         }
         return false;
@@ -241,6 +245,8 @@ void refuseConflicts(const RunOptions& options) {
     }
     if (options.replayFile && options.demo)
         refuse("--demo: not together with --replay; a run replays one recording");
+    if (options.requestFile == "-" && options.replayFile == "-")
+        refuse("--replay: \"-\" is read already, as --request; give a file for one of the two");
     if (options.interfaceName && (options.replayFile || options.demo))
         refuse("--interface: not together with " + std::string(options.demo ? "--demo" : "--replay") +
                "; a recording states its devices itself");

@@ -143,7 +143,11 @@ class Reader {
         if (!outer.empty()) return fail(place + ": a script file names no further file");
         std::string content;
         if (auto reason = readFile(name, content)) return fail(place + ": " + *reason);
-        readAll(content, name);
+        // Some editors begin a file of UTF-8 with it.
+        constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
+        std::string_view words = content;
+        if (words.starts_with(kByteOrderMark)) words.remove_prefix(kByteOrderMark.size());
+        readAll(words, name);
     }
 
     static std::string linePlace(const std::string& file, int line) {

@@ -103,6 +103,15 @@ TEST(Arguments, AValueMayBeginWithADashAndANameMayBeEmpty) {
     EXPECT_EQ(parseArguments({"run", "--network="}).run.network, "");
 }
 
+TEST(Arguments, BehindTwoDashesStandFilesAlone) {
+    EXPECT_EQ(parseArguments({"report", "--all", "--", "--odd name"}).report.file, "--odd name");
+    EXPECT_EQ(parseArguments({"run", "--list", "--"}).command, Command::run);
+    EXPECT_EQ(refusalOf({"run", "--", "--list"}),
+              "\"--list\" is not an option of run; `wifi-profile run --help` lists them");
+    EXPECT_EQ(refusalOf({"report", "a", "--", "b"}), "\"b\": report takes one file; leave it out");
+    EXPECT_EQ(refusalOf({"report", "--"}), "report: needs a FILE (or -), a result or a recording");
+}
+
 TEST(Arguments, WhatCannotBeUsedIsRefusedWithTheArgumentAndTheReason) {
     EXPECT_EQ(refusalOf({}),
               "nothing to do; give `run`, `tests` or `report FILE`, or see `wifi-profile --help`");
@@ -146,6 +155,8 @@ TEST(Arguments, ARequestExcludesEachOfItsShorthands) {
 TEST(Arguments, OptionsThatNeedOneAnotherAreRefusedAlone) {
     EXPECT_EQ(refusalOf({"run", "--replay", "a", "--demo"}),
               "--demo: not together with --replay; a run replays one recording");
+    EXPECT_EQ(refusalOf({"run", "--replay", "-", "--request", "-"}),
+              "--replay: \"-\" is read already, as --request; give a file for one of the two");
     EXPECT_EQ(refusalOf({"run", "--replay", "a", "--interface", "wlan1"}),
               "--interface: not together with --replay; a recording states its devices itself");
     EXPECT_EQ(refusalOf({"run", "--interface", "wlan1", "--demo"}),

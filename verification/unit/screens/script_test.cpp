@@ -114,6 +114,15 @@ TEST(Script, StandsInAFileToo) {
               (std::vector{Action::up, Action::wait, Action::down, Action::type, Action::back}));
 }
 
+TEST(Script, InAFileMayBeginWithAByteOrderMark) {
+    ScriptFile file(
+        "\xEF\xBB\xBF"
+        "wait\r\nselect\r\n");
+
+    EXPECT_EQ(actionsOf(readScript("@" + file.path(), Pictures::refused)),
+              (std::vector{Action::wait, Action::select}));
+}
+
 TEST(Script, SaysInWhichFileAndLineTheFaultIs) {
     ScriptFile unknown("wait\n\n down dwon\n");
     ScriptFile open("wait\n'type:\n", "open.txt");
