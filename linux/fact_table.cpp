@@ -42,8 +42,7 @@ Store fromLink(const Gathering& g, Known<T> Facts::*place, Gather gather) {
 
 Known<Link> linkOf(const Gathering& g) {
     Known<Link> link = gatherLink(g.sources.interfaceName, g.until);
-    const bool aboutJoined = g.topic.subject == Subject::network && !g.topic.named;
-    if (aboutJoined && link && link->joined && optsOutOfTests(link->joined->says.name)) {
+    if (g.topic.isJoined() && link && link->joined && optsOutOfTests(link->joined->says.name)) {
         return failure(Reason::badConfiguration, "the network's name asks not to be looked at (_nomap)");
     }
     return link;

@@ -61,17 +61,15 @@ void Phase::want(Fact fact) {
     for (const Fact need : rowOf(*meant).needs) want(need);
 }
 
-void Phase::prepare(const NumberedTest& test) {
-    for (const Fact fact : test.needs) want(fact);
-    const bool aboutNetwork = test.subject == Subject::network || test.subject == Subject::joined;
-    for (const NumberedTest& other : numberedTests()) {
-        // The device's own tests come in a row too, and none of their facts is about a network.
-        if (test.subject == Subject::device && other.subject == Subject::device) {
-            for (const Fact fact : other.needs) want(fact);
-        }
-        if (!aboutNetwork || other.subject == Subject::device || other.subject == Subject::scan) continue;
-        if (other.subject == Subject::joined && topic_.named) continue;
-        for (const Fact fact : other.needs) want(fact);
+bool Phase::isAbout(const NumberedTest& test) const {
+    if (topic_.isJoined()) return test.subject != Subject::scan;
+    return test.subject == topic_.subject;
+}
+
+void Phase::begin() {
+    for (const NumberedTest& test : numberedTests()) {
+        if (!isAbout(test)) continue;
+        for (const Fact fact : test.needs) want(fact);
     }
     launchWhatCan();
 }

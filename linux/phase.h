@@ -24,11 +24,12 @@ struct Sources {
     bool traced = false;  ///< whether a note says when each fact was gathered
 };
 
-/// What one phase is about.
+/// What one phase is about. That of the joined network is about the device, too.
 struct PhaseTopic {
     Subject subject = Subject::joined;
     std::optional<NetworkName> named;
     std::chrono::milliseconds oldestScan{0};
+    bool isJoined() const { return subject == Subject::network && !named; }
     friend bool operator==(const PhaseTopic&, const PhaseTopic&) = default;
 };
 
@@ -45,9 +46,8 @@ class Phase : public std::enable_shared_from_this<Phase> {
     const PhaseTopic& topic() const { return topic_; }
     const Facts& facts() const { return facts_; }
 
-    /// Sees to it that the facts of the test are gathered; with the first test about a network, all that the
-    /// phase's other tests will need too, so that the phase takes as long as its slowest fact.
-    void prepare(const NumberedTest& test);
+    /// Begins to gather all that the phase's tests need, so that it takes as long as its slowest fact.
+    void begin();
     /// Whether all facts of the test are there, or known not to be had.
     bool isReady(const NumberedTest& test) const;
 
@@ -57,6 +57,7 @@ class Phase : public std::enable_shared_from_this<Phase> {
     State& state(Fact fact) { return states_[static_cast<std::size_t>(fact)]; }
     State state(Fact fact) const { return states_[static_cast<std::size_t>(fact)]; }
     std::shared_ptr<HomeChannel::Stay>& stay(Fact fact) { return stays_[static_cast<std::size_t>(fact)]; }
+    bool isAbout(const NumberedTest& test) const;
     /// The fact that stands for this one in this phase; nothing when the phase needs none.
     std::optional<Fact> resolved(Fact fact) const;
     void want(Fact fact);

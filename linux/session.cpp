@@ -52,6 +52,11 @@ bool hasRadio() {
            std::filesystem::directory_iterator();
 }
 
+bool isSameConnection(const Known<Link>& before, const Known<Link>& now) {
+    return before && now && before->joined && now->joined && before->interfaceIndex == now->interfaceIndex &&
+           before->joined->address == now->joined->address;
+}
+
 /// The reason of whoever was asked first, with the other's.
 Error refusedBoth(Error denied, const Error& byManager) {
     denied.message += ", and " + byManager.message;
@@ -126,25 +131,59 @@ void Session::handleTest(const WireRequest& request) {
     }
     const Known<PhaseTopic> topic = topicOf(*test, request.configuration);
     if (!topic) return answerTest(request.id, answerOf(topic.error()));
-    std::shared_ptr<Phase> phase = phaseFor(*topic);
-    waiting_[request.id] = WaitingTest{test, phase};
-    phase->prepare(*test);
+    const std::shared_ptr<Phase> phase = phaseFor(*topic);
+    const bool isHeld = phase == ahead_ && topic->subject != Subject::device;
+    waiting_[request.id] = WaitingTest{test, phase, isHeld};
+    if (isHeld) lookAgain(phase);
     answerReadyTests();
 }
 
 /// A phase is a row of requests with the same configuration; each request for the list of networks begins one of
-/// its own, because it wants a new scan.
-std::shared_ptr<Phase> Session::phaseFor(const PhaseTopic& topic) {
+/// its own, because it wants a new scan. From the device a run goes on to the network of which it was told: both are one
+/// phase, whose slowest facts are begun with the device's.
+std::shared_ptr<Phase> Session::phaseFor(PhaseTopic topic) {
+    const bool isAhead = topic.subject == Subject::device && toldOfNetwork_;
+    if (isAhead) topic.subject = Subject::network;
     if (!phase_ || phase_->topic() != topic || topic.subject == Subject::scan) {
-        phase_ = std::make_shared<Phase>(topic, sources_, workers_, stop_, [this] { answerReadyTests(); });
+        phase_ = begun(topic);
+        if (isAhead) ahead_ = phase_;
     }
     return phase_;
+}
+
+std::shared_ptr<Phase> Session::begun(const PhaseTopic& topic) {
+    auto phase = std::make_shared<Phase>(topic, sources_, workers_, stop_, [this] { answerReadyTests(); });
+    phase->begin();
+    return phase;
+}
+
+/// What was begun ahead holds as long as the device has stayed where it was.
+void Session::lookAgain(const std::shared_ptr<Phase>& phase) {
+    workers_.start([this, phase, stop = stop_]() -> Workers::Publication {
+        const Until until{stop, Clock::now() + kLookAround};
+        return [this, phase, stop, link = gatherLink(sources_.interfaceName, until)] {
+            if (!stop->raised()) release(phase, link);
+        };
+    });
+}
+
+void Session::release(const std::shared_ptr<Phase>& phase, const Known<Link>& link) {
+    if (ahead_ == phase) ahead_.reset();
+    std::shared_ptr<Phase> valid;
+    for (auto& [id, waiting] : waiting_) {
+        auto* const test = std::get_if<WaitingTest>(&waiting);
+        if (test == nullptr || test->phase != phase || !std::exchange(test->isHeld, false)) continue;
+        if (!valid) valid = isSameConnection(phase->facts().link, link) ? phase : begun(phase->topic());
+        test->phase = valid;
+    }
+    if (valid && phase_ == phase) phase_ = valid;
+    answerReadyTests();
 }
 
 void Session::answerReadyTests() {
     for (auto each = waiting_.begin(); each != waiting_.end();) {
         const auto* const waiting = std::get_if<WaitingTest>(&each->second);
-        if (waiting == nullptr || !waiting->phase->isReady(*waiting->test)) {
+        if (waiting == nullptr || waiting->isHeld || !waiting->phase->isReady(*waiting->test)) {
             ++each;
             continue;
         }
@@ -173,6 +212,8 @@ void Session::handleStatus(std::uint64_t id) {
 
 void Session::finishStatus(std::uint64_t id, const Known<Link>& link) {
     if (!take(id)) return;
+    toldOfNetwork_ =
+        link && link->joined && !link->joined->says.name.absent() && !optsOutOfTests(link->joined->says.name);
     DiagnosticsStatusResponse response;
     if (!link) {
         response.error = link.error();
@@ -251,6 +292,7 @@ void Session::cancel() {
     stop_->raise();
     stop_ = std::make_shared<StopSignal>();
     phase_.reset();
+    ahead_.reset();
     for (const auto& [id, waiting] : std::exchange(waiting_, {})) answerCancelled(id, waiting);
 }
 

@@ -33,6 +33,7 @@ class Session {
     struct WaitingTest {
         const NumberedTest* test = nullptr;
         std::shared_ptr<Phase> phase;
+        bool isHeld = false;  ///< until it is known whether what was begun ahead still holds
     };
     struct WaitingStatus {};
     struct WaitingDescription {};
@@ -45,7 +46,10 @@ class Session {
     void handleSetPower(const WireRequest& request);
     void cancel();
 
-    std::shared_ptr<Phase> phaseFor(const PhaseTopic& topic);
+    std::shared_ptr<Phase> phaseFor(PhaseTopic topic);
+    std::shared_ptr<Phase> begun(const PhaseTopic& topic);
+    void lookAgain(const std::shared_ptr<Phase>& phase);
+    void release(const std::shared_ptr<Phase>& phase, const Known<Link>& link);
     void answerReadyTests();
     void answerTest(std::uint64_t id, const DiagnosticsTestResponse& response);
     void answerCancelled(std::uint64_t id, const Waiting& waiting);
@@ -62,6 +66,8 @@ class Session {
     Inbox inbox_;
     std::shared_ptr<StopSignal> stop_;
     std::shared_ptr<Phase> phase_;  ///< of the latest test request
+    std::shared_ptr<Phase> ahead_;  ///< about a network, and begun with a test of the device
+    bool toldOfNetwork_ = false;    ///< whether the latest status named a network that may be tested
     std::map<std::uint64_t, Waiting> waiting_;
     std::optional<std::uint32_t> describedRadio_;  ///< the radio whose power the host was told
     bool toldPower_ = false;
