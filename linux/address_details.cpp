@@ -46,12 +46,11 @@ std::vector<AddressDetails> readAddressDetails(Bytes buffer, std::uint32_t inter
     return all;
 }
 
-std::vector<AssignedAddress> assignedOf(const std::vector<AddressDetails>& details, bool byIwd) {
+std::vector<AssignedAddress> assignedOf(const std::vector<AddressDetails>& details, bool byClient) {
     std::vector<AssignedAddress> assigned;
     for (const AddressDetails& each : details) {
         assigned.push_back(each.assigned);
-        if (byIwd && !each.assigned.address.isIPv4() && !each.bringsRoute)
-            assigned.back().byAdvertisement = true;
+        if (byClient && !each.assigned.address.isIPv4() && !each.bringsRoute) assigned.back().byItself = true;
     }
     return assigned;
 }

@@ -21,11 +21,11 @@ struct AddressDetails {
 /// is broken. *Any* thread.
 std::vector<AddressDetails> readAddressDetails(Bytes buffer, std::uint32_t interfaceIndex);
 
-/// How they were assigned. iwd sets what an advertisement or a lease grants without an end just as what was entered, both
-/// without a route. But it looks at advertisements only where no address of IPv6 was entered, and then leaves advertised
-/// routes behind. *Any* thread.
-/// \param byIwd whether iwd manages the interface, and it has such a route
-std::vector<AssignedAddress> assignedOf(const std::vector<AddressDetails>& details, bool byIwd);
+/// How they were assigned. iwd and dhcpcd set what an advertisement or a lease grants without an end just as what was
+/// entered, all without a route. But they leave advertised routes behind. iwd looks at advertisements only where no address of
+/// IPv6 was entered; what was entered for dhcpcd stands in its file. *Any* thread.
+/// \param byClient whether one of them manages the interface, and it has such a route
+std::vector<AssignedAddress> assignedOf(const std::vector<AddressDetails>& details, bool byClient);
 
 /// Asks the kernel for them.
 Known<std::vector<AddressDetails>> gatherAddressDetails(std::uint32_t interfaceIndex, const Until& until);

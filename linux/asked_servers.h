@@ -11,9 +11,15 @@ using Servers = std::vector<IPAddress>;
 /// Adds those that are not there yet. *Any* thread.
 void add(Servers& servers, const Servers& more);
 
-/// The name servers that are asked: those of the resolver's file; in place of a resolver on the device those that it asks for
-/// the link. Where it does not tell, its own address stays. *Any* thread; blocks while the bus is asked.
+/// The name servers that are asked.
+struct AskedServers {
+    Servers all;
+    Servers entered;  ///< those of them that stand in the settings of a resolver on the device
+};
+
+/// Those of the resolver's file; in place of a resolver on the device (systemd-resolved, dnsmasq) those that it asks for the
+/// link. Where it does not tell, its own address stays. *Any* thread; blocks while the bus is asked.
 /// \param ofManager what the interface's manager hands to a resolver that cannot be asked
-Servers effectiveServers(Known<Bus>& bus, const Link& link, const Servers& ofManager, const Until& until);
+AskedServers askedServers(Known<Bus>& bus, const Link& link, const Servers& ofManager, const Until& until);
 
 }  // namespace wp

@@ -61,8 +61,9 @@ Known<NameServers> managedNameServers(Known<Bus>& bus, const Link& link, const N
         if (!each.isIPv4()) names.offered.push_back(each);
     // Another interface's servers are no setting of this one.
     const auto elsewhere = networkManagerServersElsewhere(*bus, link.interfaceName, until);
-    names.effective =
-        without(effectiveServers(bus, link, managed.servers, until), elsewhere ? *elsewhere : Servers());
+    const AskedServers asked = askedServers(bus, link, managed.servers, until);
+    add(names.manual, asked.entered);
+    names.effective = without(asked.all, elsewhere ? *elsewhere : Servers());
     names.offerKnown = managed.offerRead && elsewhere;
     return names;
 }
@@ -93,7 +94,9 @@ LinkSetup setupFromNetworkd(Known<Bus>& bus, const Link& link, const NetworkdLin
     NameServers names{managed.manualServers, {}, managed.offeredServers, true};
     Servers own = managed.manualServers;
     add(own, managed.offeredServers);
-    names.effective = effectiveServers(bus, link, own, until);
+    const AskedServers asked = askedServers(bus, link, own, until);
+    add(names.manual, asked.entered);
+    names.effective = asked.all;
     // Servers of a router's advertisement stand nowhere but in the list that is asked.
     if (*managed.methods.ipv6 == "auto")
         for (const IPAddress& each : names.effective)
@@ -125,7 +128,7 @@ LinkSetup setupOfSilentManager(Known<Bus>& bus, const Link& link, const Error& w
     setup.methods = {why, why};
     setup.nameServers = why;
     setup.leaseText = why;
-    setup.servers = effectiveServers(bus, link, {}, until);
+    setup.servers = askedServers(bus, link, {}, until).all;
     return setup;
 }
 

@@ -9,8 +9,10 @@
 #include "linux/dbus/iwd.h"
 #include "linux/files/dhcp_clients.h"
 #include "linux/files/dhcpcd_leases.h"
+#include "linux/files/dhcpcd_settings.h"
 #include "linux/files/ifupdown.h"
 #include "linux/files/key_value_file.h"
+#include "linux/files/resolver_records.h"
 
 namespace wp {
 namespace {
@@ -45,6 +47,10 @@ ClientLeases readClientLeases(const Link& link, const std::vector<AssignedAddres
     return {std::move(kept.ipv4), std::move(kept.ipv6)};
 }
 
+bool contains(const Servers& servers, const IPAddress& server) {
+    return std::ranges::find(servers, server) != servers.end();
+}
+
 /// All that tells how the interface was set up.
 struct Evidence {
     std::vector<AssignedAddress> assigned;
@@ -53,9 +59,26 @@ struct Evidence {
     ClientLeases leases;
     DhcpClients clients;
     InterfacePlan plan;
+    const char* toldBy = "addresses";
+    ResolverRecords records;
 
     bool hasClientOfIPv4() const { return leases.ipv4 || clients.ipv4; }
 };
+
+/// What files say of the interface: ifupdown's; dhcpcd's of a family of which it set an address that stands there.
+void readPlans(const Link& link, Evidence& evidence) {
+    InterfacePlan& plan = evidence.plan;
+    plan = ifupdownPlan(link.interfaceName);
+    if (!plan.ipv4.method.empty() || !plan.ipv6.method.empty()) evidence.toldBy = "ifupdown";
+    const std::string network = link.joined ? textFromName(link.joined->says.name) : "";
+    const InterfacePlan dhcpcds = dhcpcdPlan(link.interfaceName, network);
+    for (const auto family : {&InterfacePlan::ipv4, &InterfacePlan::ipv6}) {
+        if (!isAssigned(dhcpcds.*family, evidence.assigned)) continue;
+        plan.*family = dhcpcds.*family;
+        evidence.toldBy = "dhcpcd";
+    }
+    add(plan.servers, dhcpcds.servers);
+}
 
 Known<Evidence> gatherEvidence(Known<Bus>& bus, const Link& link, const Until& until) {
     const auto details = gatherAddressDetails(link.interfaceIndex, until);
@@ -63,10 +86,15 @@ Known<Evidence> gatherEvidence(Known<Bus>& bus, const Link& link, const Until& u
     Evidence evidence;
     evidence.ways = gatherWaysOut(link.interfaceIndex, until);
     evidence.isIwds = iwdManages(bus, link, until);
-    evidence.assigned = assignedOf(*details, evidence.isIwds && evidence.ways && evidence.ways->advertised);
-    evidence.leases = readClientLeases(link, evidence.assigned);
     evidence.clients = dhcpClientsOf(link.interfaceName);
-    evidence.plan = ifupdownPlan(link.interfaceName);
+    const bool byClient = evidence.isIwds || evidence.clients.asksRouters;
+    evidence.assigned = assignedOf(*details, byClient && evidence.ways && evidence.ways->advertised);
+    evidence.leases = readClientLeases(link, evidence.assigned);
+    if (evidence.leases.ipv6)
+        for (AssignedAddress& each : evidence.assigned)
+            each.byItself |= contains(evidence.leases.ipv6->addresses, each.address);
+    readPlans(link, evidence);
+    evidence.records = resolverRecords(link.interfaceName);
     return evidence;
 }
 
@@ -79,22 +107,26 @@ AddressMethods methodsFrom(const Evidence& evidence, const std::string& interfac
 }
 
 /// The name servers where no manager tells: by the leases, else by who can have named them at all.
-/// \param effective those that are asked
-NameServers serversFrom(const Evidence& evidence, const Servers& effective) {
+NameServers serversFrom(const Evidence& evidence, const AskedServers& asked) {
+    const ResolverRecords& records = evidence.records;
     NameServers names;
-    names.effective = effective;
+    names.effective = asked.all;
+    std::erase_if(names.effective, [&](const IPAddress& each) { return contains(records.elsewhere, each); });
     const ClientLeases& leases = evidence.leases;
     for (const auto* lease : {&leases.ipv4, &leases.ipv6})
         if (*lease) add(names.offered, (*lease)->servers);
-    // The file does nothing by itself: what it names must have come to be asked.
-    for (const IPAddress& each : evidence.plan.servers)
-        if (std::ranges::find(effective, each) != effective.end()) names.manual.push_back(each);
-    names.offerKnown = leases.ipv4.has_value();
+    add(names.offered, records.offered);
+    names.manual = asked.entered;
+    // Files do nothing by themselves: what they name must have come to be asked.
+    for (const auto* entered : {&evidence.plan.servers, &records.entered})
+        for (const IPAddress& each : *entered)
+            if (contains(asked.all, each)) add(names.manual, {each});
+    names.offerKnown = leases.ipv4 || records.offerKnown;
     // What a router advertised is written down nowhere.
     names.advertisementsKnown = false;
     if (!evidence.ways) return names;
     names.routers = evidence.ways->gateways;
-    if (leases.ipv4) return names;
+    if (names.offerKnown) return names;
     // Nobody offers anything to an interface that was set up by hand; another one may have brought the servers along.
     names.offerKnown = names.advertisementsKnown =
         !evidence.clients.any && !evidence.ways->elsewhere && allSetByHand(evidence.assigned);
@@ -107,13 +139,12 @@ Known<LinkSetup> setupWithoutManager(Known<Bus>& bus, const Link& link, const Un
     const auto evidence = gatherEvidence(bus, link, until);
     if (!evidence) return evidence.error();
     const ClientLeases& leases = evidence->leases;
-    const InterfacePlan& plan = evidence->plan;
     LinkSetup setup;
-    setup.toldBy = plan.ipv4.method.empty() && plan.ipv6.method.empty() ? "addresses" : "ifupdown";
+    setup.toldBy = evidence->toldBy;
     setup.methods = methodsFrom(*evidence, link.interfaceName);
-    const Servers effective = effectiveServers(bus, link, {}, until);
-    setup.nameServers = serversFrom(*evidence, effective);
-    setup.servers = leases.ipv4 && !leases.ipv4->servers.empty() ? leases.ipv4->servers : effective;
+    const AskedServers asked = askedServers(bus, link, {}, until);
+    setup.nameServers = serversFrom(*evidence, asked);
+    setup.servers = leases.ipv4 && !leases.ipv4->servers.empty() ? leases.ipv4->servers : asked.all;
     setup.leaseText =
         failure(Reason::unavailable, evidence->hasClientOfIPv4()
                                          ? "the DHCP client left no lease of IPv4 that can be read"

@@ -13,12 +13,12 @@ bool contains(const std::vector<IPAddress>& list, const IPAddress& address) {
     return std::find(list.begin(), list.end(), address) != list.end();
 }
 
+}  // namespace
+
 bool isAssigned(const FamilyPlan& plan, const std::vector<AssignedAddress>& addresses) {
     return std::any_of(addresses.begin(), addresses.end(),
                        [&](const AssignedAddress& each) { return contains(plan.addresses, each.address); });
 }
-
-}  // namespace
 
 Known<std::string> methodFromIPv4Addresses(const std::vector<AssignedAddress>& addresses, bool hasLease,
                                            const FamilyPlan& plan) {
@@ -48,7 +48,7 @@ Known<std::string> methodFromIPv6Addresses(const std::vector<AssignedAddress>& a
     bool dynamic = false;
     for (const AssignedAddress& each : addresses) {
         if (each.address.isIPv4() || each.address.linkLocal() || each.address.loopback()) continue;
-        const bool withoutEnd = each.permanent && !each.byAdvertisement;
+        const bool withoutEnd = each.permanent && !each.byItself;
         if (withoutEnd && kernel.setByClient)
             return failure(Reason::unavailable,
                            "a client sets addresses of IPv6 itself and does not tell whence it has them");
@@ -64,7 +64,7 @@ bool allSetByHand(const std::vector<AssignedAddress>& addresses) {
     bool any = false;
     for (const AssignedAddress& each : addresses) {
         if (each.address.linkLocal() || each.address.loopback() || each.address.unspecified()) continue;
-        if (!each.permanent || each.byAdvertisement) return false;
+        if (!each.permanent || each.byItself) return false;
         any = true;
     }
     return any;

@@ -20,8 +20,8 @@ struct AddressMethods {
 struct AssignedAddress {
     IPAddress address;
     bool permanent = false;  ///< without an end to its life
-    /// It was made of a router's advertisement, or as a link-local one.
-    bool byAdvertisement = false;
+    /// It was made of a router's advertisement or as a link-local one, or a lease of DHCPv6 grants it.
+    bool byItself = false;
 };
 
 /// The kernel's own switches for IPv6 on the interface.
@@ -38,6 +38,9 @@ struct FamilyPlan {
     std::vector<IPAddress> addresses;  ///< entered there by hand
     bool started = false;              ///< whether the interface is kept as started by that file
 };
+
+/// Whether the interface has an address that stands in the file. *Any* thread.
+bool isAssigned(const FamilyPlan& plan, const std::vector<AssignedAddress>& addresses);
 
 /// What a file says of one interface.
 struct InterfacePlan {

@@ -15,7 +15,7 @@ namespace wp {
 /// give away.
 struct LinkSetup {
     /// "NetworkManager", "systemd-networkd"; "addresses": nobody, so that those were looked at; "ifupdown": the same, held
-    /// together with what its file says.
+    /// together with what its file says; "dhcpcd": an address stands in its settings.
     std::string toldBy;
     AddressMethods methods;
     Known<NameServers> nameServers;

@@ -85,7 +85,7 @@ void addGroup(Bytes group, GrantedLease& granted) {
         const std::uint32_t valid = bigEndian32(value, kAddressSize + 4);
         const auto address = IPAddress::fromBytes(value.first(kAddressSize));
         if (valid == 0 || !address) return;
-        granted.addresses.push_back(*address);
+        granted.lease.addresses.push_back(*address);
         granted.seconds = std::max(granted.seconds, valid);
     });
 }
@@ -104,7 +104,7 @@ std::optional<GrantedLease> readDhcpPacket(Bytes packet) {
     const Buffer &type = options[kMessageType], &time = options[kLeaseTime];
     if (type != Buffer{kAcknowledgement} || time.size() != 4) return std::nullopt;
     GrantedLease granted;
-    granted.addresses = {*IPAddress::fromBytes(packet.subspan(kOwnAddress, 4))};
+    granted.lease.addresses = {*IPAddress::fromBytes(packet.subspan(kOwnAddress, 4))};
     granted.seconds = bigEndian32(time, 0);
     granted.lease.servers = addressesIn(options, kNameServers, 4);
     granted.lease.vendorText = vendorTextIn(options);
@@ -124,7 +124,7 @@ std::optional<GrantedLease> readDhcp6Message(Bytes message) {
         if (number == kNameServers6 || number == kPortal6)
             options.try_emplace(number, value.begin(), value.end());
     });
-    if (granted.addresses.empty()) return std::nullopt;
+    if (granted.lease.addresses.empty()) return std::nullopt;
     granted.lease.servers = addressesIn(options, kNameServers6, kAddressSize);
     granted.lease.portalApi = portalUriFrom(textIn(options, kPortal6));
     return granted;

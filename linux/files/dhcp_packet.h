@@ -9,8 +9,7 @@ namespace wp {
 
 /// What a DHCP server's answer grants, as some clients keep it byte for byte.
 struct GrantedLease {
-    std::vector<IPAddress> addresses;  ///< granted to this device
-    std::uint32_t seconds = 0;         ///< for so long since the answer came; all bits set: without an end
+    std::uint32_t seconds = 0;  ///< for so long since the answer came; all bits set: without an end
     Lease lease;
 };
 

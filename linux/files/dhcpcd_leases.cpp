@@ -38,7 +38,7 @@ std::optional<KeptLease> leaseIn(const std::string& path, std::optional<GrantedL
     if (!granted) return std::nullopt;
     const std::int64_t grantedAt = about.st_mtim.tv_sec;
     const bool isOver = granted->seconds != kWithoutEnd && grantedAt + std::int64_t{granted->seconds} <= now;
-    const bool isHere = std::ranges::any_of(granted->addresses, [&](const IPAddress& each) {
+    const bool isHere = std::ranges::any_of(granted->lease.addresses, [&](const IPAddress& each) {
         return std::ranges::find(assigned, each) != assigned.end();
     });
     if (isOver || !isHere) return std::nullopt;

@@ -67,7 +67,6 @@ bool contains(const std::vector<IPAddress>& list, const std::optional<IPAddress>
 struct Block {
     Lease lease;
     std::string interfaceName;
-    std::optional<IPAddress> address;
     bool passed = false;
 };
 
@@ -87,7 +86,8 @@ Statement statementIn(std::string_view line) {
 void readStatement(std::string_view line, Block& block, std::int64_t now) {
     const auto [name, value] = statementIn(line);
     if (name == "interface") block.interfaceName = textFrom(value);
-    if (name == "fixed-address") block.address = IPAddress::fromText(value);
+    if (const auto address = IPAddress::fromText(value); address && name == "fixed-address")
+        block.lease.addresses = {*address};
     if (name == "expire") block.passed = hasPassed(value, now);
     if (name == "domain-name-servers") addServers(value, block.lease.servers);
     if (name == "vendor-encapsulated-options" || name == "vendor-class-identifier")
@@ -173,7 +173,8 @@ std::optional<Lease> readDhclientLeases(std::string_view text, std::string_view 
         if (line.starts_with("lease ") && line.ends_with("{")) {
             block.emplace();
         } else if (line == "}" && block) {
-            const bool counts = !block->passed && contains(assigned, block->address);
+            const bool counts = !block->passed && !block->lease.addresses.empty() &&
+                                contains(assigned, block->lease.addresses[0]);
             if (block->interfaceName == interfaceName)
                 last = counts ? std::optional(std::move(block->lease)) : std::nullopt;
             block.reset();
@@ -197,10 +198,10 @@ std::optional<Lease> readDhclient6Leases(std::string_view text, std::string_view
         } else if (line != "}") {
             readStatement6(line, *block);
         } else if (--block->depth == 0) {
-            const bool counts = std::ranges::any_of(
-                block->grants, [&](const Grant& each) { return isInForce(each, assigned, now); });
+            for (const Grant& each : block->grants)
+                if (isInForce(each, assigned, now)) block->lease.addresses.push_back(*each.address);
             if (block->interfaceName == interfaceName)
-                last = counts ? std::optional(std::move(block->lease)) : std::nullopt;
+                last = block->lease.addresses.empty() ? std::nullopt : std::optional(std::move(block->lease));
             block.reset();
         }
     }

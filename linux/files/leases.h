@@ -12,6 +12,7 @@ namespace wp {
 
 /// What a DHCP client of its own, without a manager, wrote down of its lease.
 struct Lease {
+    std::vector<IPAddress> addresses;  ///< that it grants, and that are in force
     std::vector<IPAddress> servers;
     std::string vendorText;
     std::string portalApi;

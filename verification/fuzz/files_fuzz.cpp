@@ -1,3 +1,5 @@
+#include "linux/files/dhcpcd_settings.h"
+#include "linux/files/dnsmasq.h"
 #include "linux/files/interfaces_file.h"
 #include "linux/files/leases.h"
 #include "linux/files/networkd.h"
@@ -16,6 +18,10 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     InterfacesFile interfaces;
     readInterfaces(text, interfaces);
     planIn(interfaces, logicalNameIn(interfaces, "wlan0"));
+    readDhcpcdSettings(text, "wlan0", "Northlight");
+    DnsmasqSettings resolver;
+    readDnsmasqFile(text, resolver);
+    readDnsmasqCommand(wordsOf(text), resolver);
     UnitFile settings;
     readUnitFile(text, settings);
     methodsFromNetworkd(settings);

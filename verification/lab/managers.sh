@@ -87,17 +87,27 @@ dhclient_lease6() {
         > "/run/lab/$1/dhclient6.log" 2>&1 || { cat "/run/lab/$1/dhclient6.log"; return 1; }
 }
 
-# dhcpcd_lease X: addresses from dhcpcd, which keeps the servers' answers byte for byte.
+# dhcpcd_lease X [SETTING...]: addresses from dhcpcd, which keeps the servers' answers byte for byte; or from its settings.
 dhcpcd_lease() {
     local dir=/run/lab/$1
     printf '%s\n' '#!/bin/sh' 'set -- $new_domain_name_servers $new_dhcp6_name_servers; [ $# = 0 ] || printf "nameserver %s\n" "$@" > /etc/resolv.conf' \
         > "$dir/dhcpcd-hook"
     chmod +x "$dir/dhcpcd-hook"
-    printf '%s\n' 'option domain_name_servers, routers' 'option dhcp6_name_servers' > "$dir/dhcpcd.conf"
+    printf '%s\n' 'option domain_name_servers, routers' 'option dhcp6_name_servers' "${@:2}" > /etc/dhcpcd.conf
     mkdir -p /var/lib/dhcpcd
     grep -q ^dhcpcd: /etc/passwd || echo 'dhcpcd:x:984:984::/var/lib/dhcpcd:/usr/sbin/nologin' >> /etc/passwd
-    "$LAB_PROGRAMS/usr/sbin/dhcpcd" -f "$dir/dhcpcd.conf" -c "$dir/dhcpcd-hook" -w -t 30 "$1" > "$dir/dhcpcd.log" 2>&1 ||
+    "$LAB_PROGRAMS/usr/sbin/dhcpcd" -f /etc/dhcpcd.conf -c "$dir/dhcpcd-hook" -w -t 30 "$1" > "$dir/dhcpcd.log" 2>&1 ||
         { cat "$dir/dhcpcd.log"; return 1; }
+}
+
+# local_resolver [OPTION...]: dnsmasq in the resolver's file, as its package has it together with resolvconf: what the file named
+# before is in a file of dnsmasq's own.
+local_resolver() {
+    mkdir -p /run/dnsmasq
+    cp /etc/resolv.conf /run/dnsmasq/resolv.conf
+    dnsmasq --conf-file=/dev/null -r /run/dnsmasq/resolv.conf --listen-address=127.0.0.1 --bind-interfaces --user=root \
+        --pid-file=/run/dnsmasq/dnsmasq.pid "$@"
+    rm -f /etc/resolv.conf; echo nameserver 127.0.0.1 > /etc/resolv.conf
 }
 
 # bluetooth PAIRED CONNECTED [COMMAND]: a Bluetooth service with so many devices, that runs the command when it is asked.

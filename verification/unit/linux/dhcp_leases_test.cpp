@@ -64,7 +64,7 @@ TEST(DhcpPacket, GrantsAnAddressForATimeAndNamesServersPortalAndVendor) {
                               option(43, bytesOf("EXAMPLE_METERED")) +
                               option(114, bytesOf("https://p.example/api")) + Frame{255, 6, 4, 1}));
     ASSERT_TRUE(read);
-    EXPECT_EQ(textsOf(read->addresses), "192.168.1.20 ");
+    EXPECT_EQ(textsOf(read->lease.addresses), "192.168.1.20 ");
     EXPECT_EQ(read->seconds, 3600U);
     EXPECT_EQ(textsOf(read->lease.servers), "192.168.1.1 9.9.9.9 ");
     EXPECT_EQ(read->lease.vendorText, "EXAMPLE_METERED");
@@ -115,7 +115,7 @@ TEST(Dhcp6Message, GrantsAddressesAndNamesServersAndPortal) {
                         option6(23, address6(0x53)) + option6(103, bytesOf("https://p.example/api"));
     const auto read = readDhcp6Message(reply);
     ASSERT_TRUE(read);
-    EXPECT_EQ(textsOf(read->addresses), "2001:db8::1 2001:db8::2 ");
+    EXPECT_EQ(textsOf(read->lease.addresses), "2001:db8::1 2001:db8::2 ");
     EXPECT_EQ(read->seconds, 90U);
     EXPECT_EQ(textsOf(read->lease.servers), "2001:db8::53 ");
     EXPECT_EQ(read->lease.portalApi, "https://p.example/api");

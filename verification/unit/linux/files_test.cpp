@@ -149,6 +149,7 @@ TEST(Leases6, NameServersAndPortalOfTheAddressThatTheInterfaceHas) {
     ASSERT_TRUE(lease);
     EXPECT_EQ(textsOf(lease->servers), "2001:db8::53 2001:db8::54 ");
     EXPECT_EQ(lease->portalApi, "https://p.example/six");
+    EXPECT_EQ(textsOf(lease->addresses), "2001:db8::7 ") << "of two the one that the interface has";
     EXPECT_EQ(textsOf(lease6("eth0", "2001:db8:1::7", std::int64_t{1} << 40)->servers), "fe80::1 ");
 }
 

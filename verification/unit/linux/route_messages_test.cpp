@@ -154,7 +154,7 @@ std::string linesOf(const std::vector<AddressDetails>& details) {
         if (each.assigned.address.linkLocal()) continue;  // made of the radio's address
         lines += each.assigned.address.text() + "/" + std::to_string(each.prefixLength);
         lines += std::string(each.assigned.permanent ? " forever" : "") +
-                 (each.assigned.byAdvertisement ? " advertised" : "") + "\n";
+                 (each.assigned.byItself ? " advertised" : "") + "\n";
     }
     return lines;
 }
@@ -171,7 +171,7 @@ TEST(AddressDetails, TellLifetimeAndOrigin) {
     EXPECT_EQ(linesOf(readAddressDetails(addressMessage(0, 3600), 3)), "2001:db8::5/64\n");
 }
 
-TEST(AddressDetails, OfIwdWereEnteredUnlessARouteIsAdvertised) {
+TEST(AddressDetails, OfIwdOrDhcpcdWereEnteredUnlessARouteIsAdvertised) {
     auto details = readAddressDetails(addressMessage(0, 0xFFFF'FFFF, IFA_F_NOPREFIXROUTE), 3);
     const auto ofAPerson = readAddressDetails(addressMessage(0, 0xFFFF'FFFF), 3);
     details.insert(details.end(), ofAPerson.begin(), ofAPerson.end());
@@ -180,9 +180,9 @@ TEST(AddressDetails, OfIwdWereEnteredUnlessARouteIsAdvertised) {
 
     const auto advertised = assignedOf(details, true), entered = assignedOf(details, false);
 
-    EXPECT_TRUE(advertised[0].byAdvertisement);
-    EXPECT_FALSE(advertised[1].byAdvertisement) << "set beside iwd, with a route of its own";
-    EXPECT_FALSE(entered[0].byAdvertisement);
+    EXPECT_TRUE(advertised[0].byItself);
+    EXPECT_FALSE(advertised[1].byItself) << "set beside the client, with a route of its own";
+    EXPECT_FALSE(entered[0].byItself);
     EXPECT_TRUE(entered[0].permanent);
 }
 

@@ -1,0 +1,170 @@
+#include "linux/files/dnsmasq.h"
+
+#include <algorithm>
+#include <filesystem>
+
+#include "linux/files/key_value_file.h"
+#include "linux/files/leases.h"
+#include "linux/files/processes.h"
+
+namespace wp {
+namespace {
+
+constexpr std::size_t kMostFiles = 256;
+
+struct Option {
+    char letter;  ///< of the command line
+    const char* name;
+    bool hasValue;
+};
+constexpr Option kOptions[] = {{'r', "resolv-file", true},    {'R', "no-resolv", false},
+                               {'S', "server", true},         {'C', "conf-file", true},
+                               {'7', "conf-dir", true},       {'p', "port", true},
+                               {'a', "listen-address", true}, {'I', "except-interface", true},
+                               {'\0', "servers-file", true},  {'1', "enable-dbus", false}};
+
+std::vector<std::string> partsOf(const std::string& list) {
+    std::string spaced = list;
+    std::ranges::replace(spaced, ',', ' ');
+    return wordsOf(spaced);
+}
+
+/// "ADDRESS", "ADDRESS#PORT@INTERFACE", or with "/#/" before it; one for some names only counts for nothing.
+void addServer(std::string value, std::vector<IPAddress>& servers) {
+    if (value.starts_with("/#/")) value.erase(0, 3);
+    if (const auto address = IPAddress::fromText(value.substr(0, value.find_first_of("#@"))))
+        servers.push_back(*address);
+}
+
+void listenAt(const std::string& addresses, DnsmasqSettings& into) {
+    for (const std::string& each : partsOf(addresses))
+        if (const auto address = IPAddress::fromText(each)) into.listensAt.push_back(*address);
+}
+
+bool answersHere(const DnsmasqSettings& settings) {
+    const auto isHere = [](const IPAddress& each) { return each.loopback() || each.unspecified(); };
+    return settings.answersAtAll &&
+           (settings.listensAt.empty() || std::ranges::any_of(settings.listensAt, isHere));
+}
+
+void set(const std::string& name, const std::string& value, DnsmasqSettings& into) {
+    if (name == "resolv-file") into.resolverFiles.push_back(value);
+    if (name == "no-resolv") into.readsResolverFiles = false;
+    if (name == "server") addServer(value, into.servers);
+    if ((name == "conf-file" || name == "servers-file") && into.files.size() < kMostFiles)
+        into.files.push_back(value);
+    if (name == "conf-dir" && into.folders.size() < kMostFiles) into.folders.push_back(value);
+    if (name == "enable-dbus") into.heedsBus = true;
+    if (name == "port" && value == "0") into.answersAtAll = false;
+    if (name == "listen-address") listenAt(value, into);
+    if (name == "except-interface" && std::ranges::count(partsOf(value), "lo") != 0)
+        into.answersAtAll = false;
+}
+
+/// "PATH,.old,*.conf": whether a file of the folder counts.
+bool counts(const std::string& file, const std::vector<std::string>& endings) {
+    if (file.starts_with(".") || file.ends_with("~") || (file.starts_with("#") && file.ends_with("#")))
+        return false;
+    bool wanted = true;
+    for (const std::string& each : endings) {
+        if (!each.starts_with("*")) {
+            if (file.ends_with(each)) return false;
+            continue;
+        }
+        if (file.ends_with(each.substr(1))) return true;
+        wanted = false;
+    }
+    return wanted;
+}
+
+std::vector<std::string> filesOf(const std::string& folder, const std::string& root) {
+    auto parts = partsOf(folder);
+    if (parts.empty()) return {};
+    const std::string path = parts[0];
+    parts.erase(parts.begin());
+    std::vector<std::string> files;
+    std::error_code failed;
+    for (std::filesystem::directory_iterator each(root + path, failed), end;
+         !failed && each != end && files.size() < kMostFiles; each.increment(failed)) {
+        const std::string name = each->path().filename();
+        if (counts(name, parts)) files.push_back(path + "/" + name);
+    }
+    return files;
+}
+
+/// All settings of a process: of its command line, and of the files that it and they name.
+DnsmasqSettings settingsOf(const std::vector<std::string>& command, const std::string& root) {
+    DnsmasqSettings settings;
+    readDnsmasqCommand(command, settings);
+    if (settings.files.empty()) settings.files.emplace_back("/etc/dnsmasq.conf");
+    std::size_t file = 0, folder = 0;
+    while (file < settings.files.size() || folder < settings.folders.size()) {
+        if (folder < settings.folders.size()) {
+            for (std::string& each : filesOf(settings.folders[folder++], root))
+                if (settings.files.size() < kMostFiles) settings.files.push_back(std::move(each));
+            continue;
+        }
+        if (const auto text = readSmallFile(root + settings.files[file++])) readDnsmasqFile(*text, settings);
+    }
+    return settings;
+}
+
+DnsmasqServers serversOf(const DnsmasqSettings& settings, const std::string& root) {
+    DnsmasqServers servers{settings.servers, settings.servers, settings.heedsBus};
+    if (!settings.readsResolverFiles) return servers;
+    auto files = settings.resolverFiles;
+    if (files.empty()) files.emplace_back("/etc/resolv.conf");
+    for (const std::string& file : files) {
+        const auto text = readSmallFile(root + file);
+        for (const IPAddress& each : text ? serversFromResolverFile(*text) : std::vector<IPAddress>())
+            if (!each.loopback()) servers.asked.push_back(each);
+    }
+    return servers;
+}
+
+}  // namespace
+
+void readDnsmasqFile(std::string_view text, DnsmasqSettings& into) {
+    for (std::string_view line : linesOf(text)) {
+        line = trimmed(line.substr(0, line.find('#') == 0 ? 0 : line.find(" #")));
+        const std::size_t equals = line.find('=');
+        const std::string name(trimmed(line.substr(0, equals)));
+        set(name, equals == line.npos ? "" : std::string(trimmed(line.substr(equals + 1))), into);
+    }
+}
+
+void readDnsmasqCommand(const std::vector<std::string>& words, DnsmasqSettings& into) {
+    for (std::size_t i = 1; i < words.size(); ++i) {
+        const std::string& word = words[i];
+        const std::size_t equals = word.find('=');
+        const bool isLong = word.starts_with("--");
+        if (word.size() < 2 || word[0] != '-') continue;
+        const auto option = std::ranges::find_if(kOptions, [&](const Option& each) {
+            return isLong ? word.substr(2, equals - 2) == each.name : each.letter == word[1];
+        });
+        if (option == std::end(kOptions)) continue;
+        std::string value;
+        if (isLong && equals != word.npos)
+            value = word.substr(equals + 1);
+        else if (!isLong && word.size() > 2)
+            value = word.substr(2);
+        else if (option->hasValue && i + 1 < words.size())
+            value = words[++i];
+        set(option->name, value, into);
+    }
+}
+
+std::optional<DnsmasqServers> dnsmasqServers(const std::string& root) {
+    std::vector<DnsmasqServers> all;
+    forEachProcess(root, [&](const std::vector<std::string>& command) {
+        if (programOf(command[0]) != "dnsmasq") return;
+        const DnsmasqSettings settings = settingsOf(command, root);
+        DnsmasqServers servers = serversOf(settings, root);
+        if (answersHere(settings) && (servers.heedsBus || !servers.asked.empty()))
+            all.push_back(std::move(servers));
+    });
+    if (all.size() != 1 || all[0].asked.empty()) return std::nullopt;
+    return all[0];
+}
+
+}  // namespace wp
