@@ -176,7 +176,7 @@ Known<SavedNetworks> gatherSaved(const Link& link, const Until& until) {
     Known<Bus> bus = Bus::system();
     if (!bus) return bus.error();
     const auto managed = readNetworkManagerLink(*bus, link.interfaceName, until);
-    if (managed) return networkManagerNetworks(*bus, until);
+    if (managed) return networkManagerNetworks(*bus, link.interfaceName, until);
     // What it hands to the supplicant is not its store.
     if (mayManage(managed.error())) return managed.error();
     const auto objects = iwdObjects(*bus, until);

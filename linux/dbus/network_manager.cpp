@@ -198,7 +198,7 @@ std::optional<SavedNetwork> savedFromNetworkManager(const BusValue& settings) {
     return network;
 }
 
-Known<SavedNetworks> networkManagerNetworks(Bus& bus, const Until& until) {
+Known<SavedNetworks> networkManagerNetworks(Bus& bus, const std::string& interfaceName, const Until& until) {
     const auto paths = bus.call(kSettings, kService + ".Settings", "ListConnections", {}, until);
     if (!paths) return paths.error();
     if (paths->list().size() > kMostConnections)
@@ -210,6 +210,8 @@ Known<SavedNetworks> networkManagerNetworks(Bus& bus, const Until& until) {
         // One that was deleted meanwhile is not remembered any more.
         if (!settings && settings.error().code == static_cast<int>(Reason::notFound)) continue;
         if (!settings) return settings.error();
+        const std::string boundTo = (*settings)["connection"]["interface-name"].text();
+        if (!boundTo.empty() && boundTo != interfaceName) continue;
         if (auto network = savedFromNetworkManager(*settings)) saved.networks.push_back(*network);
     }
     return saved;

@@ -41,8 +41,9 @@ Known<std::vector<IPAddress>> networkManagerGlobalServers(Bus& bus, const Until&
 Known<std::vector<IPAddress>> networkManagerServersElsewhere(Bus& bus, const std::string& interfaceName,
                                                              const Until& until);
 
-/// All Wi-Fi networks that NetworkManager remembers. *Any* thread.
-Known<SavedNetworks> networkManagerNetworks(Bus& bus, const Until& until);
+/// All Wi-Fi networks that NetworkManager remembers for the interface: those bound to another one are never joined
+/// on it. *Any* thread.
+Known<SavedNetworks> networkManagerNetworks(Bus& bus, const std::string& interfaceName, const Until& until);
 
 /// Whether Wi-Fi is switched on, by software and by hardware.
 struct WirelessPower {

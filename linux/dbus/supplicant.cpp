@@ -19,7 +19,8 @@ Known<BusObject> supplicantInterface(Bus& bus, const std::string& interfaceName,
 
 std::optional<SavedNetwork> savedFromSupplicant(const BusValue& properties, bool enabled) {
     const auto name = nameFromSupplicant(properties["ssid"].text());
-    if (!name) return std::nullopt;
+    // Other modes are networks that the device itself offers or that have no access point.
+    if (!name || properties["mode"].text("0") != "0") return std::nullopt;
     SavedNetwork network;
     network.name = *name;
     SupplicantSecrets secrets;

@@ -212,7 +212,7 @@ TEST_F(MessageBus, WhatASilentManagerWasToldIsNotReadFromAddresses) {
 
 TEST_F(MessageBus, NetworkManagerTellsItsNetworks) {
     Bus bus = this->bus();
-    const auto saved = networkManagerNetworks(bus, patience());
+    const auto saved = networkManagerNetworks(bus, "wlan0", patience());
     ASSERT_TRUE(saved) << saved.error().text();
     EXPECT_EQ(linesOf(*saved),
               "NetworkManager\n"

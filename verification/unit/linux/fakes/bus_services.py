@@ -94,8 +94,10 @@ def network_manager():
                        [text(bytes.fromhex("262000fe000000000000000000000009"))], signature="ay")},
                    "proxy": {"method": dbus.Int32(1), "pac-url": "http://wpad/"}})
     connection(2, {"connection": {"type": "802-3-ethernet"}, "802-3-ethernet": {}})
-    connection(3, {"connection": {"type": "802-11-wireless", "autoconnect": False},
+    connection(3, {"connection": {"type": "802-11-wireless", "autoconnect": False, "interface-name": "wlan0"},
                    "802-11-wireless": {"ssid": text(b"Cellar"), "hidden": True}})
+    connection(6, {"connection": {"type": "802-11-wireless", "interface-name": "wlan1"},
+                   "802-11-wireless": {"ssid": text(b"Elsewhere")}})
     connection(4, {"connection": {"type": "802-11-wireless"},
                    "802-11-wireless": {"ssid": text(b"Hotspot"), "mode": "ap"}})
     # One that belongs to somebody else.
@@ -117,12 +119,14 @@ def supplicant():
                    "if args[0] not in ('wlan0', 'wlan3'): raise dbus.exceptions.DBusException('no', "
                    "name='fi.w1.wpa_supplicant1.InterfaceUnknown')\n"
                    "ret = dbus.ObjectPath('%s/Interfaces/0')" % base)
-    networks = [base + "/Interfaces/0/Networks/%d" % i for i in range(2)]
+    networks = [base + "/Interfaces/0/Networks/%d" % i for i in range(4)]
     main.AddObject(base + "/Interfaces/0", name + ".Interface", {"Networks": dbus.Array(
         [dbus.ObjectPath(each) for each in networks], signature="o")},
         [("Scan", "a{sv}", "", "")])
     for path, enabled, properties in (
-            (networks[0], True, {"ssid": '"Home"', "key_mgmt": "WPA-PSK SAE", "proto": "WPA RSN"}),
+            (networks[0], True, {"ssid": '"Home"', "key_mgmt": "WPA-PSK SAE", "proto": "WPA RSN", "mode": "0"}),
+            (networks[2], False, {"ssid": '"Own"', "key_mgmt": "NONE", "mode": "2"}),
+            (networks[3], True, {"ssid": '"Mesh"', "key_mgmt": "SAE", "mode": "5"}),
             (networks[1], False, {"ssid": "c3bf00", "key_mgmt": "NONE", "scan_ssid": "1", "wep_key0": "*"})):
         main.AddObject(path, name + ".Network", {
             "Enabled": enabled, "Properties": dbus.Dictionary(properties, signature="sv")}, [])
