@@ -51,6 +51,7 @@ std::optional<int> signalOf(const Attributes& bss) {
 }
 
 std::optional<AccessPoint> accessPointOf(const Attributes& bss, std::int64_t now) {
+    constexpr std::uint16_t kOfAccessPoint = 1;  // the capability bit ESS
     const std::optional<MacAddress> address = addressIn(bss.find(NL80211_BSS_BSSID));
     if (!address) return std::nullopt;
     const Bytes latest = bss.find(NL80211_BSS_INFORMATION_ELEMENTS).value_or(Bytes());
@@ -63,6 +64,8 @@ std::optional<AccessPoint> accessPointOf(const Attributes& bss, std::int64_t now
     accessPoint.frequency = bss.number<std::uint32_t>(NL80211_BSS_FREQUENCY).value_or(0);
     accessPoint.beaconInterval = bss.number<std::uint16_t>(NL80211_BSS_BEACON_INTERVAL);
     accessPoint.capability = bss.number<std::uint16_t>(NL80211_BSS_CAPABILITY).value_or(0);
+    accessPoint.directOnly =
+        (bss.number<std::uint16_t>(NL80211_BSS_CAPABILITY).value_or(kOfAccessPoint) & kOfAccessPoint) == 0;
     accessPoint.signal = signalOf(bss);
     accessPoint.lastSeen = lastSeen(bss, now);
     accessPoint.joined =
@@ -144,8 +147,8 @@ bool RadioInterface::isStation() const {
 
 bool RadioChannel::carriesNetworks() const {
     constexpr std::uint32_t kMetersUntil = 1000, kVehiclesFrom = 5850, kVehiclesUntil = 5925,
-                            kChannel149 = 5745;
-    if (narrow) return false;
+                            kChannel149 = 5745, kChannel0 = 5000;
+    if (narrow || (bandOf(frequency) == Band::ghz5 && frequency < kChannel0)) return false;
     if (frequency < kVehiclesFrom || frequency > kVehiclesUntil) return frequency > kMetersUntil;
     return (frequency - kChannel149) % 20 == 0;
 }
@@ -242,14 +245,19 @@ Airtime readAirtime(Bytes buffer) {
 std::optional<Regulation> readRegulation(Bytes buffer, std::uint32_t radio) {
     std::optional<Regulation> system;
     std::optional<Regulation> own;
+    bool managesItself = false;
     forEachOf(NL80211_CMD_GET_REG, buffer, [&](const Attributes& message) {
         const auto country = message.text(NL80211_ATTR_REG_ALPHA2);
         if (!country || country->size() != 2) return;
         const auto of = message.number<std::uint32_t>(NL80211_ATTR_WIPHY);
         if (!of) system = Regulation{*country};
-        if (of == radio) own = Regulation{*country};
+        if (of != radio) return;
+        own = Regulation{*country};
+        managesItself = message.has(NL80211_ATTR_WIPHY_SELF_MANAGED_REG);
     });
-    return own ? own : system;
+    // Some drivers tell what their radio allows at most under a number; which country holds the system then says.
+    const bool isNumber = own && own->country[0] >= '0' && own->country[0] <= '9';
+    return own && (managesItself || !isNumber || !system) ? own : system;
 }
 
 std::optional<RadioAbilities> readAbilities(Bytes buffer, std::uint32_t radio) {

@@ -42,7 +42,7 @@ Survey readSurvey(Bytes buffer);
 /// What the radio has counted on each channel so far; channels on which it counts no time are left out.
 Airtime readAirtime(Bytes buffer);
 
-/// The domain of the radio, where it manages its own, else that of the whole system.
+/// The domain of the radio, where it manages its own or names a country, else that of the whole system.
 std::optional<Regulation> readRegulation(Bytes buffer, std::uint32_t radio);
 
 /// One channel that a radio could use.
@@ -53,7 +53,8 @@ struct RadioChannel {
     bool radar = false;
     bool narrow = false;  ///< not allowed for 20 MHz
     /// Whether a network of a home can be there. From 5850 MHz on kernels also list the channels of vehicles, 5 and
-    /// 10 MHz wide, between those of 20 MHz (IEEE 802.11, operating class 125), and below 1 GHz those of meters.
+    /// 10 MHz wide, between those of 20 MHz (IEEE 802.11, operating class 125), below 1 GHz those of meters, and below
+    /// 5 GHz those of rescue services.
     bool carriesNetworks() const;
     /// Whether it is to be looked at when networks are looked for: of 6 GHz those channels alone on which networks of that
     /// band announce themselves, every fourth one of 20 MHz from channel 5 on (IEEE 802.11ax, 26.17.2.3).

@@ -1,6 +1,7 @@
 #include "service/access_point.h"
 
 #include <algorithm>
+#include <cstdlib>
 #include <string_view>
 
 namespace wp {
@@ -24,16 +25,27 @@ void readRates(Advertised& says, Bytes rates) {
     }
 }
 
+/// Codes that name no country: those that ISO 3166 leaves to its users, of which makers take "XZ" and others for
+/// settings of their own (Kosovo's, XK, is one that countries have agreed on), and "EU", where each member
+/// has a code too.
+bool namesNoCountry(const CountryCode& code) {
+    const auto [first, second] = code;
+    if (first == 'X') return second != 'K';
+    if (first == 'Q') return second >= 'M';
+    return code == CountryCode{'A', 'A'} || code == CountryCode{'Z', 'Z'} || code == CountryCode{'E', 'U'};
+}
+
 std::optional<CountryCode> countryOf(Bytes element) {
     if (element.size() < 2) return std::nullopt;
+    // The third letter is the environment; in one of "X" the others are no country's.
+    if (element.size() > 2 && element[2] == 'X') return std::nullopt;
     CountryCode code{};
     for (std::size_t i = 0; i < code.size(); ++i) {
         const char letter = static_cast<char>(element[i] & ~0x20);
         if (element[i] >= 0x80 || letter < 'A' || letter > 'Z') return std::nullopt;
         code[i] = letter;
     }
-    // "XX" stands for no country at all.
-    return code == CountryCode{'X', 'X'} ? std::nullopt : std::optional(code);
+    return namesNoCountry(code) ? std::nullopt : std::optional(code);
 }
 
 std::optional<std::uint8_t> byteAt(const Element& element, std::size_t at) {
@@ -78,6 +90,12 @@ void readNames(Advertised& says, const Elements& latest, const std::optional<Ele
     }
 }
 
+/// A network that another one's beacon tells has a DTIM period of its own there.
+std::optional<std::uint8_t> dtimPeriodIn(const Elements& beacon) {
+    const auto own = byteAt(beacon.multipleBssidIndex, 1);
+    return own ? own : byteAt(beacon.trafficMap, 1);
+}
+
 }  // namespace
 
 std::string textOf(const MacAddress& address) {
@@ -91,13 +109,24 @@ std::string textOf(const MacAddress& address) {
     return text;
 }
 
+bool areOfOneDevice(const MacAddress& one, const MacAddress& other) {
+    // Multiple BSSID sets of an access point have at most 16 addresses in use.
+    constexpr int kMostApart = 15;
+    return std::equal(one.begin() + 1, one.end() - 1, other.begin() + 1) &&
+           std::abs(one.back() - other.back()) <= kMostApart;
+}
+
+bool shareRadio(const AccessPoint& one, const AccessPoint& other) {
+    return one.frequency == other.frequency && areOfOneDevice(one.address, other.address);
+}
+
 Advertised decodeAdvertised(std::uint16_t capability, Bytes latest, std::optional<Bytes> beacon) {
     const Elements inLatest = decodeElements(latest);
     const std::optional<Elements> inBeacon = decodeBeacon(inLatest, latest, beacon);
     const Elements elements = united(inLatest, inBeacon);
     Advertised says;
     readNames(says, inLatest, inBeacon);
-    if (inBeacon) says.dtimPeriod = byteAt(inBeacon->trafficMap, 1);
+    if (inBeacon) says.dtimPeriod = dtimPeriodIn(*inBeacon);
     readRates(says, elements.rates.bytes());
     readRates(says, elements.extendedRates.bytes());
     says.security = decodeSecurity(capability, elements);

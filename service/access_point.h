@@ -17,6 +17,9 @@ using CountryCode = std::array<char, 2>;
 
 /// "02:00:00:00:00:01". *Any* thread.
 std::string textOf(const MacAddress& address);
+/// Whether the addresses are most likely of one device, which has one for each band and name: makers count up
+/// the last byte or change bits of the first one. *Any* thread.
+bool areOfOneDevice(const MacAddress& one, const MacAddress& other);
 
 /// What an access point's elements say, in the tests' terms.
 struct Advertised {
@@ -51,12 +54,16 @@ struct AccessPoint {
     std::optional<int> signal;             ///< dBm
     std::optional<std::int64_t> lastSeen;  ///< ms on the clock that counts suspended time too
     bool joined = false;                   ///< this device is joined to it
-    std::vector<std::uint8_t> elements;    ///< of the latest probe response, else of the latest beacon
+    bool directOnly = false;  ///< none: a node of a mesh or an ad-hoc network, which shares the air
+    std::vector<std::uint8_t> elements;  ///< of the latest probe response, else of the latest beacon
     std::optional<std::vector<std::uint8_t>> beaconElements;  ///< absent while no beacon was heard
     Advertised says;
 
     Band band() const { return bandOf(frequency); }
 };
+
+/// Whether the two are names that one radio of a device works under. *Any* thread.
+bool shareRadio(const AccessPoint& one, const AccessPoint& other);
 
 /// Reads the elements of the latest frame, as far as the kernel tells, and of a beacon, where one was heard. They complete
 /// each other, and the beacon comes first: once a probe was answered the kernel keeps that answer for the latest frame

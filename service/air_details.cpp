@@ -14,8 +14,8 @@ AirFacts airOf(const Facts& facts) {
     return {facts.nearby, facts.airtime, facts.allowedChannels};
 }
 
-const MacAddress* ownAddress(const Facts& facts) {
-    return facts.link && facts.link->joined ? &facts.link->joined->address : nullptr;
+const AccessPoint* ownAccessPoint(const Facts& facts) {
+    return facts.link && facts.link->joined ? &*facts.link->joined : nullptr;
 }
 
 std::string_view wordOf(ChannelJudgement::Basis basis) {
@@ -68,8 +68,9 @@ DictionaryPointer channelEntry(const AllowedChannel& channel, const Facts& facts
                   {"radar", channel.radar},
                   {"listensOnly", channel.listensOnly}};
     if (air.nearby)
-        entry.emplace("strongNeighbours", strongOverlaps(channel.frequency, *air.nearby, ownAddress(facts)));
-    addJudgement(entry, judgeChannelAt(channel.frequency, air, ownAddress(facts),
+        entry.emplace("strongNeighbours",
+                      strongOverlaps(channel.frequency, *air.nearby, ownAccessPoint(facts)));
+    addJudgement(entry, judgeChannelAt(channel.frequency, air, ownAccessPoint(facts),
                                        facts.settings.thresholds.congestion));
     return Dictionary::make(std::move(entry));
 }
@@ -81,8 +82,8 @@ Details bandDetails(Band band, const Facts& facts) {
     const std::vector<std::uint32_t> frequencies = choosableIn(band, *facts.allowedChannels);
     Array full;
     for (const std::uint32_t frequency : frequencies) {
-        const auto judged =
-            judgeChannelAt(frequency, airOf(facts), ownAddress(facts), facts.settings.thresholds.congestion);
+        const auto judged = judgeChannelAt(frequency, airOf(facts), ownAccessPoint(facts),
+                                           facts.settings.thresholds.congestion);
         if (judged && judged->full) full.emplace_back(channelOf(frequency));
     }
     details.emplace("consideredChannels", listOf(frequencies, channelOf));
@@ -95,7 +96,7 @@ Details bandDetails(Band band, const Facts& facts) {
 Details channelDetails(const Facts& facts) {
     Details details;
     addCongestionThresholds(details, facts.settings.thresholds.congestion);
-    if (const auto judged = judgedAccessPoint(facts))
+    if (const auto judged = judgedAsHeardLast(facts))
         addJudgement(details, judgeChannelOf(**judged, airOf(facts), facts.settings.thresholds.congestion));
     if (facts.nearby) details.emplace("networks", listOf(*facts.nearby, networkEntry));
     if (facts.allowedChannels)

@@ -13,19 +13,33 @@ double weight(int signal) {
     return signal >= kDecodedWell ? 1.0 : signal >= kDeferredTo ? 0.5 : 0.0;
 }
 
-/// Calls `visit(signal)` for each access point that overlaps the 20 MHz around the frequency.
-template <class Visit>
-void forEachOverlap(std::uint32_t frequency, const std::vector<AccessPoint>& nearby, const MacAddress* own,
-                    Visit visit) {
+/// The access point may have changed its channel since it was looked at.
+bool isOf(const AccessPoint* own, const AccessPoint& each) {
+    return own != nullptr && (each.address == own->address || shareRadio(each, *own));
+}
+
+bool overlaps(const AccessPoint& accessPoint, const Span& wanted) {
+    const auto spans = occupiedBy(accessPoint);
+    return std::any_of(spans.begin(), spans.end(),
+                       [&](const Span& span) { return span.low < wanted.high && wanted.low < span.high; });
+}
+
+/// Of each radio that overlaps the 20 MHz around the frequency, the name that is heard best.
+std::vector<const AccessPoint*> overlappingRadios(std::uint32_t frequency,
+                                                  const std::vector<AccessPoint>& nearby,
+                                                  const AccessPoint* own) {
     const Span wanted{frequency - 10, frequency + 10};
+    std::vector<const AccessPoint*> radios;
     for (const AccessPoint& each : nearby) {
-        if (!each.signal || (own != nullptr && each.address == *own)) continue;
-        const auto spans = occupiedBy(each);
-        const bool overlaps = std::any_of(spans.begin(), spans.end(), [&](const Span& span) {
-            return span.low < wanted.high && wanted.low < span.high;
-        });
-        if (overlaps) visit(*each.signal);
+        if (!each.signal || isOf(own, each) || !overlaps(each, wanted)) continue;
+        const auto same = std::find_if(radios.begin(), radios.end(),
+                                       [&](const AccessPoint* radio) { return shareRadio(*radio, each); });
+        if (same == radios.end())
+            radios.push_back(&each);
+        else if (each.signal > (*same)->signal)
+            *same = &each;
     }
+    return radios;
 }
 
 bool ranBackwards(const ChannelTime& before, const ChannelTime& after) {
@@ -59,17 +73,18 @@ std::optional<double> foreignLoad(const ChannelTime& channel) {
     return std::clamp(foreign / static_cast<double>(channel.time - channel.transmit), 0.0, 1.0);
 }
 
-double overlapWeight(std::uint32_t frequency, const std::vector<AccessPoint>& nearby, const MacAddress* own) {
+double overlapWeight(std::uint32_t frequency, const std::vector<AccessPoint>& nearby,
+                     const AccessPoint* own) {
     double sum = 0;
-    forEachOverlap(frequency, nearby, own, [&](int signal) { sum += weight(signal); });
+    for (const AccessPoint* each : overlappingRadios(frequency, nearby, own)) sum += weight(*each->signal);
     return sum;
 }
 
 std::size_t strongOverlaps(std::uint32_t frequency, const std::vector<AccessPoint>& nearby,
-                           const MacAddress* own) {
-    std::size_t count = 0;
-    forEachOverlap(frequency, nearby, own, [&](int signal) { count += signal >= kDecodedWell ? 1U : 0U; });
-    return count;
+                           const AccessPoint* own) {
+    const auto radios = overlappingRadios(frequency, nearby, own);
+    return static_cast<std::size_t>(std::count_if(
+        radios.begin(), radios.end(), [](const AccessPoint* each) { return *each->signal >= kDecodedWell; }));
 }
 
 std::optional<double> interferenceFactor(const ChannelTime& channel, int lowestNoise) {

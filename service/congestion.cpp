@@ -27,10 +27,6 @@ std::optional<double> measuredLoad(const AirFacts& air, std::uint32_t frequency)
     return channel != nullptr ? foreignLoad(*channel) : std::nullopt;
 }
 
-const MacAddress* addressOf(const AccessPoint* accessPoint) {
-    return accessPoint != nullptr ? &accessPoint->address : nullptr;
-}
-
 bool isChoosable(Band band, std::uint32_t frequency) {
     const int number = channelOf(frequency);
     const bool apart = number == 1 || number == 6 || number == 11;
@@ -67,7 +63,7 @@ Candidates scored(const AirFacts& air, Band band, const AccessPoint* own) {
     if (scoreByAirtime(candidates, air)) return candidates;
     if (!air.nearby) return {};
     for (Candidate& candidate : candidates)
-        candidate.score = overlapWeight(candidate.channel.frequency, *air.nearby, addressOf(own));
+        candidate.score = overlapWeight(candidate.channel.frequency, *air.nearby, own);
     return candidates;
 }
 
@@ -121,7 +117,7 @@ Dictionary::Entries information(const AirFacts& air, const AccessPoint* own) {
 
 using Basis = ChannelJudgement::Basis;
 
-Known<ChannelJudgement> byOverlap(std::uint32_t frequency, const AirFacts& air, const MacAddress* own,
+Known<ChannelJudgement> byOverlap(std::uint32_t frequency, const AirFacts& air, const AccessPoint* own,
                                   const CongestionLimits& limits) {
     if (!air.nearby) return air.nearby.error();
     const double weight = overlapWeight(frequency, *air.nearby, own);
@@ -135,7 +131,7 @@ Outcome bandIsCongested(Band band, const AirFacts& air, const AccessPoint* own,
     if (frequencies.empty()) return failure(Reason::unsupported, "the radio has no channel of this band");
     bool all = true;
     for (const std::uint32_t frequency : frequencies) {
-        const auto judged = judgeChannelAt(frequency, air, addressOf(own), limits);
+        const auto judged = judgeChannelAt(frequency, air, own, limits);
         if (!judged) return judged.error();
         all = all && judged->full;
     }
@@ -156,7 +152,7 @@ std::vector<std::uint32_t> choosableIn(Band band, const AllowedChannels& allowed
     return frequencies;
 }
 
-Known<ChannelJudgement> judgeChannelAt(std::uint32_t frequency, const AirFacts& air, const MacAddress* own,
+Known<ChannelJudgement> judgeChannelAt(std::uint32_t frequency, const AirFacts& air, const AccessPoint* own,
                                        const CongestionLimits& limits) {
     const auto load = measuredLoad(air, frequency);
     if (load) return ChannelJudgement{Basis::measuredLoad, *load, *load >= limits.load};
@@ -170,7 +166,7 @@ Known<ChannelJudgement> judgeChannelOf(const AccessPoint& judged, const AirFacts
     if (advertised && !(load && judged.joined))
         return ChannelJudgement{Basis::advertisedLoad, *advertised / 255.0,
                                 *advertised >= limits.advertisedLoad};
-    return judgeChannelAt(judged.frequency, air, &judged.address, limits);
+    return judgeChannelAt(judged.frequency, air, &judged, limits);
 }
 
 Outcome channelIsCongested(const AccessPoint& judged, const AirFacts& air, const AccessPoint* own,

@@ -42,7 +42,7 @@ struct ChannelJudgement {
 Known<ChannelJudgement> judgeChannelOf(const AccessPoint& judged, const AirFacts& air,
                                        const CongestionLimits& limits);
 /// Any channel, by what the radio measured there, else by what overlaps. \param own is left out. *Any* thread.
-Known<ChannelJudgement> judgeChannelAt(std::uint32_t frequency, const AirFacts& air, const MacAddress* own,
+Known<ChannelJudgement> judgeChannelAt(std::uint32_t frequency, const AirFacts& air, const AccessPoint* own,
                                        const CongestionLimits& limits);
 /// The frequencies that come into question in a band: the three of 2.4 GHz that do not overlap, and all of the
 /// others, the lowest first. *Any* thread.

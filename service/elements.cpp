@@ -23,6 +23,7 @@ constexpr std::array<Slot, 256> singleSlots() {
     slots[50] = &Elements::extendedRates;
     slots[61] = &Elements::htOperation;
     slots[68] = &Elements::wapi;
+    slots[85] = &Elements::multipleBssidIndex;
     slots[107] = &Elements::interworking;
     slots[127] = &Elements::extendedCapabilities;
     slots[191] = &Elements::vhtCapabilities;
@@ -45,6 +46,10 @@ Slot vendorSlot(std::uint32_t vendorAndType) {
             return &Elements::onlineSignUp;
         case 0x506F9A1C:
             return &Elements::oweTransition;
+        case 0x506F9A29:
+            return &Elements::rsnOverride;
+        case 0x506F9A2A:
+            return &Elements::rsnOverride2;
         default:
             return nullptr;
     }
@@ -92,6 +97,7 @@ constexpr Slot kAll[] = {
     &Elements::extendedRates,
     &Elements::htOperation,
     &Elements::wapi,
+    &Elements::multipleBssidIndex,
     &Elements::interworking,
     &Elements::hotspot,
     &Elements::extendedCapabilities,
@@ -105,6 +111,8 @@ constexpr Slot kAll[] = {
     &Elements::ehtCapabilities,
     &Elements::onlineSignUp,
     &Elements::oweTransition,
+    &Elements::rsnOverride,
+    &Elements::rsnOverride2,
 };
 
 }  // namespace

@@ -28,6 +28,7 @@ struct Elements {
     Element extendedRates;         ///< 50
     Element htOperation;           ///< 61
     Element wapi;                  ///< 68
+    Element multipleBssidIndex;    ///< 85, of a network that another one's beacon tells
     Element interworking;          ///< 107
     Element extendedCapabilities;  ///< 127
     Element vhtCapabilities;       ///< 191
@@ -41,6 +42,8 @@ struct Elements {
     Element hotspot;               ///< vendor 50-6F-9A, 16
     Element onlineSignUp;          ///< vendor 50-6F-9A, 18
     Element oweTransition;         ///< vendor 50-6F-9A, 28
+    Element rsnOverride;   ///< vendor 50-6F-9A, 41: like the RSN element, for stations that look for it
+    Element rsnOverride2;  ///< vendor 50-6F-9A, 42: another one
 
     bool malformed = false;  ///< an element's length reached beyond the end; those before it are kept
 };

@@ -86,8 +86,11 @@ std::map<CountryCode, std::set<MacAddress>> countryWitnesses(const Facts& facts,
     if (!facts.nearby) return witnesses;
     for (const AccessPoint& each : *facts.nearby) {
         if (!each.says.country || each.address == judged.address) continue;
-        if (each.signal && *each.signal >= kWeakestCountrySignal)
-            witnesses[*each.says.country].insert(each.address);
+        if (!each.signal || *each.signal < kWeakestCountrySignal) continue;
+        std::set<MacAddress>& addresses = witnesses[*each.says.country];
+        // One device is one witness, whatever number of bands and names it has.
+        const auto isSame = [&](const MacAddress& other) { return areOfOneDevice(each.address, other); };
+        if (std::ranges::none_of(addresses, isSame)) addresses.insert(each.address);
     }
     return witnesses;
 }

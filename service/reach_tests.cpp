@@ -19,8 +19,9 @@ AirFacts airOf(const Facts& facts) {
 /// Whether the scan heard the name from more than one access point.
 bool heardFromSeveral(const Facts& facts, const NetworkName& name) {
     if (!facts.nearby || name.absent()) return false;
-    return std::ranges::count_if(*facts.nearby,
-                                 [&](const AccessPoint& each) { return each.says.name == name; }) > 1;
+    return std::ranges::count_if(*facts.nearby, [&](const AccessPoint& each) {
+               return !each.directOnly && each.says.name == name;
+           }) > 1;
 }
 
 /// What the joined network's router says of itself; else why nobody knows who made the access point.
@@ -71,7 +72,7 @@ Outcome vendorContentArrives(const Facts& facts) {
 }
 
 Outcome channelIsFull(const Facts& facts) {
-    const auto judged = judgedAccessPoint(facts);
+    const auto judged = judgedAsHeardLast(facts);
     if (!judged) return judged.error();
     return channelIsCongested(**judged, airOf(facts), joined(facts), facts.settings.thresholds.congestion);
 }

@@ -44,7 +44,8 @@ std::vector<const AccessPoint*> hiddenAccessPoints(const std::vector<AccessPoint
     std::vector<const AccessPoint*> hidden;
     for (const auto* heard : {&nearby, &listened})
         for (const AccessPoint& each : *heard)
-            if (each.says.name.absent() && told.insert(each.address).second) hidden.push_back(&each);
+            if (!each.directOnly && each.says.name.absent() && told.insert(each.address).second)
+                hidden.push_back(&each);
     return hidden;
 }
 
@@ -52,7 +53,8 @@ std::vector<const AccessPoint*> distinctAccessPoints(const std::vector<AccessPoi
     const std::set<MacAddress> named = addressesWithName(nearby);
     std::vector<const AccessPoint*> distinct;
     for (const AccessPoint& each : nearby)
-        if (!each.says.name.absent() || !named.contains(each.address)) distinct.push_back(&each);
+        if (!each.directOnly && (!each.says.name.absent() || !named.contains(each.address)))
+            distinct.push_back(&each);
     return distinct;
 }
 

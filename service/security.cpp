@@ -133,6 +133,14 @@ ElementSuites decodeSuites(Bytes body, std::uint8_t defaultCipher) {
     return suites;
 }
 
+void addRsn(SecuritySuites& suites, const ElementSuites& rsn) {
+    suites.keyManagement |= rsn.keyManagement;
+    suites.rsnPairwise |= rsn.pairwise;
+    suites.pairwise |= rsn.pairwise;
+    suites.group |= rsn.group;
+    suites.malformed |= rsn.malformed;
+}
+
 Security enterprise(const SecuritySuites& suites) {
     const std::uint16_t keys = suites.keyManagement;
     const bool wpa2 = keys & SecuritySuites::kEnterprise;
@@ -165,12 +173,11 @@ SecuritySuites decodeSecurity(std::uint16_t capability, const Elements& elements
     if (elements.rsn.present()) {
         const ElementSuites rsn = decodeSuites(elements.rsn.bytes(), SecuritySuites::kCcmpOrBetter);
         suites.rsn = true;
-        suites.keyManagement = rsn.keyManagement;
-        suites.rsnPairwise = rsn.pairwise;
-        suites.pairwise = rsn.pairwise;
-        suites.group = rsn.group;
+        addRsn(suites, rsn);
         suites.frameProtectionRequired = rsn.capabilities & kFrameProtectionRequiredBit;
-        suites.malformed = rsn.malformed;
+        // What the override elements say is offered beside it.
+        for (const Element* each : {&elements.rsnOverride, &elements.rsnOverride2})
+            if (each->present()) addRsn(suites, decodeSuites(each->bytes(), SecuritySuites::kCcmpOrBetter));
     }
     if (elements.wpa.present()) {
         const ElementSuites wpa = decodeSuites(elements.wpa.bytes(), SecuritySuites::kTkip);

@@ -28,11 +28,11 @@ struct SecuritySuites {
     bool oweTransition = false;  ///< names an encrypted twin
     bool malformed = false;  ///< a security element, or the elements before it, ended too early; incomplete
     bool frameProtectionRequired = false;
-    std::uint16_t keyManagement = 0;     ///< of the RSN element
+    std::uint16_t keyManagement = 0;     ///< of the RSN element and those that override it
     std::uint16_t wpaKeyManagement = 0;  ///< of the WPA element
-    std::uint8_t pairwise = 0;           ///< of both elements
-    std::uint8_t rsnPairwise = 0;        ///< of the RSN element
-    std::uint8_t group = 0;              ///< of both elements
+    std::uint8_t pairwise = 0;           ///< of all elements
+    std::uint8_t rsnPairwise = 0;        ///< of the RSN element and those that override it
+    std::uint8_t group = 0;              ///< of all elements
 };
 
 /// Reads capability bits and security elements. *Any* thread.

@@ -19,6 +19,16 @@ Bytes messageBytes(NetlinkRequest& message) {
     return {reinterpret_cast<const std::uint8_t*>(&message.message()), message.message().nlmsg_len};
 }
 
+/// A message of the kernel's, whose attributes `put` puts in.
+template <class Put>
+Buffer messageOf(std::uint8_t command, Put put) {
+    NetlinkRequest message(0x1C, 0);
+    message.header<genlmsghdr>() = {command, 1, 0};
+    put(message);
+    const auto* const bytes = reinterpret_cast<const std::uint8_t*>(&message.message());
+    return {bytes, bytes + message.message().nlmsg_len};
+}
+
 const AccessPoint& joinedIn(const std::vector<AccessPoint>& accessPoints) {
     return *std::ranges::find_if(accessPoints, &AccessPoint::joined);
 }
@@ -102,6 +112,23 @@ TEST(RadioMessages, TellAHiddenNeighbourByItsBeacon) {
                                     [](const AccessPoint& each) { return each.says.hidesName == true; }));
 }
 
+TEST(RadioMessages, TellAnAccessPointFromNodesOfAMeshAndAdHocNetworks) {
+    const auto isDirectOnly = [](std::uint16_t capability) {
+        const Buffer message = messageOf(NL80211_CMD_NEW_SCAN_RESULTS, [&](NetlinkRequest& request) {
+            const std::uint8_t address[6] = {2};
+            nlattr* const bss = request.beginNest(NL80211_ATTR_BSS);
+            request.put(NL80211_BSS_BSSID, address);
+            request.put(NL80211_BSS_CAPABILITY, Bytes(reinterpret_cast<const std::uint8_t*>(&capability), 2));
+            request.endNest(bss);
+        });
+        return readAccessPoints(message, 0).at(0).directOnly;
+    };
+
+    EXPECT_FALSE(isDirectOnly(0x0411));
+    EXPECT_TRUE(isDirectOnly(0x0002));
+    EXPECT_TRUE(isDirectOnly(0x0010));
+}
+
 TEST(RadioMessages, TellTheLink) {
     const auto station = readStation(captured("good-home-station"));
 
@@ -127,6 +154,28 @@ TEST(RadioMessages, TellTheRegulatoryDomainOfTheSystem) {
     ASSERT_TRUE(regulation);
     EXPECT_EQ("US", regulation->country);
     EXPECT_FALSE(readRegulation({}, 0));
+}
+
+TEST(RadioMessages, TellTheRadiosOwnRegulatoryDomainWhereItNamesACountryOrIsManagedByTheRadio) {
+    const auto domain = [](const char* country, std::optional<std::uint32_t> radio,
+                           bool managesItself = false) {
+        return messageOf(NL80211_CMD_GET_REG, [&](NetlinkRequest& message) {
+            message.put(NL80211_ATTR_REG_ALPHA2, Bytes(reinterpret_cast<const std::uint8_t*>(country), 3));
+            if (radio) message.put(NL80211_ATTR_WIPHY, *radio);
+            if (managesItself) message.put(NL80211_ATTR_WIPHY_SELF_MANAGED_REG, Bytes());
+        });
+    };
+    const auto told = [&](const Buffer& own) {
+        Buffer dump = domain("US", std::nullopt);
+        dump.insert(dump.end(), own.begin(), own.end());
+        return readRegulation(dump, 2)->country;
+    };
+
+    EXPECT_EQ("DE", told(domain("DE", 2)));
+    EXPECT_EQ("US", told(domain("DE", 3)));
+    EXPECT_EQ("US", told(domain("99", 2)));
+    EXPECT_EQ("00", told(domain("00", 2, true)));
+    EXPECT_EQ("99", readRegulation(domain("99", 2), 2)->country);
 }
 
 TEST(RadioMessages, GatherARadioFromItsManyMessages) {
@@ -158,7 +207,7 @@ TEST(RadioMessages, KnowARadioThatTheKernelScansFromOneThatScansByItself) {
 
 TEST(RadioMessages, KnowTheChannelsOfVehiclesFromThoseOfNetworks) {
     std::vector<std::uint32_t> leftOut;
-    for (std::uint32_t frequency = 2400; frequency <= 7115; ++frequency)
+    for (std::uint32_t frequency = 5000; frequency <= 7115; ++frequency)
         if (!RadioChannel{frequency, false, false, false}.carriesNetworks()) leftOut.push_back(frequency);
 
     const auto isLeftOut = [&](std::uint32_t frequency) {
@@ -170,6 +219,10 @@ TEST(RadioMessages, KnowTheChannelsOfVehiclesFromThoseOfNetworks) {
         EXPECT_TRUE(isLeftOut(vehicles)) << vehicles;
     EXPECT_GT(leftOut.front(), 5845U);
     EXPECT_LT(leftOut.back(), 5955U);
+    for (const std::uint32_t other : {920, 4920, 4980})
+        EXPECT_FALSE((RadioChannel{other, false, false, false}.carriesNetworks())) << other;
+    for (const std::uint32_t network : {2412, 2484})
+        EXPECT_TRUE((RadioChannel{network, false, false, false}.carriesNetworks())) << network;
 }
 
 TEST(RadioMessages, TellAChannelThatIsTooNarrowForNetworks) {

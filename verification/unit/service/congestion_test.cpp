@@ -82,7 +82,36 @@ TEST(ChannelLoad, NearOnesWeighFullFarOnesHalfOrNothing) {
     const std::vector<AccessPoint> nearby = {at(2412, -67), at(2417, -68), at(2427, -82), at(2412, -83),
                                              at(2437, -30)};
     EXPECT_DOUBLE_EQ(overlapWeight(2412, nearby, nullptr), 2.0);
-    EXPECT_DOUBLE_EQ(overlapWeight(2412, nearby, &nearby[0].address), 1.0);
+    EXPECT_DOUBLE_EQ(overlapWeight(2412, nearby, &nearby[0]), 1.0);
+}
+
+TEST(ChannelLoad, ARadioCountsOnceWhateverItsNames) {
+    const AccessPoint home = at(2412, -40);
+    AccessPoint guests = at(2412, -42), elsewhere = at(2437, -40), stranger = at(2412, -60);
+    guests.address = elsewhere.address = home.address;
+    guests.address.back() += 15;
+    elsewhere.address.front() |= 8;
+    AccessPoint strangersGuests = at(2412, -70);
+    strangersGuests.address = stranger.address;
+    strangersGuests.address.front() |= 4;
+    AccessPoint neighbour = at(2412, -60);
+    neighbour.address = stranger.address;
+    neighbour.address.back() += 16;
+
+    const std::vector<AccessPoint> nearby = {home, guests, elsewhere, strangersGuests, stranger};
+    EXPECT_DOUBLE_EQ(overlapWeight(2412, nearby, &home), 1.0);
+    EXPECT_DOUBLE_EQ(overlapWeight(2412, nearby, nullptr), 2.0);
+    EXPECT_EQ(strongOverlaps(2412, nearby, nullptr), 2U);
+    EXPECT_DOUBLE_EQ(overlapWeight(2437, nearby, &home), 1.0);
+    EXPECT_DOUBLE_EQ(overlapWeight(2412, {stranger, neighbour}, nullptr), 2.0);
+}
+
+TEST(ChannelLoad, TheOwnAccessPointIsLeftOutWhereItHasChangedItsChannelMeanwhile) {
+    const AccessPoint before = at(2412, -40);
+    AccessPoint after = before;
+    after.frequency = 2437;
+
+    EXPECT_DOUBLE_EQ(overlapWeight(2437, {after}, &before), 0.0);
 }
 
 TEST(Congestion, MeasuredAirtimeDecidesForTheJoinedNetwork) {

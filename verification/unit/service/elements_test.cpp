@@ -110,6 +110,15 @@ TEST(Advertised, OfEitherFrameAloneIsWhatItSays) {
     EXPECT_EQ(200, decodeAdvertised(0, {}, Bytes(loadElement(200))).load);
 }
 
+TEST(Elements, OfANetworkWithinAnothersBeaconTellItsOwnDtimPeriod) {
+    const Frame beacon = element(5, {0, 1, 0, 0}) + element(85, {1, 5, 0});
+
+    EXPECT_EQ(5, decodeAdvertised(0, beacon, beacon).dtimPeriod);
+    // In answers the element has no period.
+    EXPECT_EQ(1,
+              decodeAdvertised(0, element(85, {1}), element(5, {0, 1, 0, 0}) + element(85, {1})).dtimPeriod);
+}
+
 TEST(Elements, ReadNoByteBeyondAnyPrefixOfAFrame) {
     const Frame frame = nameElement("Home") + rsnElement(4, {4, 2}, {2, 8}) + wpaElement({2}, {2}) +
                         element(7, {'U', 'S', ' '}) + element(255, {35, 1});

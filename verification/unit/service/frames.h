@@ -61,7 +61,7 @@ inline AccessPoint heard(const Frame& beacon, std::uint32_t frequency = 2412, in
                          std::uint16_t capability = 0) {
     static std::uint8_t last = 0;
     AccessPoint accessPoint;
-    accessPoint.address = {2, 0, 0, 0, 0, ++last};
+    accessPoint.address = {2, 0, 0, 0, ++last, 0};  // each a device of its own
     accessPoint.frequency = frequency;
     accessPoint.signal = signal;
     accessPoint.beaconInterval = 100;

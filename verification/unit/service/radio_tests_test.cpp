@@ -62,11 +62,53 @@ TEST(RadioTests, WantTwoStrongWitnessesOfAnotherCountry) {
     EXPECT_TRUE(verdict({home, one, two}));
 }
 
+TEST(RadioTests, TakeADevicesBandsAndNamesForOneWitnessOfACountry) {
+    const AccessPoint home = heard(kName + country("US"));
+    const AccessPoint one = heard(nameElement("A") + country("DE"), 2412, -60);
+    AccessPoint otherBand = heard(nameElement("A") + country("DE"), 5180, -60), guests = otherBand;
+    otherBand.address = guests.address = one.address;
+    otherBand.address.back() += 4;
+    guests.address.front() |= 2;
+    Facts facts = joinedTo({home, one, otherBand, guests});
+    facts.regulation = Regulation{"US"};
+
+    EXPECT_FALSE(resultOf(28, facts));
+}
+
+TEST(RadioTests, TakeCodesOfNoCountryForNone) {
+    const auto verdict = [](const Frame& element) {
+        Facts facts = joinedTo({heard(kName + element)});
+        facts.regulation = Regulation{"US"};
+        return resultOf(28, facts);
+    };
+    for (const char* code : {"XZ", "XX", "ZZ", "AA", "QM", "EU", "00"})
+        EXPECT_FALSE(verdict(country(code))) << code;
+    for (const char* code : {"XK", "QA", "ZA", "AE", "GB"}) EXPECT_TRUE(verdict(country(code))) << code;
+    EXPECT_FALSE(verdict(element(7, {'D', 'E', 'X', 1, 13, 20})));
+    EXPECT_TRUE(verdict(element(7, {'D', 'E', 'O', 1, 13, 20})));
+    EXPECT_TRUE(verdict(element(7, {'D', 'E', 4, 1, 13, 20})));
+}
+
 TEST(RadioTests, CannotTellAboutCountriesWithoutTheAdoptedOne) {
     Facts facts = joinedTo({heard(kName + country("DE"))});
     facts.regulation = failure(Reason::unavailable, "no regulatory domain");
 
     EXPECT_EQ(4, errorOf(28, facts));
+}
+
+TEST(RadioTests, TakeTheLoadThatTheJoinedAccessPointAnnouncedLast) {
+    const auto loaded = [](std::uint8_t load) { return kName + element(11, {1, 0, load, 0, 0}); };
+    Facts facts = joinedTo({heard(loaded(200))});
+    facts.link->joined->says = heard(loaded(20)).says;
+    EXPECT_TRUE(resultOf(24, facts));
+
+    facts.link->joined->lastSeen = 5000;
+    facts.nearby->front().lastSeen = 4999;
+    EXPECT_FALSE(resultOf(24, facts));
+    facts.nearby->front().lastSeen = 5001;
+    EXPECT_TRUE(resultOf(24, facts));
+    facts.nearby = failure(Reason::timeout, "no scan");
+    EXPECT_FALSE(resultOf(24, facts));
 }
 
 TEST(RadioTests, FindASignalPoorBelowMinus75) {

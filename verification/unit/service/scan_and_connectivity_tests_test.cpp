@@ -69,6 +69,19 @@ TEST(ScanTests, CountHiddenAccessPointsThatOnlyListeningHeardOnce) {
     EXPECT_EQ(2U, scanIn(31, facts).size());
 }
 
+TEST(ScanTests, TakeNoNodeOfAMeshAndNoAdHocNetworkForAnAccessPoint) {
+    AccessPoint node = heard(nameElement("")), adHoc = heard(nameElement("Home"), 5180, -30);
+    node.directOnly = adHoc.directOnly = true;
+    const AccessPoint home = heard(nameElement("Home"), 5200, -60);
+    Facts facts = joinedTo({home, node, adHoc});
+    facts.listened = std::vector<AccessPoint>{node};
+
+    EXPECT_FALSE(resultOf(30, facts));
+    EXPECT_EQ(1U, scanIn(31, facts).size());
+    EXPECT_EQ(Value(-60), infoOf(32, askedAbout("Home", *facts.nearby), "RSSI"));
+    EXPECT_EQ(3, errorOf(32, askedAbout("Home", {node, adHoc})));
+}
+
 TEST(ScanTests, CannotTellAboutHiddenNetworksWithoutListening) {
     Facts facts = joinedTo({heard(nameElement("Home"))});
     facts.listened = failure(Reason::timeout, "listening took too long");

@@ -10,6 +10,12 @@ namespace {
 constexpr std::uint8_t kRequired = 0x40;
 constexpr std::uint8_t kCapable = 0x80;
 
+/// An element that overrides the RSN element for stations that know of it.
+Frame rsnOverride(std::uint8_t kind, const std::vector<std::uint8_t>& keys) {
+    const Frame rsn = rsnElement(4, {4}, keys, kRequired | kCapable);
+    return vendorElement(0x506F9A00 | kind, Frame(rsn.begin() + 2, rsn.end()));
+}
+
 struct SecurityCase {
     const char* wanted;
     std::uint16_t capability;
@@ -34,6 +40,9 @@ TEST(Security, IsNamedAfterWhatIsAdvertised) {
         {"WPA2/WPA3 Personal", kPrivacy, rsnElement(4, {4}, {2, 8}, kCapable)},
         {"WPA3 Personal", kPrivacy, rsnElement(4, {4}, {8}, kRequired | kCapable)},
         {"WPA3 Personal", kPrivacy, rsnElement(9, {9}, {24, 25}, kRequired | kCapable)},
+        {"WPA2/WPA3 Personal", kPrivacy,
+         rsnElement(4, {4}, {2}) + rsnOverride(0x29, {8}) + rsnOverride(0x2A, {24})},
+        {"WPA3 Personal", kPrivacy, rsnElement(4, {4}, {8}, kRequired | kCapable) + rsnOverride(0x2A, {24})},
         {"WPA Enterprise", kPrivacy, wpaElement({2}, {1})},
         {"WPA/WPA2 Enterprise", kPrivacy, wpaElement({2}, {1}) + rsnElement(2, {4}, {1})},
         {"WPA2 Enterprise", kPrivacy, rsnElement(4, {4}, {1})},
