@@ -77,8 +77,12 @@ void Window::fieldChanged() {
 
 void Window::keyPressEvent(QKeyEvent* event) {
     event->accept();
-    if (auto key = keyOf(static_cast<Qt::Key>(event->key()), event->nativeScanCode()))
-        return input_.press(*key);
+    if (auto key = keyOf(static_cast<Qt::Key>(event->key()), event->nativeScanCode())) {
+        // A key that is still held from one question must not answer the next.
+        bool isDecision = *key == ui::Key::select || *key == ui::Key::back;
+        if (!isDecision || !event->isAutoRepeat()) input_.press(*key);
+        return;
+    }
     bool isCommand =
         event->modifiers().testFlag(Qt::ControlModifier) || event->modifiers().testFlag(Qt::AltModifier);
     QString text = event->text();

@@ -47,6 +47,8 @@ Item {
         NumberAnimation { duration: 200; easing.type: Easing.OutCubic }
     }
     onOpacityChanged: if (isLeaving && opacity === 0) stage.lines.release(lineId)
+    // One that nobody has seen yet has nothing to fade from.
+    onIsLeavingChanged: if (isLeaving && opacity === 0) stage.lines.release(lineId)
     Component.onCompleted: {
         isThere = true
         if (isFocused) Qt.callLater(stage.tellFocus, line)

@@ -1,6 +1,7 @@
 // Each state of the screen as a picture, compared with the one that was looked at and found good. To take new ones
 // over: WP_TAKE_PICTURES=1 build/tv_pictures_test, and look at every one.
 
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include <QAccessible>
@@ -377,6 +378,28 @@ TEST_F(Pictures, KeysThatReachTheWindowWorkTheScreen) {
     EXPECT_NE(run.device.screen.alert(), nullptr);
     press(Qt::Key_Back);
     EXPECT_EQ(run.device.screen.alert(), nullptr);
+}
+
+TEST_F(Pictures, AHeldKeyChoosesAndGoesBackOnceButKeepsMovingTheFocus) {
+    open();
+    showList(neighbourhood(4));
+    QWindow* window = QGuiApplication::topLevelWindows().front();
+    auto hold = [&](Qt::Key key) {
+        for (bool isRepeated : {false, true, true}) {
+            QKeyEvent event(QEvent::KeyPress, key, Qt::NoModifier, {}, isRepeated);
+            QCoreApplication::sendEvent(window, &event);
+        }
+    };
+    int timesLeft = 0;
+    run.device.screen.setBackHandler([&timesLeft] { ++timesLeft; });
+
+    hold(Qt::Key_Down);
+    EXPECT_THAT(run.list(), testing::HasSubstr(">Corner Shop"));
+    hold(Qt::Key_Select);
+    EXPECT_NE(run.device.screen.alert(), nullptr);
+    hold(Qt::Key_Back);
+    EXPECT_EQ(run.device.screen.alert(), nullptr);
+    EXPECT_EQ(timesLeft, 0);
 }
 
 TEST_F(Pictures, AnInputMethodIsToldWhereTheCursorIsPainted) {
