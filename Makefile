@@ -21,7 +21,7 @@ help:
 	@echo "make lab      system tests in a virtual machine with simulated radios"
 	@echo "make bench    benchmarks: a table, and build/bench.json"
 	@echo "make fuzz     each fuzz target for FUZZ_SECONDS ($(FUZZ_SECONDS))"
-	@echo "make monkey   MONKEY_EVENTS ($(MONKEY_EVENTS)) random events against the headless screen"
+	@echo "make monkey   MONKEY_EVENTS ($(MONKEY_EVENTS)) random events against the headless screen, a tenth on the television's"
 
 build:
 	@cmake --preset dev > /dev/null
@@ -63,8 +63,9 @@ fuzz:
 	@verification/run_fuzz $(FUZZ_SECONDS)
 
 monkey:
-	@verification/install_packages build test
+	@verification/install_packages build test tv
 	@cmake --preset dev > /dev/null
 	@cmake --build build -j $(JOBS) --target monkey
 	@build/monkey --mode stepped --seed $(MONKEY_SEED) --events $(MONKEY_EVENTS)
 	@build/monkey --mode threaded --seed $(MONKEY_SEED) --events $(MONKEY_EVENTS)
+	@build/monkey --mode television --seed $(MONKEY_SEED) --events $$(($(MONKEY_EVENTS) / 10))

@@ -1,10 +1,11 @@
-// Plays random lives of the diagnostic on the headless screen: keys, texts, power changes, changing air,
-// delays and faults, until something is broken or the events are used up.
+// Plays random lives of the diagnostic on the headless screen or the television's: keys, texts, power changes,
+// changing air, delays and faults, until something is broken or the events are used up.
 //
-//   monkey [--mode stepped|threaded] [--seed N] [--events N]   so many events, in lives of their own seeds
-//   monkey [--mode ...] --life N                                one life again
+//   monkey [--mode stepped|threaded|television] [--seed N] [--events N]   so many events, in lives of their own seeds
+//   monkey [--mode ...] --life N                                          one life again
 
 #include <cstdlib>
+#include <functional>
 #include <iostream>
 #include <string>
 
@@ -34,11 +35,25 @@ Options read(int argc, char** argv) {
     return options;
 }
 
+using Play = std::function<int(std::uint64_t, int)>;
+
+Play playOf(const std::string& mode) {
+    using namespace wp::monkey;
+    if (mode == "threaded") return playThreadedLife;
+#ifdef WP_MONKEY_TELEVISION
+    if (mode == "television") return playTelevisionLife;
+#endif
+    if (mode == "stepped")
+        return [](std::uint64_t seed, int events) { return playSteppedLife(seed, events, watchedHeadless); };
+    std::cerr << "monkey: --mode: \"" << mode << "\" is none that this build can play\n";
+    std::exit(2);
+}
+
 }  // namespace
 
 int main(int argc, char** argv) {
     const Options options = read(argc, argv);
-    auto play = options.mode == "threaded" ? wp::monkey::playThreadedLife : wp::monkey::playSteppedLife;
+    const Play play = playOf(options.mode);
     long played = 0;
     int lives = 0;
     std::uint64_t life = options.life ? options.life : options.seed * 1'000'000;

@@ -2,7 +2,6 @@
 
 #include <memory>
 
-#include "screens/headless/headless_screen.h"
 #include "verification/monkey/checks.h"
 #include "verification/monkey/neighbourhood.h"
 

@@ -1,6 +1,7 @@
 #include <atomic>
 #include <thread>
 
+#include "screens/headless/headless_screen.h"
 #include "verification/monkey/life.h"
 #include "verification/monkey/player.h"
 
