@@ -112,6 +112,17 @@ std::optional<Error> takeError(ObjectReader& reader) {
     return decodeError(*error, Place(reader.place(), "error"));
 }
 
+/// What `read` makes of an answer; a key beside the number that it does not ask for is refused.
+template <class Read>
+auto readAnswer(const WireAnswer& answer, Read read) {
+    const Place top;
+    ObjectReader reader(answer.json, top);
+    reader.find("id");
+    auto response = read(reader);
+    reader.finish();
+    return response;
+}
+
 }  // namespace
 
 Error cancelledError() {
@@ -181,42 +192,28 @@ WireMessage readMessage(std::string_view text) {
 }
 
 DiagnosticsTestResponse testAnswer(const WireAnswer& answer) {
-    Place top;
-    ObjectReader reader(answer.json, top);
-    reader.find("id");
-    DiagnosticsTestResponse response = decodeResponse(reader);
-    reader.finish();
-    return response;
+    return readAnswer(answer, [](ObjectReader& reader) { return decodeResponse(reader); });
 }
 
 DiagnosticsStatusResponse statusAnswer(const WireAnswer& answer) {
-    Place top;
-    ObjectReader reader(answer.json, top);
-    reader.find("id");
-    DiagnosticsStatusResponse response = decodeStatus(reader.need("status"), Place(top, "status"));
-    reader.finish();
-    return response;
+    return readAnswer(answer, [](ObjectReader& reader) {
+        return decodeStatus(reader.need("status"), Place(reader.place(), "status"));
+    });
 }
 
 WiFiResponse wifiAnswer(const WireAnswer& answer) {
-    Place top;
-    ObjectReader reader(answer.json, top);
-    reader.find("id");
-    WiFiResponse response;
-    response.error = takeError(reader);
-    if (const Value* wifi = reader.find("wifi")) response.wifi = decodeWiFi(*wifi, Place(top, "wifi"));
-    if (!response.error && !response.wifi) top.refuse("needs the key \"wifi\"");
-    reader.finish();
-    return response;
+    return readAnswer(answer, [](ObjectReader& reader) {
+        WiFiResponse response;
+        response.error = takeError(reader);
+        if (const Value* wifi = reader.find("wifi"))
+            response.wifi = decodeWiFi(*wifi, Place(reader.place(), "wifi"));
+        if (!response.error && !response.wifi) reader.place().refuse("needs the key \"wifi\"");
+        return response;
+    });
 }
 
 std::optional<Error> setPowerAnswer(const WireAnswer& answer) {
-    Place top;
-    ObjectReader reader(answer.json, top);
-    reader.find("id");
-    std::optional<Error> error = takeError(reader);
-    reader.finish();
-    return error;
+    return readAnswer(answer, [](ObjectReader& reader) { return takeError(reader); });
 }
 
 }  // namespace wp
