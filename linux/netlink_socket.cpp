@@ -12,7 +12,7 @@ namespace wp {
 namespace {
 
 // The kernel makes its dump messages up to 32 KiB long where the reader has room for them.
-constexpr std::size_t kReceiveSize = 32 * 1024;
+constexpr std::size_t kReceiveSize = 32'768;
 constexpr int kDumpAttempts = 4;
 
 int errorOf(Wait wait) {
@@ -97,7 +97,7 @@ NetlinkAnswer NetlinkSocket::gather(std::uint32_t sequence, const Until& until) 
     NetlinkAnswer answer;
     bool changed = false;
     for (;;) {
-        const NetlinkAnswer part = receive(until);
+        NetlinkAnswer part = receive(until);
         if (part.error != 0) return part;
         Bytes rest = part.messages;
         for (Bytes before = rest; const auto message = takeNetlinkMessage(rest); before = rest) {

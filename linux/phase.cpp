@@ -34,7 +34,7 @@ bool isAboutLink(Fact fact) {
 
 Phase::Phase(PhaseTopic topic, Sources& sources, Workers& workers, std::shared_ptr<const StopSignal> stop,
              std::function<void()> onProgress)
-    : topic_(std::move(topic)),
+    : topic_(topic),
       sources_(sources),
       workers_(workers),
       stop_(std::move(stop)),

@@ -69,12 +69,10 @@ constexpr const char* kDeadly[] = {
     "capset setuid setuid32 setgid setgid32 setreuid setreuid32 setregid setregid32 setresuid setresuid32",
     "setresgid setresgid32 setgroups setgroups32 setfsuid setfsuid32 setfsgid setfsgid32 unshare setns",
     // the file system
-    "chmod chown chown32 chroot fchmod fchmodat fchown fchown32 fchownat ftruncate ftruncate64 lchown "
-    "lchown32",
-    "link linkat mkdir mkdirat mknod mknodat mount move_mount open_by_handle_at pivot_root rename renameat",
-    "renameat2 rmdir setxattr lsetxattr fsetxattr symlink symlinkat truncate truncate64 umount umount2 "
-    "unlink",
-    "unlinkat",
+    "chmod chown chown32 chroot fchmod fchmodat fchown fchown32 fchownat ftruncate ftruncate64",
+    "lchown lchown32 link linkat mkdir mkdirat mknod mknodat mount move_mount open_by_handle_at pivot_root",
+    "rename renameat renameat2 rmdir setxattr lsetxattr fsetxattr symlink symlinkat truncate truncate64",
+    "umount umount2 unlink unlinkat",
     // the machine
     "add_key bpf delete_module finit_module init_module iopl ioperm kexec_file_load kexec_load keyctl",
     "perf_event_open reboot request_key settimeofday clock_settime clock_settime64 adjtimex clock_adjtime",

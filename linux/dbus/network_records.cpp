@@ -1,8 +1,9 @@
 #include "linux/dbus/network_records.h"
 
 #include <charconv>
-#include <chrono>
 #include <vector>
+
+#include "linux/utc_time.h"
 
 namespace wp {
 namespace {
@@ -100,12 +101,8 @@ std::optional<Date> dateFromText(std::string_view text) {
         std::from_chars(text.data() + at, text.data() + at + length, value);
         return value;
     };
-    using namespace std::chrono;
-    const year_month_day day{year(part(0, 4)), month(static_cast<unsigned>(part(5, 2))),
-                             std::chrono::day(static_cast<unsigned>(part(8, 2)))};
-    if (!day.ok() || part(11, 2) > 23 || part(14, 2) > 59 || part(17, 2) > 60) return std::nullopt;
-    const std::int64_t midnight = sys_days(day).time_since_epoch().count() * std::int64_t{86'400};
-    return dateFromUnix(midnight + part(11, 2) * 3600 + part(14, 2) * 60 + part(17, 2));
+    const auto time = unixTime({part(0, 4), part(5, 2), part(8, 2), part(11, 2), part(14, 2), part(17, 2)});
+    return time ? std::optional(dateFromUnix(*time)) : std::nullopt;
 }
 
 BusByteTexts namesCalled(const NetworkName& named) {

@@ -1,10 +1,11 @@
 #include "linux/files/leases.h"
 
 #include <algorithm>
+#include <array>
 #include <charconv>
-#include <chrono>
 
 #include "linux/files/key_value_file.h"
+#include "linux/utc_time.h"
 #include "service/plain_text.h"
 
 namespace wp {
@@ -24,7 +25,8 @@ std::string textFrom(std::string_view value) {
 /// "4 2026/11/20 18:30:00" in UTC; "never" and "epoch N" are the other forms.
 bool hasPassed(std::string_view expiry, std::int64_t now) {
     if (expiry == "never") return false;
-    int parts[6] = {}, count = 0;
+    std::array<int, 6> parts{};
+    std::size_t count = 0;
     const char *at = expiry.data(), *end = at + expiry.size();
     if (expiry.starts_with("epoch ")) {
         std::int64_t seconds = 0;
@@ -32,22 +34,14 @@ bool hasPassed(std::string_view expiry, std::int64_t now) {
         return seconds <= now;
     }
     while (at != end && *at != ' ') ++at;  // the weekday
-    while (at != end && count < 6) {
+    while (at != end && count < parts.size()) {
         const auto read = std::from_chars(at, end, parts[count]);
         at = read.ec == std::errc() ? read.ptr : at + 1;
         if (read.ec == std::errc()) ++count;
     }
-    if (count < 6) return true;
-    // The leap second counts; a year has four digits.
-    constexpr int kHighest[6] = {9999, 12, 31, 23, 59, 60};
-    for (int i = 0; i < 6; ++i)
-        if (parts[i] < 0 || parts[i] > kHighest[i]) return true;
-    using namespace std::chrono;
-    const year_month_day day{year(parts[0]), month(static_cast<unsigned>(parts[1])),
-                             std::chrono::day(static_cast<unsigned>(parts[2]))};
-    if (!day.ok()) return true;
-    const std::int64_t midnight = sys_days(day).time_since_epoch().count() * std::int64_t{86'400};
-    return midnight + parts[3] * 3600 + parts[4] * 60 + parts[5] <= now;
+    if (count < parts.size()) return true;
+    const auto over = unixTime(parts);
+    return !over || *over <= now;
 }
 
 void addServers(std::string_view list, std::vector<IPAddress>& servers) {

@@ -5,6 +5,7 @@
 #include "linux/files/networkd.h"
 #include "linux/files/proxy_settings.h"
 #include "linux/files/user_folder.h"
+#include "linux/utc_time.h"
 #include "service/bytes.h"
 #include "verification/unit/fakes/temporary_folder.h"
 #include "verification/unit/service/addresses.h"
@@ -155,6 +156,16 @@ TEST(Leases6, NameServersAndPortalOfTheAddressThatTheInterfaceHas) {
 
 std::string replaced(std::string text, const std::string& old, const std::string& with) {
     return text.replace(text.find(old), old.size(), with);
+}
+
+TEST(UnixTime, IsOfMomentsThatTheCalendarHas) {
+    EXPECT_EQ(unixTime({2026, 11, 20, 18, 30, 0}), 1795199400);
+    EXPECT_EQ(unixTime({1970, 1, 1, 0, 0, 0}), 0);
+    EXPECT_EQ(unixTime({2016, 12, 31, 23, 59, 60}), 1483228800) << "a leap second";
+    EXPECT_EQ(unixTime({2026, 2, 29, 0, 0, 0}), std::nullopt);
+    EXPECT_EQ(unixTime({2026, 1, 1, 24, 0, 0}), std::nullopt);
+    EXPECT_EQ(unixTime({2026, 1, 1, 0, -1, 0}), std::nullopt);
+    EXPECT_EQ(unixTime({10000, 1, 1, 0, 0, 0}), std::nullopt);
 }
 
 TEST(Leases, APortalsAddressIsReadWholeOrNotAtAll) {
