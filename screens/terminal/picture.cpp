@@ -126,8 +126,11 @@ class ScreenPainter {
 };
 
 void drawTooSmall(Canvas& canvas, const std::string& text) {
-    Cells line = elided(cellsOf(text, canvas.charset()), canvas.columns(), canvas.charset());
-    canvas.put(canvas.rows() / 2, (canvas.columns() - columnsOf(line)) / 2, line, {.bold = true});
+    const Charset charset = canvas.charset();
+    const auto lines = wrapped(cellsOf(text, charset), canvas.columns(), canvas.rows(), charset);
+    int row = (canvas.rows() - static_cast<int>(lines.size())) / 2;
+    for (const Cells& line : lines)
+        canvas.put(row++, (canvas.columns() - columnsOf(line)) / 2, line, {.bold = true});
 }
 
 /// What is behind an alert steps back, and its focus with it.

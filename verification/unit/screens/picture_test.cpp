@@ -308,9 +308,21 @@ TEST_F(PictureTest, AsksForALargerWindowBelowSixtyBySixteen) {
     build();
     for (auto [rows, columns] : {std::pair(15, 60), std::pair(16, 59), std::pair(1, 200)})
         EXPECT_THAT(text(rows, columns), HasSubstr("at least 60 by 16.")) << rows << " " << columns;
-    EXPECT_THAT(text(3, 10), HasSubstr("Please ma…"));
     EXPECT_EQ(text(0, 0), "");
     EXPECT_THAT(text(16, 60), HasSubstr("▸ Home"));
+}
+
+TEST_F(PictureTest, SaysHowLargeTheWindowMustBeAsFarAsThereIsRoom) {
+    build();
+
+    EXPECT_EQ(text(5, 20), R"(
+  Please make this
+ window larger: at
+  least 60 by 16.
+
+)");
+    EXPECT_EQ(text(2, 10), "  Please\nmake this…\n");
+    EXPECT_EQ(text(1, 1), "…\n");
 }
 
 TEST_F(PictureTest, FitsEveryWindowFromTheSmallestOn) {

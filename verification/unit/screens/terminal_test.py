@@ -173,7 +173,7 @@ class TerminalScreen(unittest.TestCase):
         terminal.resize(160, 50)
         terminal.waitFor("─" * 86, lambda text: "".join(text.splitlines()[49:]).strip().startswith("↑↓ Move"))
         terminal.resize(20, 3)
-        terminal.waitFor("Please make this wi…")
+        terminal.waitFor("Please make this", "window larger: at", "least 60 by 16.")
 
     def testNeedsOnlyAsciiWhereTheTerminalHasNoMore(self):
         terminal = self.start(environment={"LC_ALL": "C"}, names=["Café".encode()])
