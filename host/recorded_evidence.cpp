@@ -66,27 +66,28 @@ class SelectedName {
         auto named = std::ranges::find_if(
             recording.answers, [](const RecordedAnswer& answer) { return answer.networkName.has_value(); });
         if (named == recording.answers.end()) return;
-        name_ = requested_ = *named->networkName;
-        if (characters(name_) <= kLongestRequestedName) return;
+        name_ = requested_ = named->networkName;
+        if (characters(*name_) <= kLongestRequestedName) return;
         // As long as a request takes, and in bytes longer than any network's.
-        requested_.clear();
-        for (std::size_t i = 0; i < kLongestRequestedName; ++i) requested_ += "\u2026";
+        requested_ = "";
+        for (std::size_t i = 0; i < kLongestRequestedName; ++i) *requested_ += "\u2026";
         for (RecordedAnswer& answer : recording.answers)
             if (answer.networkName == name_) answer.networkName = requested_;
     }
 
     void putInto(Dictionary& parameters) const {
-        if (!requested_.empty()) parameters.setValue("networkName", requested_);
+        if (requested_) parameters.setValue("networkName", *requested_);
     }
     void restoreIn(Evidence& evidence) const {
+        if (!requested_) return;
         if (evidence.selectedName == requested_) evidence.selectedName = name_;
         for (Answer& answer : evidence.answers)
             if (answer.networkName == requested_) answer.networkName = name_;
     }
 
   private:
-    std::string name_;
-    std::string requested_;
+    std::optional<std::string> name_;
+    std::optional<std::string> requested_;
 };
 
 bool hasTested(const Recording& recording) {
