@@ -40,16 +40,25 @@ Gateway asTarget(const IPAddress& address) {
 NameServerSet serversOf(const Link& link, const LinkSetup& setup) {
     const bool here =
         std::ranges::any_of(setup.servers, [](const IPAddress& each) { return each.loopback(); });
-    return {setup.servers, here ? "" : link.interfaceName};
+    return {.servers = setup.servers,
+            .interfaceName = here ? "" : link.interfaceName,
+            .leadsOut = setup.leadsOut};
 }
 
-/// The addresses of a host, whose name may be an address itself.
-Known<std::vector<IPAddress>> addressesOf(const std::string& host, const Link& link, const LinkSetup& setup,
-                                          const Until& until) {
-    if (const auto address = IPAddress::fromText(host)) return std::vector<IPAddress>{*address};
-    const auto answer = lookUpName(host, serversOf(link, setup), until.within(kNameTime));
-    if (!answer) return answer.error();
-    return answer->addresses;
+/// Where a host can be asked, whose name may be an address itself; else why it cannot.
+Known<NameAnswer> lookUpHost(const std::string& host, const Link& link, const LinkSetup& setup,
+                             const Until& until) {
+    if (const auto address = IPAddress::fromText(host)) {
+        NameAnswer literal;
+        literal.addresses = {*address};
+        return literal;
+    }
+    auto answer = lookUpName(host, serversOf(link, setup), until.within(kNameTime));
+    if (!answer) return answer;
+    auto places = placesOf(*answer);
+    if (places.empty()) answer->why = whyNowhere(*answer);
+    answer->addresses = std::move(places);
+    return answer;
 }
 
 /// A request to a URL of the configuration, with the addresses of its host.
@@ -57,11 +66,12 @@ Known<WebRequest> requestFor(const std::string& url, const Link& link, const Lin
                              const Endpoints& endpoints, const Until& until) {
     WebRequest request;
     if (url.empty()) return request;
-    const auto addresses = addressesOf(hostOf(url), link, setup, until);
-    if (!addresses) return addresses.error();
+    const auto host = lookUpHost(hostOf(url), link, setup, until);
+    if (!host) return host.error();
     request.url = url;
     request.interfaceName = link.interfaceName;
-    request.addresses = *addresses;
+    request.addresses = host->addresses;
+    request.whyNoAddress = host->why;
     request.authorities = endpoints.certificateAuthorities;
     return request;
 }
@@ -181,9 +191,9 @@ Known<IPAddress> askStun(const Link& link, const LinkSetup& setup, const Endpoin
                          const Until& until) {
     const auto server = hostAndPort(endpoints.stun);
     if (!server) return notConfigured("STUN");
-    const auto addresses = addressesOf(server->host, link, setup, until);
-    if (!addresses) return addresses.error();
-    for (const IPAddress& each : *addresses)
+    const auto host = lookUpHost(server->host, link, setup, until);
+    if (!host) return host.error();
+    for (const IPAddress& each : host->addresses)
         if (each.isIPv4()) return askMappedAddress(each, server->port, link.interfaceName, until);
     return failure(Reason::unavailable, "the STUN server has no IPv4 address");
 }

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cstdlib>
 
+#include "linux/address_details.h"
 #include "linux/asked_servers.h"
 #include "linux/dbus/bluez.h"
 #include "linux/dbus/iwd.h"
@@ -141,6 +142,14 @@ Known<WebProxyPlaces> allProxies(const Known<BusValue>& settings) {
     return places;
 }
 
+/// Where there is no default route either family may be one of a network that is an island.
+FamiliesOut familiesOut(const Link& link, const Until& until) {
+    const auto gateways = gatherGatewayAddresses(link.interfaceIndex, until);
+    if (!gateways || gateways->empty()) return {};
+    const auto any = std::ranges::count_if(*gateways, &IPAddress::isIPv4);
+    return {any > 0, any < std::ssize(*gateways)};
+}
+
 bool isPeerLink(std::uint32_t type) {
     // Neighbour awareness has no interface, and the kernel tells no channel of it.
     constexpr std::uint32_t kClient = 8, kOwner = 9;  // nl80211_iftype
@@ -169,6 +178,7 @@ Known<LinkSetup> gatherSetup(const Link& link, const Until& until) {
     }
     if (!setup) return setup;
     setup->proxies = allProxies(profile);
+    setup->leadsOut = familiesOut(link, until);
     return setup;
 }
 

@@ -21,6 +21,7 @@ struct LinkSetup {
     Known<NameServers> nameServers;
     Known<WebProxyPlaces> proxies;
     std::vector<IPAddress> servers;  ///< whom to ask for names over this interface
+    FamiliesOut leadsOut;            ///< by its default routes; over both where it has none
     std::string portalApi;           ///< what the lease names; empty where it names none
     Known<std::string> leaseText;    ///< the vendor's text in the lease, empty where it has none
 };

@@ -19,6 +19,17 @@ Error clockWrong() {
 
 }  // namespace
 
+std::vector<IPAddress> placesOf(const NameAnswer& answer) {
+    std::vector<IPAddress> places = answer.addresses;
+    std::erase_if(places, [](const IPAddress& each) { return each.unspecified() || each.loopback(); });
+    return places;
+}
+
+std::string whyNowhere(const NameAnswer& answer) {
+    if (answer.addresses.empty()) return "the name " + answer.name + " has no address: " + answer.why;
+    return "the name servers lead " + answer.name + " nowhere, to " + answer.addresses.front().text();
+}
+
 Outcome resolvesNames(const Known<NameAnswer>& answer) {
     if (!answer) return answer.error();
     return works(std::any_of(answer->addresses.begin(), answer->addresses.end(), leadsOutside));

@@ -29,6 +29,18 @@ struct NameAnswer {
     std::vector<NameServerAnswer> servers{};  ///< the same question to each server, for the details alone
 };
 
+/// Over which families an interface leads beyond its own network.
+struct FamiliesOut {
+    bool ipv4 = true;
+    bool ipv6 = true;
+};
+
+/// Where the host of that name can be asked. Filters lead a name nowhere by an address that means this device itself
+/// (0.0.0.0, 127.0.0.1), where something quite different may answer: such addresses are left out. *Any* thread.
+std::vector<IPAddress> placesOf(const NameAnswer& answer);
+/// Why there is no such place.
+std::string whyNowhere(const NameAnswer& answer);
+
 /// Test 7: whether a name outside resolves. Only an address that can lead outside counts: gateways that show
 /// their own page answer with a private one.
 Outcome resolvesNames(const Known<NameAnswer>& answer);

@@ -19,8 +19,10 @@ namespace {
 using namespace std::chrono_literals;
 
 constexpr int kTryMilliseconds = 2000, kTries = 2;
-/// How long the other family may take once one has answered (RFC 8305 waits 50 ms for the same).
-constexpr auto kOtherFamily = 50ms;
+/// How long the other family may take once one has answered by which the interface leads out (RFC 8305 waits 50 ms for
+/// IPv6). Some servers pass over questions for IPv6; one for IPv4 is answered, but late where no cache holds it.
+constexpr std::chrono::milliseconds kOtherFamily{50};
+constexpr std::chrono::milliseconds kIPv4BesideIPv6{1000};
 constexpr int kInternet = 1;
 constexpr int kMostAddresses = 32;
 constexpr std::size_t kLongestAnswer = 65'535;
@@ -108,6 +110,18 @@ void keepAnswer(void* place, int status, int, unsigned char* answer, int size) {
                           std::back_inserter(lookup.addresses));
     else if (status != ARES_ENODATA || lookup.why.empty())
         lookup.why = ares_strerror(status);
+}
+
+bool hasAny(const Lookup& lookup, bool ipv4) {
+    return std::ranges::any_of(lookup.addresses,
+                               [ipv4](const IPAddress& each) { return each.isIPv4() == ipv4; });
+}
+
+/// How long to go on after what has come; as long as for any answer where it leads nowhere.
+std::optional<std::chrono::milliseconds> patienceFor(const Lookup& lookup, FamiliesOut leadsOut) {
+    if (leadsOut.ipv4 && hasAny(lookup, true)) return kOtherFamily;
+    if (leadsOut.ipv6 && hasAny(lookup, false)) return leadsOut.ipv4 ? kIPv4BesideIPv6 : kOtherFamily;
+    return std::nullopt;
 }
 
 /// One channel's sockets as `poll` wants them.
@@ -236,13 +250,18 @@ Known<NameAnswer> lookUpName(const std::string& name, const NameServerSet& whom,
     ares_query(channel->get(), name.c_str(), kInternet, kIPv4, keepAnswer<RecordType::a>, &lookup);
     ares_query(channel->get(), name.c_str(), kInternet, kIPv6, keepAnswer<RecordType::aaaa>, &lookup);
     Until patience = until;
+    std::optional<Clock::time_point> usableAt;
     while (lookup.running > 0) {
-        if (!lookup.addresses.empty() && lookup.running == 1) patience = patience.within(kOtherFamily);
+        if (const auto more = patienceFor(lookup, whom.leadsOut)) {
+            if (!usableAt) usableAt = Clock::now();
+            patience = patience.within(*more);
+        }
         const Wait wait = turn(std::array{channel->get()}, patience);
         if (wait == Wait::stopped) return waitFailure(wait, "the name server");
         if (wait == Wait::timeout) break;
     }
-    answer.took = std::chrono::duration_cast<std::chrono::milliseconds>(Clock::now() - start);
+    answer.took =
+        std::chrono::duration_cast<std::chrono::milliseconds>(usableAt.value_or(Clock::now()) - start);
     answer.addresses = lookup.addresses;
     if (lookup.addresses.empty())
         answer.why = lookup.why.empty() ? "no name server answered in time" : lookup.why;

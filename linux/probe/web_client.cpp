@@ -253,9 +253,9 @@ Wait turnAll(const Exchanges& exchanges, Answers& answers, const Until& until, c
     }
 }
 
-WebAnswer failed(const char* why) {
+WebAnswer failed(std::string why) {
     WebAnswer answer;
-    answer.why = why;
+    answer.why = std::move(why);
     return answer;
 }
 
@@ -274,7 +274,7 @@ Known<std::vector<WebAnswer>> runWebRequests(const std::vector<WebRequest>& requ
         else if (const auto refusal = refusalOf(request.interfaceName))
             return *refusal;
         else if (addressesOf(request, *place).empty())
-            answers.back() = failed("the name of its host has no address");
+            answers.back() = failed(request.whyNoAddress);
     }
     const Wait wait = turnAll(exchanges, answers, until, conclusive);
     if (wait == Wait::stopped) return waitFailure(wait, "the web");

@@ -17,6 +17,7 @@ struct WebRequest {
     std::string url;
     std::string interfaceName;         ///< empty: any
     std::vector<IPAddress> addresses;  ///< of the URL's host; empty: the URL holds an address itself
+    std::string whyNoAddress = "the name of its host has no address";
     std::vector<std::string> headers;  ///< "Name: value"
     std::optional<std::string> post;   ///< a body to be sent
     bool connectOnly = false;          ///< ends with the connection, secure where the URL is

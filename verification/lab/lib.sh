@@ -198,5 +198,15 @@ names_lead() {
         --pid-file="$dir/dnsmasq.pid" --log-facility="$dir/dnsmasq.log" --user=root "${@:3}"
 }
 
+# name_server X ADDRESS BEHAVIOURS...: a name server with faults on access point X, see the head of `name-server`; where
+# names were asked for there before, it takes over.
+name_server() {
+    local dir=/run/lab/$1
+    [ ! -e "$dir/dnsmasq.pid" ] || { kill "$(cat "$dir/dnsmasq.pid")"; wait_for 5 test ! -e "$dir/dnsmasq.pid"; }
+    : > "$dir/name-server.log"
+    in_ap "$1" "$LAB_DIR/name-server" "${@:2}" > "$dir/name-server.log" 2>&1 &
+    wait_for 20 grep -q ready "$dir/name-server.log" || { cat "$dir/name-server.log"; return 1; }
+}
+
 # shellcheck disable=SC1091
 . "$LAB_DIR/managers.sh"

@@ -221,6 +221,20 @@ TEST(NameLookup, OneFamilyThatStaysSilentDoesNotHoldTheOtherUp) {
     EXPECT_EQ(answer->addresses.size(), 1U);
 }
 
+TEST(NameLookup, AFamilyThatDoesNotLeadOutEndsNoWaitForTheOther) {
+    // As behind a translator, which asks for an IPv4 address first and then makes one of IPv6 out of it.
+    const Message six = {0x20, 1, 0xD, 0xB8, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 7};
+    const UdpServer server([&](const Message& query) {
+        if (query[typeAt(query) + 1] != 1) std::this_thread::sleep_for(200ms);
+        return dnsAnswer(query, {203, 0, 113, 7}, six);
+    });
+    NameServerSet overIPv6 = serverAt(server);
+    overIPv6.leadsOut.ipv4 = false;
+    const auto answer = lookUpName("host.example", overIPv6, patience());
+    ASSERT_TRUE(answer);
+    EXPECT_EQ(answer->addresses.size(), 2U);
+}
+
 TEST(NameLookup, ADeadServerAndNoServerAreAnswersWithoutAddresses) {
     const UdpServer server(silence);
     const auto dead = lookUpName("host.example", serverAt(server), patience(100ms));

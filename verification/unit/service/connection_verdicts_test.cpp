@@ -80,6 +80,19 @@ TEST(NameResolution, OnlyAnAddressThatLeadsOutsideCounts) {
     EXPECT_TRUE(cannotTell(resolvesNames(failure(Reason::cancelled, "cancelled")), Reason::cancelled));
 }
 
+TEST(NameResolution, ANameThatLeadsToThisDeviceLeadsNowhere) {
+    const NameAnswer blocked{
+        "host.example", {address("0.0.0.0"), address("127.0.0.1"), address("::")}, {}, {}};
+    EXPECT_TRUE(placesOf(blocked).empty());
+    EXPECT_EQ(whyNowhere(blocked), "the name servers lead host.example nowhere, to 0.0.0.0");
+
+    const NameAnswer local{"host.example", {address("0.0.0.0"), address("10.0.0.1")}, {}, {}};
+    EXPECT_EQ(placesOf(local), std::vector{address("10.0.0.1")});
+
+    EXPECT_EQ(whyNowhere(NameAnswer{"host.example", {}, "Domain name not found", {}}),
+              "the name host.example has no address: Domain name not found");
+}
+
 ServiceContact contact(ServiceContact::End end, int status = 0, std::string body = {}) {
     return {end, {}, status, std::move(body)};
 }
