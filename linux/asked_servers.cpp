@@ -1,6 +1,7 @@
 #include "linux/asked_servers.h"
 
 #include <algorithm>
+#include <filesystem>
 
 #include "linux/dbus/resolved.h"
 #include "linux/files/dnsmasq.h"
@@ -10,9 +11,26 @@
 namespace wp {
 namespace {
 
+/// Whether the resolver's file is one of systemd-resolved's own: with its stub alone, or with the servers of all links.
+bool isResolvedsFile() {
+    std::error_code error;
+    const std::string file = std::filesystem::canonical("/etc/resolv.conf", error).string();
+    return !error && (file.starts_with("/run/systemd/resolve/") || file == "/usr/lib/systemd/resolv.conf");
+}
+
 /// systemd-resolved answers at addresses of its own; any other resolver is looked for in its place.
 bool isResolveds(const IPAddress& server) {
     return server.text() == "127.0.0.53" || server.text() == "127.0.0.54";
+}
+
+Known<ResolvedServers> askResolved(Known<Bus>& bus, const Link& link, const Until& until) {
+    return bus ? resolvedServers(*bus, link.interfaceIndex, until) : bus.error();
+}
+
+AskedServers united(const ResolvedServers& resolved) {
+    AskedServers asked{resolved.ofLink, resolved.ofDevice, true};
+    add(asked.all, resolved.ofDevice);
+    return asked;
 }
 
 /// Whom the resolver on the device asks; none where it does not tell.
@@ -23,8 +41,11 @@ AskedServers behindResolver(Known<Bus>& bus, const Link& link, const Servers& na
             if (found->heedsBus) add(found->asked, ofManager);
             return {std::move(found->asked), std::move(found->entered)};
         }
-    const auto resolved = bus ? resolvedServers(*bus, link.interfaceIndex, until) : bus.error();
-    return {resolved ? *resolved : ofManager, {}};
+    const auto resolved = askResolved(bus, link, until);
+    if (!resolved) return {ofManager, {}};
+    // Where the file is not its own it takes what stands there for entered.
+    if (std::ranges::none_of(named, isResolveds)) return {resolved->ofLink, {}};
+    return united(*resolved);
 }
 
 }  // namespace
@@ -37,13 +58,17 @@ void add(Servers& servers, const Servers& more) {
 AskedServers askedServers(Known<Bus>& bus, const Link& link, const Servers& ofManager, const Until& until) {
     const auto file = readSmallFile("/etc/resolv.conf");
     AskedServers asked{file ? serversFromResolverFile(*file) : Servers(), {}};
+    if (isResolvedsFile())
+        if (const auto resolved = askResolved(bus, link, until))
+            if (AskedServers own = united(*resolved); !own.all.empty()) return own;
     if (!std::ranges::any_of(asked.all, &IPAddress::loopback)) return asked;
     AskedServers behind = behindResolver(bus, link, asked.all, ofManager, until);
     if (behind.all.empty()) return asked;
     std::erase_if(asked.all, [](const IPAddress& each) { return each.loopback(); });
+    behind.ofLinkAlone &= asked.all.empty();
     add(asked.all, behind.all);
-    asked.entered = std::move(behind.entered);
-    return asked;
+    behind.all = std::move(asked.all);
+    return behind;
 }
 
 }  // namespace wp

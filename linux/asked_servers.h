@@ -14,11 +14,12 @@ void add(Servers& servers, const Servers& more);
 /// The name servers that are asked.
 struct AskedServers {
     Servers all;
-    Servers entered;  ///< those of them that stand in the settings of a resolver on the device
+    Servers entered;           ///< those of them that stand in the settings of a resolver on the device
+    bool ofLinkAlone = false;  ///< but for those entered; else another interface may have brought some along
 };
 
-/// Those of the resolver's file; in place of a resolver on the device (systemd-resolved, dnsmasq) those that it asks for the
-/// link. Where it does not tell, its own address stays. *Any* thread; blocks while the bus is asked.
+/// Those of the resolver's file; in place of a resolver on the device (systemd-resolved, dnsmasq), and of the file that
+/// systemd-resolved keeps of all links' servers, those that it asks for the link. Where it does not tell, its own address stays. *Any* thread; blocks while the bus is asked.
 /// \param ofManager what the interface's manager hands to a resolver that cannot be asked
 AskedServers askedServers(Known<Bus>& bus, const Link& link, const Servers& ofManager, const Until& until);
 

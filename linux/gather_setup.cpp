@@ -87,6 +87,12 @@ LinkSetup setupFromNetworkManager(Known<Bus>& bus, const Link& link, const Netwo
     return setup;
 }
 
+/// Whether another interface may have brought name servers along.
+bool leadsElsewhere(const Link& link, const Until& until) {
+    const auto ways = gatherWaysOut(link.interfaceIndex, until);
+    return ways && ways->elsewhere;
+}
+
 LinkSetup setupFromNetworkd(Known<Bus>& bus, const Link& link, const NetworkdLink& managed,
                             const Until& until) {
     LinkSetup setup;
@@ -98,6 +104,7 @@ LinkSetup setupFromNetworkd(Known<Bus>& bus, const Link& link, const NetworkdLin
     const AskedServers asked = askedServers(bus, link, own, until);
     add(names.manual, asked.entered);
     names.effective = asked.all;
+    names.offerKnown = asked.ofLinkAlone || !leadsElsewhere(link, until);
     // Servers of a router's advertisement stand nowhere but in the list that is asked.
     if (*managed.methods.ipv6 == "auto")
         for (const IPAddress& each : names.effective)

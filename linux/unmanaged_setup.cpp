@@ -126,6 +126,8 @@ NameServers serversFrom(const Evidence& evidence, const AskedServers& asked) {
     names.advertisementsKnown = false;
     if (!evidence.ways) return names;
     names.routers = evidence.ways->gateways;
+    // Another interface may have brought along what is not explained here, unless records tell the interfaces apart.
+    if (evidence.ways->elsewhere && !asked.ofLinkAlone && records.elsewhere.empty()) names.offerKnown = false;
     if (names.offerKnown) return names;
     // Nobody offers anything to an interface that was set up by hand; another one may have brought the servers along.
     names.offerKnown = names.advertisementsKnown =

@@ -8,10 +8,17 @@
 
 namespace wp {
 
-/// The addresses in the resolver's list of name servers.
+/// The addresses in the resolver's list of one link's name servers.
 std::vector<IPAddress> serversFrom(const BusValue& list);
+/// Those in its list of all name servers that are of no link: a person has set them for the whole device.
+std::vector<IPAddress> deviceServersFrom(const BusValue& list);
 
-/// The name servers that the system's resolver asks for the link. \param interfaceIndex the kernel's number
-Known<std::vector<IPAddress>> resolvedServers(Bus& bus, std::uint32_t interfaceIndex, const Until& until);
+/// The name servers that the system's resolver asks.
+struct ResolvedServers {
+    std::vector<IPAddress> ofLink;
+    std::vector<IPAddress> ofDevice;  ///< for every link; those that it falls back to are not among them
+};
+/// \param interfaceIndex the kernel's number
+Known<ResolvedServers> resolvedServers(Bus& bus, std::uint32_t interfaceIndex, const Until& until);
 
 }  // namespace wp

@@ -197,6 +197,7 @@ void readAsEverything(const BusValue& value) {
     savedFromNetworkManager(value);
     savedFromSupplicant(value, true);
     serversFrom(value);
+    deviceServersFrom(value);
 }
 
 }  // namespace

@@ -49,10 +49,11 @@ resolved() {
     grep -q ^systemd-resolve: /etc/passwd || echo 'systemd-resolve:x:985:985::/:/usr/sbin/nologin' >> /etc/passwd
     grep -q ^systemd-resolve: /etc/group || echo 'systemd-resolve:x:985:' >> /etc/group
     mkdir -p /run/systemd/resolve; chown systemd-resolve:systemd-resolve /run/systemd/resolve
+    # It keeps what it once read of a file that is not its own.
+    ln -sf /run/systemd/resolve/stub-resolv.conf /etc/resolv.conf
     "$LAB_PROGRAMS/lib/systemd/systemd-resolved" > /run/lab/resolved.log 2>&1 &
     wait_for 20 test -e /run/systemd/resolve/stub-resolv.conf && wait_for 20 on_bus org.freedesktop.resolve1 ||
         { cat /run/lab/resolved.log; return 1; }
-    ln -sf /run/systemd/resolve/stub-resolv.conf /etc/resolv.conf
 }
 
 # iwd X: iwd, which joins by itself what stands in /var/lib/iwd and then asks for an address; waits until it is connected.

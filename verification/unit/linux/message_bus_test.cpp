@@ -326,8 +326,15 @@ TEST_F(MessageBus, TheResolverTellsTheLinksServers) {
     Bus bus = this->bus();
     const auto servers = resolvedServers(bus, 3, patience());
     ASSERT_TRUE(servers) << servers.error().text();
-    EXPECT_EQ(textsOf(*servers), "192.168.1.1 ::1 ");
+    EXPECT_EQ(textsOf(servers->ofLink), "192.168.1.1 ::1 ");
     EXPECT_FALSE(resolvedServers(bus, 4, patience()));
+}
+
+TEST_F(MessageBus, TheResolverTellsTheServersThatAPersonSetForTheWholeDevice) {
+    Bus bus = this->bus();
+    const auto servers = resolvedServers(bus, 3, patience());
+    ASSERT_TRUE(servers) << servers.error().text();
+    EXPECT_EQ(textsOf(servers->ofDevice), "203.0.113.10 ");
 }
 
 TEST(NetworkRecords, NamesOfTheSupplicantComeInThreeForms) {

@@ -162,6 +162,10 @@ def bluez():
 def resolved():
     name = "org.freedesktop.resolve1"
     main = service(name, "/org/freedesktop/resolve1", name + ".Manager")
+    main.AddProperty(name + ".Manager", "DNS", dbus.Array([
+        dbus.Struct([dbus.Int32(0), dbus.Int32(2), text(b"\xcb\x00\x71\x0a")], signature="iiay"),
+        dbus.Struct([dbus.Int32(2), dbus.Int32(2), text(b"\x0a\x09\x09\x01")], signature="iiay"),
+        dbus.Struct([dbus.Int32(3), dbus.Int32(2), text(b"\xc0\xa8\x01\x01")], signature="iiay")], signature="(iiay)"))
     main.AddMethod(name + ".Manager", "GetLink", "i", "o", "ret = dbus.ObjectPath('/l/%d' % args[0])")
     main.AddObject("/l/3", name + ".Link", {"DNS": dbus.Array([
         dbus.Struct([dbus.Int32(2), text(b"\xc0\xa8\x01\x01")], signature="iay"),
