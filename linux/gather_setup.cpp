@@ -76,6 +76,8 @@ LinkSetup setupFromNetworkManager(Known<Bus>& bus, const Link& link, const Netwo
     setup.methods = {methodOf(managed.settings, "ipv4"), methodOf(managed.settings, "ipv6")};
     setup.servers = managed.servers;
     setup.nameServers = managedNameServers(bus, link, managed, until);
+    // Servers for all interfaces may stand in place of each one's own.
+    if (setup.servers.empty() && setup.nameServers) setup.servers = setup.nameServers->effective;
     setup.portalApi = portalApiIn(managed.lease4);
     if (setup.portalApi.empty()) setup.portalApi = portalApiIn(managed.lease6);
     setup.leaseText =

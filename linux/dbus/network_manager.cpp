@@ -164,10 +164,13 @@ Known<std::vector<IPAddress>> networkManagerServersElsewhere(Bus& bus, const std
     const BusObject manager{kService, "/org/freedesktop/NetworkManager/DnsManager"};
     const auto all = bus.property(manager, kService + ".DnsManager", "Configuration", until);
     if (!all) return all.error();
-    for (const BusValue& each : all->list())
+    for (const BusValue& each : all->list()) {
+        const std::string of = each["interface"].text();
+        // Servers for all interfaces name none.
         for (const BusValue& text : each["nameservers"].list())
             if (const auto address = IPAddress::fromText(text.text()))
-                (each["interface"].text() == interfaceName ? here : servers).push_back(*address);
+                (of.empty() || of == interfaceName ? here : servers).push_back(*address);
+    }
     std::erase_if(servers, [&](const IPAddress& each) {
         return std::find(here.begin(), here.end(), each) != here.end();
     });
