@@ -3,6 +3,8 @@
 #include <linux/if_addr.h>
 #include <linux/rtnetlink.h>
 
+#include <algorithm>
+
 #include "linux/route_dump.h"
 #include "linux/route_messages.h"
 
@@ -46,11 +48,14 @@ std::vector<AddressDetails> readAddressDetails(Bytes buffer, std::uint32_t inter
     return all;
 }
 
-std::vector<AssignedAddress> assignedOf(const std::vector<AddressDetails>& details, bool byClient) {
+std::vector<AssignedAddress> assignedOf(const std::vector<AddressDetails>& details, bool byClient,
+                                        const std::vector<IPAddress>& granted) {
     std::vector<AssignedAddress> assigned;
     for (const AddressDetails& each : details) {
+        const bool isClients = byClient && !each.assigned.address.isIPv4() && !each.bringsRoute;
         assigned.push_back(each.assigned);
-        if (byClient && !each.assigned.address.isIPv4() && !each.bringsRoute) assigned.back().byItself = true;
+        assigned.back().byItself |=
+            isClients || std::ranges::find(granted, each.assigned.address) != granted.end();
     }
     return assigned;
 }

@@ -25,7 +25,9 @@ std::vector<AddressDetails> readAddressDetails(Bytes buffer, std::uint32_t inter
 /// entered, all without a route. But they leave advertised routes behind. iwd looks at advertisements only where no address of
 /// IPv6 was entered; what was entered for dhcpcd stands in its file. *Any* thread.
 /// \param byClient whether one of them manages the interface, and it has such a route
-std::vector<AssignedAddress> assignedOf(const std::vector<AddressDetails>& details, bool byClient);
+/// \param granted by a lease of DHCPv6: these came by themselves, too
+std::vector<AssignedAddress> assignedOf(const std::vector<AddressDetails>& details, bool byClient,
+                                        const std::vector<IPAddress>& granted = {});
 
 /// Asks the kernel for them.
 Known<std::vector<AddressDetails>> gatherAddressDetails(std::uint32_t interfaceIndex, const Until& until);

@@ -6,6 +6,7 @@
 #include "linux/address_details.h"
 #include "linux/asked_servers.h"
 #include "linux/dbus/bluez.h"
+#include "linux/dbus/connman.h"
 #include "linux/dbus/iwd.h"
 #include "linux/dbus/network_manager.h"
 #include "linux/dbus/supplicant.h"
@@ -119,6 +120,21 @@ LinkSetup setupFromNetworkd(Known<Bus>& bus, const Link& link, const NetworkdLin
     return setup;
 }
 
+LinkSetup setupFromConnman(Known<Bus>& bus, const Link& link, const ConnmanLink& managed,
+                           const Until& until) {
+    LinkSetup setup;
+    setup.toldBy = "ConnMan";
+    setup.methods = managed.methods;
+    setup.servers = managed.servers;
+    const AskedServers asked = askedServers(bus, link, managed.servers, until);
+    NameServers names{managed.manualServers, {}, managed.offeredServers, true};
+    add(names.manual, asked.entered);
+    names.effective = without(asked.all, managed.serversElsewhere);
+    setup.nameServers = std::move(names);
+    setup.leaseText = failure(Reason::unavailable, "ConnMan does not tell its lease");
+    return setup;
+}
+
 bool is(const Error& error, Reason reason) {
     return error.code == static_cast<int>(reason);
 }
@@ -142,12 +158,12 @@ LinkSetup setupOfSilentManager(Known<Bus>& bus, const Link& link, const Error& w
     return setup;
 }
 
-/// \param settings of the profile in use. A profile that cannot be read may hold a proxy; without one there is none.
-Known<WebProxyPlaces> allProxies(const Known<BusValue>& settings) {
+/// \param ofManager the place in its settings, empty for none. Settings that cannot be read may hold a proxy; without a profile
+/// there is none.
+Known<WebProxyPlaces> allProxies(const Known<std::string>& ofManager) {
     WebProxyPlaces places = findProxies([](const char* name) -> const char* { return std::getenv(name); });
-    const std::string ofProfile = settings ? proxyOf(*settings) : "";
-    if (!ofProfile.empty()) places.push_back(ofProfile);
-    if (!settings && places.empty() && !is(settings.error(), Reason::notJoined)) return settings.error();
+    if (ofManager && !ofManager->empty()) places.push_back(*ofManager);
+    if (!ofManager && places.empty() && !is(ofManager.error(), Reason::notJoined)) return ofManager.error();
     return places;
 }
 
@@ -157,6 +173,10 @@ FamiliesOut familiesOut(const Link& link, const Until& until) {
     if (!gateways || gateways->empty()) return {};
     const auto any = std::ranges::count_if(*gateways, &IPAddress::isIPv4);
     return {any > 0, any < std::ssize(*gateways)};
+}
+
+Known<ConnmanLink> connmanLink(Known<Bus>& bus, const Link& link, const Until& until) {
+    return bus ? readConnmanLink(*bus, link.interfaceName, until) : Known<ConnmanLink>(bus.error());
 }
 
 bool isPeerLink(std::uint32_t type) {
@@ -173,20 +193,27 @@ Known<LinkSetup> gatherSetup(const Link& link, const Until& until) {
         bus ? readNetworkManagerLink(*bus, link.interfaceName, until) : bus.error();
     if (!managed && isStopped(managed.error())) return managed.error();
     Known<LinkSetup> setup;
-    Known<BusValue> profile = BusValue();
+    Known<std::string> proxy = std::string();
     if (managed) {
         setup = setupFromNetworkManager(bus, link, *managed, until);
-        profile = managed->settings;
+        proxy =
+            managed->settings ? Known<std::string>(proxyOf(*managed->settings)) : managed->settings.error();
     } else if (const auto networkd = readNetworkdLink(link.interfaceIndex)) {
         setup = setupFromNetworkd(bus, link, *networkd, until);
     } else if (mayManage(managed.error())) {
         setup = setupOfSilentManager(bus, link, managed.error(), until);
-        profile = managed.error();
+        proxy = managed.error();
+    } else if (const auto connman = connmanLink(bus, link, until); connman) {
+        setup = setupFromConnman(bus, link, *connman, until);
+        proxy = connman->proxy;
+    } else if (mayManage(connman.error())) {
+        setup = setupOfSilentManager(bus, link, connman.error(), until);
+        proxy = connman.error();
     } else {
         setup = setupWithoutManager(bus, link, until);
     }
     if (!setup) return setup;
-    setup->proxies = allProxies(profile);
+    setup->proxies = allProxies(proxy);
     setup->leadsOut = familiesOut(link, until);
     return setup;
 }
@@ -198,6 +225,11 @@ Known<SavedNetworks> gatherSaved(const Link& link, const Until& until) {
     if (managed) return networkManagerNetworks(*bus, link.interfaceName, until);
     // What it hands to the supplicant is not its store.
     if (mayManage(managed.error())) return managed.error();
+    const auto connman = readConnmanLink(*bus, link.interfaceName, until);
+    if (connman)
+        return failure(Reason::unavailable,
+                       "ConnMan does not tell the networks that it remembers and that are out of reach");
+    if (mayManage(connman.error())) return connman.error();
     const auto objects = iwdObjects(*bus, until);
     if (objects && !iwdDevice(*objects, link.interfaceName).empty()) return iwdNetworks(*objects);
     const auto interface = supplicantInterface(*bus, link.interfaceName, until);

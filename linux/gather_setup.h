@@ -8,11 +8,12 @@ namespace wp {
 // What this device itself is set up to, from its connection manager, its message bus and its files. Each function
 // blocks until it has the fact, cannot have it, or `until` ends it, and changes nothing. *Any* thread.
 
-/// Of NetworkManager or systemd-networkd where one of them manages the interface, else from addresses, leases and
+/// Of NetworkManager, systemd-networkd or ConnMan where one of them manages the interface, else from addresses, leases and
 /// the resolver's file.
 Known<LinkSetup> gatherSetup(const Link& link, const Until& until);
 
-/// The networks that are remembered by whatever manages the interface: NetworkManager, iwd or wpa_supplicant.
+/// The networks that are remembered by whatever manages the interface: NetworkManager, iwd or wpa_supplicant. ConnMan does not
+/// tell them.
 Known<SavedNetworks> gatherSaved(const Link& link, const Until& until);
 
 Known<Bluetooth> gatherBluetooth(const Until& until);

@@ -37,9 +37,9 @@ struct ClientLeases {
     std::optional<Lease> ipv4, ipv6;
 };
 
-ClientLeases readClientLeases(const Link& link, const std::vector<AssignedAddress>& assigned) {
+ClientLeases readClientLeases(const Link& link, const std::vector<AddressDetails>& details) {
     std::vector<IPAddress> addresses;
-    for (const AssignedAddress& each : assigned) addresses.push_back(each.address);
+    for (const AddressDetails& each : details) addresses.push_back(each.assigned.address);
     const std::time_t now = std::time(nullptr);
     DhcpcdLeases kept = findDhcpcdLeases(link.interfaceName, addresses, now);
     if (!kept.ipv4) kept.ipv4 = findLease(link.interfaceName, addresses, now);
@@ -62,7 +62,7 @@ struct Evidence {
     const char* toldBy = "addresses";
     ResolverRecords records;
 
-    bool hasClientOfIPv4() const { return leases.ipv4 || clients.ipv4; }
+    bool mayHaveLease() const { return leases.ipv4 || clients.ipv4; }
 };
 
 /// What files say of the interface: ifupdown's; dhcpcd's of a family of which it set an address that stands there.
@@ -87,12 +87,10 @@ Known<Evidence> gatherEvidence(Known<Bus>& bus, const Link& link, const Until& u
     evidence.ways = gatherWaysOut(link.interfaceIndex, until);
     evidence.isIwds = iwdManages(bus, link, until);
     evidence.clients = dhcpClientsOf(link.interfaceName);
+    evidence.leases = readClientLeases(link, *details);
     const bool byClient = evidence.isIwds || evidence.clients.asksRouters;
-    evidence.assigned = assignedOf(*details, byClient && evidence.ways && evidence.ways->advertised);
-    evidence.leases = readClientLeases(link, evidence.assigned);
-    if (evidence.leases.ipv6)
-        for (AssignedAddress& each : evidence.assigned)
-            each.byItself |= contains(evidence.leases.ipv6->addresses, each.address);
+    evidence.assigned = assignedOf(*details, byClient && evidence.ways && evidence.ways->advertised,
+                                   evidence.leases.ipv6 ? evidence.leases.ipv6->addresses : Servers());
     readPlans(link, evidence);
     evidence.records = resolverRecords(link.interfaceName);
     return evidence;
@@ -102,7 +100,10 @@ AddressMethods methodsFrom(const Evidence& evidence, const std::string& interfac
     KernelIPv6 switches = kernelSwitches(interfaceName);
     switches.setByClient = evidence.clients.asksRouters;
     switches.acceptsAdvertisements |= evidence.clients.asksRouters || evidence.isIwds;
-    return {methodFromIPv4Addresses(evidence.assigned, evidence.hasClientOfIPv4(), evidence.plan.ipv4),
+    FamilyPlan ipv4 = evidence.plan.ipv4;
+    // A client whose lease would have been read asks for an address, but did not set the one that is there.
+    if (ipv4.method.empty() && evidence.clients.leavesLease) ipv4 = {"auto", {}, true};
+    return {methodFromIPv4Addresses(evidence.assigned, evidence.mayHaveLease(), ipv4),
             methodFromIPv6Addresses(evidence.assigned, switches, evidence.plan.ipv6)};
 }
 
@@ -147,10 +148,9 @@ Known<LinkSetup> setupWithoutManager(Known<Bus>& bus, const Link& link, const Un
     const AskedServers asked = askedServers(bus, link, {}, until);
     setup.nameServers = serversFrom(*evidence, asked);
     setup.servers = leases.ipv4 && !leases.ipv4->servers.empty() ? leases.ipv4->servers : asked.all;
-    setup.leaseText =
-        failure(Reason::unavailable, evidence->hasClientOfIPv4()
-                                         ? "the DHCP client left no lease of IPv4 that can be read"
-                                         : "no lease of IPv4 was found");
+    setup.leaseText = failure(Reason::unavailable,
+                              evidence->clients.any ? "the DHCP client left no lease of IPv4 that can be read"
+                                                    : "no lease of IPv4 was found");
     if (leases.ipv4) setup.leaseText = leases.ipv4->vendorText;
     for (const auto* lease : {&leases.ipv4, &leases.ipv6})
         if (*lease && setup.portalApi.empty()) setup.portalApi = (*lease)->portalApi;

@@ -14,7 +14,7 @@ namespace wp {
 /// How the interface is set up, by its connection manager, else by what the kernel and the files of the system
 /// give away.
 struct LinkSetup {
-    /// "NetworkManager", "systemd-networkd"; "addresses": nobody, so that those were looked at; "ifupdown": the same, held
+    /// "NetworkManager", "systemd-networkd", "ConnMan"; "addresses": nobody, so that those were looked at; "ifupdown": the same, held
     /// together with what its file says; "dhcpcd": an address stands in its settings.
     std::string toldBy;
     AddressMethods methods;

@@ -11,13 +11,14 @@ namespace {
 struct Client {
     const char* program;
     bool ipv4;         ///< asks for addresses of IPv4, unless told not to
+    bool leavesLease;  ///< sets addresses with their end, and keeps a lease that tells of those without one
     bool asksRouters;  ///< looks at routers' advertisements itself, and has the kernel leave them alone
 };
-constexpr Client kClients[] = {{"udhcpc", true, false},
-                               {"udhcpc6", false, false},
-                               {"dhclient", true, false},
-                               {"dhcpcd", true, true},
-                               {"connmand", true, true}};
+constexpr Client kClients[] = {{"udhcpc", true, false, false},
+                               {"udhcpc6", false, false, false},
+                               {"dhclient", true, true, false},
+                               {"dhcpcd", true, true, true},
+                               {"connmand", true, false, true}};
 
 /// A client that names interfaces looks after those, one that names none after all.
 bool looksAfter(const std::vector<std::string>& words, const std::string& interfaceName) {
@@ -55,7 +56,9 @@ DhcpClients dhcpClientsOf(const std::string& interfaceName, const std::string& r
         const Client* client = clientIn(words);
         if (client == nullptr || !looksAfter(words, interfaceName)) return;
         clients.any = true;
-        clients.ipv4 |= client->ipv4 && !isForIPv6Alone(words);
+        const bool ipv4 = client->ipv4 && !isForIPv6Alone(words);
+        clients.ipv4 |= ipv4 && !client->leavesLease;
+        clients.leavesLease |= ipv4 && client->leavesLease;
         clients.asksRouters |= client->asksRouters;
     });
     return clients;

@@ -8,7 +8,8 @@ namespace wp {
 /// an automatic address from one that was entered.
 struct DhcpClients {
     bool any = false;
-    bool ipv4 = false;         ///< one asks for addresses of IPv4
+    bool ipv4 = false;         ///< one asks for addresses of IPv4, and may set them without an end or a lease
+    bool leavesLease = false;  ///< one asks for addresses of IPv4, and leaves a lease of any without an end
     bool asksRouters = false;  ///< one looks at advertisements itself, and has the kernel leave them alone
 };
 /// The clients among the processes that this user sees. *Any* thread.

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <filesystem>
+#include <set>
 
 #include "linux/files/key_value_file.h"
 #include "linux/files/leases.h"
@@ -155,14 +156,18 @@ void readDnsmasqCommand(const std::vector<std::string>& words, DnsmasqSettings& 
 }
 
 std::optional<DnsmasqServers> dnsmasqServers(const std::string& root) {
-    std::vector<DnsmasqServers> all;
+    // One that runs scripts has a helper with the same command line.
+    std::set<std::vector<std::string>> commands;
     forEachProcess(root, [&](const std::vector<std::string>& command) {
-        if (programOf(command[0]) != "dnsmasq") return;
+        if (programOf(command[0]) == "dnsmasq") commands.insert(command);
+    });
+    std::vector<DnsmasqServers> all;
+    for (const auto& command : commands) {
         const DnsmasqSettings settings = settingsOf(command, root);
         DnsmasqServers servers = serversOf(settings, root);
         if (answersHere(settings) && (servers.heedsBus || !servers.asked.empty()))
             all.push_back(std::move(servers));
-    });
+    }
     if (all.size() != 1 || all[0].asked.empty()) return std::nullopt;
     return all[0];
 }

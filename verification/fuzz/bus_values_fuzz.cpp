@@ -6,6 +6,7 @@
 #include <memory>
 
 #include "linux/dbus/bluez.h"
+#include "linux/dbus/connman.h"
 #include "linux/dbus/iwd.h"
 #include "linux/dbus/message_reader.h"
 #include "linux/dbus/network_manager.h"
@@ -190,6 +191,7 @@ unsigned depthOf(const BusValue& value) {
 /// Hands the value to everybody who takes one from a service.
 void readAsEverything(const BusValue& value) {
     bluetoothFrom(value);
+    connmanLinkIn(value, "wlan0");
     iwdDevice(value, "wlan0");
     iwdNetworks(value);
     manualServers(value);

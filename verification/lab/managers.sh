@@ -66,6 +66,20 @@ iwd() {
     wait_for 60 iwd_joined "$1" || { cat /run/lab/iwd.log; return 1; }
 }
 
+# connman X < settings of a network: ConnMan, and the wpa_supplicant that it drives, for interface X only; waits until it is connected.
+connman_connected() { "$LAB_PROGRAMS/usr/bin/connmanctl" services | grep -q '^..[OR] '; }
+connman() {
+    message_bus
+    mkdir -p /var/lib/connman /run/connman /etc/connman
+    printf '%s\n' '[General]' EnableOnlineCheck=false AllowHostnameUpdates=false > /etc/connman/main.conf
+    printf '%s\n' '[global]' OfflineMode=false '[WiFi]' Enable=true > /var/lib/connman/settings
+    ln -sf /run/connman/resolv.conf /etc/resolv.conf
+    { printf '%s\n' '[service_of_the_lab]' Type=wifi; cat; } > /var/lib/connman/lab.config
+    wpa_supplicant -B -u -f /run/lab/wpa-dbus.log > /dev/null
+    "$LAB_PROGRAMS/usr/sbin/connmand" -n -i "$1" -c /etc/connman/main.conf > /run/lab/connman.log 2>&1 &
+    wait_for 60 connman_connected || { "$LAB_PROGRAMS/usr/bin/connmanctl" services; cat /run/lab/connman.log; return 1; }
+}
+
 # ifupdown WORD < /etc/network/interfaces: starts an interface as ifup is told to by that word, as "wlan0" or "wlan0=home".
 ifupdown() {
     mkdir -p /etc/network /run/network /run/lab

@@ -332,7 +332,8 @@ TEST_F(Root, HasADhcpClientOfIPv6ThatDoesNotAskForIPv4) {
         write("/proc/12/cmdline", command);
         const DhcpClients clients = dhcpClientsOf("wlan0", root_);
         EXPECT_TRUE(clients.any);
-        return clients.ipv4;
+        EXPECT_FALSE(clients.ipv4 && clients.leavesLease);
+        return clients.ipv4 || clients.leavesLease;
     };
     EXPECT_TRUE(asksForIPv4(commandOf({"/sbin/dhclient", "-4", "wlan0"})));
     EXPECT_FALSE(asksForIPv4(commandOf({"/sbin/dhclient", "-6", "-S", "wlan0"})));

@@ -5,6 +5,7 @@
 #include <thread>
 
 #include "linux/dbus/bluez.h"
+#include "linux/dbus/connman.h"
 #include "linux/dbus/iwd.h"
 #include "linux/dbus/network_manager.h"
 #include "linux/dbus/network_records.h"
@@ -32,9 +33,9 @@ class MessageBus : public ::testing::Test {
         daemon_ = new ChildProcess({"dbus-daemon", "--session", "--nofork", "--nopidfile", "--print-address",
                                     "--address=" + address_});
         setenv("DBUS_SYSTEM_BUS_ADDRESS", address_.c_str(), 1);
-        services_ = new ChildProcess({"/usr/bin/python3",
-                                      sourceFolder() + "/verification/unit/linux/fakes/bus_services.py",
-                                      address_, "nm", "supplicant", "iwd", "bluez", "resolved", "broken"});
+        services_ = new ChildProcess(
+            {"/usr/bin/python3", sourceFolder() + "/verification/unit/linux/fakes/bus_services.py", address_,
+             "nm", "supplicant", "iwd", "bluez", "connman", "resolved", "broken"});
     }
     static void TearDownTestSuite() {
         unsetenv("DBUS_SYSTEM_BUS_ADDRESS");
@@ -208,6 +209,42 @@ TEST_F(MessageBus, WhatASilentManagerWasToldIsNotReadFromAddresses) {
     // This machine's own environment may set a proxy, which is an answer.
     EXPECT_TRUE(setup->proxies ? !setup->proxies->empty()
                                : setup->proxies.error().code == codeOf(Reason::timeout));
+}
+
+TEST_F(MessageBus, ConnmanTellsWhatWasChosenForTheNetworkThatItConnected) {
+    Bus bus = this->bus();
+    const auto home = readConnmanLink(bus, "wlan12", patience());
+    ASSERT_TRUE(home) << home.error().text();
+    EXPECT_EQ(*home->methods.ipv4, "dhcp") << "though it came to another";
+    EXPECT_EQ(*home->methods.ipv6, "disabled");
+    EXPECT_EQ(textsOf(home->manualServers), "9.9.9.9 ");
+    EXPECT_EQ(textsOf(home->servers), "9.9.9.9 ");
+    EXPECT_EQ(textsOf(home->serversElsewhere), "192.168.1.1 2001:db8::53 10.0.0.1 192.168.1.1 ");
+    EXPECT_EQ(home->proxy, "ConnMan service: manual");
+    const auto odd = readConnmanLink(bus, "wlan14", patience());
+    ASSERT_TRUE(odd) << odd.error().text();
+    EXPECT_EQ(*odd->methods.ipv4, "manual");
+    EXPECT_FALSE(odd->methods.ipv6);
+    const auto absent = readConnmanLink(bus, "wlan99", patience());
+    ASSERT_FALSE(absent);
+    EXPECT_EQ(absent.error().code, codeOf(Reason::notFound));
+}
+
+TEST_F(MessageBus, AnInterfaceThatConnmanConnectedIsJudgedByItsWord) {
+    const auto setup = gatherSetup({"wlan13", 9913, 0, true, {}}, patience());
+    ASSERT_TRUE(setup) << setup.error().text();
+    EXPECT_EQ(setup->toldBy, "ConnMan");
+    EXPECT_EQ(*setup->methods.ipv4, "manual");
+    EXPECT_EQ(*setup->methods.ipv6, "auto");
+    ASSERT_TRUE(setup->nameServers);
+    EXPECT_EQ(textsOf(setup->nameServers->manual), "");
+    EXPECT_EQ(textsOf(setup->nameServers->offered), "2001:db8::53 ") << "none of IPv4 with addresses by hand";
+    EXPECT_EQ(textsOf(setup->servers), "192.168.1.1 2001:db8::53 ");
+    ASSERT_FALSE(setup->leaseText);
+    // What it hands to the supplicant is not its store.
+    const auto saved = gatherSaved({"wlan13", 9913, 0, true, {}}, patience());
+    ASSERT_FALSE(saved);
+    EXPECT_EQ(saved.error().code, codeOf(Reason::unavailable));
 }
 
 TEST_F(MessageBus, NetworkManagerTellsItsNetworks) {

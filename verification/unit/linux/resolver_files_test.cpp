@@ -33,6 +33,8 @@ TEST_F(DnsmasqOf, ADeviceAsksWhomTheResolversFileNamesBesideItself) {
     EXPECT_EQ(found(), "nothing") << "nobody answers there";
     runs(12, {"/usr/sbin/dnsmasq"});
     EXPECT_EQ(found(), "192.168.1.1 | ");
+    runs(13, {"/usr/sbin/dnsmasq"});
+    EXPECT_EQ(found(), "192.168.1.1 | ") << "a helper of the same";
     write("/etc/dnsmasq.conf",
           "# resolv-file=/none\nresolv-file = /run/dnsmasq/resolv.conf # resolvconf's\n");
     EXPECT_EQ(found(), "nothing") << "the file is not there";

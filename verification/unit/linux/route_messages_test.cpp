@@ -186,6 +186,12 @@ TEST(AddressDetails, OfIwdOrDhcpcdWereEnteredUnlessARouteIsAdvertised) {
     EXPECT_TRUE(entered[0].permanent);
 }
 
+TEST(AddressDetails, OfALeaseWereNotEnteredThoughTheyHaveNoEnd) {
+    const auto details = readAddressDetails(addressMessage(0, 0xFFFF'FFFF), 3);
+    EXPECT_TRUE(assignedOf(details, false, {*IPAddress::fromText("2001:db8::5")})[0].byItself);
+    EXPECT_FALSE(assignedOf(details, false, {*IPAddress::fromText("2001:db8::6")})[0].byItself);
+}
+
 TEST(AddressDetails, SurviveAnyCutOfADump) {
     const auto whole = captured("good-home-addr");
     const std::uint32_t interface = interfaceIn("good-home");

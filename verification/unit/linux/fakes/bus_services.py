@@ -1,7 +1,7 @@
 #!/usr/bin/python3
 """Stand-ins for the services that a device may have on its system bus, with a small fixed state each.
 
-Usage: bus_services.py ADDRESS SERVICE...   (prints "ready"; services: nm, refusing-nm, supplicant, iwd, bluez, resolved, broken)
+Usage: bus_services.py ADDRESS SERVICE...   (prints "ready"; services: nm, refusing-nm, supplicant, iwd, bluez, connman, resolved, broken)
 """
 import sys
 
@@ -159,6 +159,33 @@ def bluez():
                        {"Paired": paired, "Connected": connected}, [])
 
 
+def connman():
+    name = "net.connman"
+    main = service(name, "/", name + ".Manager")
+
+    def entry(path, state, interface, **more):
+        values = {"State": state, "Ethernet": dbus.Dictionary({"Interface": interface}, signature="sv")}
+        values.update({key.replace("_", "."): value for key, value in more.items()})
+        return dbus.Struct((dbus.ObjectPath("/net/connman/service/" + path), dbus.Dictionary(values, signature="sv")),
+                           signature="oa{sv}")
+
+    def method(value):
+        return dbus.Dictionary({"Method": value}, signature="sv")
+
+    main.connman_services = dbus.Array([
+        entry("wifi_nearby", "idle", "wlan12", IPv4_Configuration=method("dhcp")),
+        entry("wifi_home", "online", "wlan12", IPv4=method("auto"), IPv4_Configuration=method("dhcp"),
+              IPv6_Configuration=method("off"),
+              Nameservers=dbus.Array(["9.9.9.9", "bogus"]), Nameservers_Configuration=dbus.Array(["9.9.9.9"]),
+              Proxy=method("auto"), Proxy_Configuration=method("manual")),
+        entry("wifi_hall", "ready", "wlan13", IPv4_Configuration=method("manual"), IPv6=method("auto"),
+              Nameservers=dbus.Array(["192.168.1.1", "2001:db8::53"]), Proxy=method("auto")),
+        entry("wifi_odd", "ready", "wlan14", IPv4=method("fixed"), IPv6_Configuration=method("new")),
+        entry("ethernet", "ready", "eth0", Nameservers=dbus.Array(["10.0.0.1", "192.168.1.1"]))],
+        signature="(oa{sv})")
+    main.AddMethod(name + ".Manager", "GetServices", "", "a(oa{sv})", "ret = self.connman_services")
+
+
 def resolved():
     name = "org.freedesktop.resolve1"
     main = service(name, "/org/freedesktop/resolve1", name + ".Manager")
@@ -203,7 +230,8 @@ def refusing_network_manager():
 
 
 for each in sys.argv[2:]:
-    {"nm": network_manager, "refusing-nm": refusing_network_manager, "supplicant": supplicant, "iwd": iwd, "bluez": bluez, "resolved": resolved,
+    {"nm": network_manager, "refusing-nm": refusing_network_manager, "supplicant": supplicant, "iwd": iwd, "bluez": bluez,
+     "connman": connman, "resolved": resolved,
      "broken": broken}[each]()
 print("ready", flush=True)
 GLib.MainLoop().run()
