@@ -8,7 +8,7 @@ from pathlib import Path
 from typing import Callable
 
 from . import script
-from .description import Scenario, Want
+from .description import Scenario
 
 LAB = Path(__file__).resolve().parent.parent
 # How many scenarios share one start of the machine: a start takes about two seconds, and a machine that
@@ -20,13 +20,6 @@ def kind(asked: str | None) -> str:
     """Which machine run-in-lab takes."""
     cache = Path(os.environ.get("LAB_CACHE", LAB / ".cache"))
     return asked or ("uml" if os.access(cache / "uml" / "linux", os.X_OK) else "qemu")
-
-
-def truth_on(machine: str, wants: list[Want]) -> list[Want]:
-    """Debian's kernel under qemu gives each simulated radio a regulatory domain of its own, 99, whatever country is set."""
-    if machine != "qemu":
-        return wants
-    return [Want(w.place, w.kind, "99") if w.place.endswith(".adoptedCountryCode") and w.kind == "value" else w for w in wants]
 
 
 @dataclass(frozen=True)
