@@ -55,12 +55,13 @@ bool numberFollows(std::string_view text, std::size_t end, char separator, std::
     return digits > 0 && digits <= mostDigits && !isWordByteAt(text, last);
 }
 
-/// Whether one more number of a row stands before, with the separator behind it.
+/// Whether one more number of a row stands before, with the separator behind it; the first may be a version's, "v1".
 bool numberPrecedes(std::string_view text, std::size_t begin, char separator, std::size_t mostDigits) {
     if (begin == 0 || text[begin - 1] != separator) return false;
     std::size_t first = begin - 1;
     while (first > 0 && isHex(text[first - 1])) --first;
     std::size_t digits = begin - 1 - first;
+    if (first > 0 && (text[first - 1] == 'v' || text[first - 1] == 'V')) --first;
     return digits > 0 && digits <= mostDigits && (first == 0 || !isWordByteAt(text, first - 1));
 }
 

@@ -53,7 +53,9 @@ int guarded(const std::vector<std::string>& words) {
         log.message(exit.what());
         return exit.status();
     } catch (const std::system_error& error) {
-        log.message(std::string("cannot go on: the system refuses a thread or a lock: ") + error.what());
+        bool isThread = error.code() == std::errc::resource_unavailable_try_again;
+        log.message((isThread ? "cannot go on: the system refuses a thread: " : "cannot go on: ") +
+                    std::string(error.what()));
         return exit_status::failure;
     } catch (const std::exception& exception) {
         log.message(std::string("cannot go on: ") + exception.what());

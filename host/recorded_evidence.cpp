@@ -95,7 +95,8 @@ bool hasTested(const Recording& recording) {
                                [](const RecordedAnswer& answer) { return isDeviceTest(answer.test); });
 }
 
-/// When the power goes off all that is still asked is cancelled. A switch after the last test ended nothing.
+/// When the power goes off all that is still asked is cancelled. Of a switch after the last answer nobody can tell whether
+/// it ended the run: it goes for one that came later.
 bool wasCutOffByPower(const Recording& recording) {
     bool wentOff =
         std::ranges::any_of(recording.events, [](const RecordedPowerEvent& event) { return !event.power; });
@@ -108,13 +109,14 @@ bool wasCutOffByPower(const Recording& recording) {
 /// How a run with the list ended without having tested all that it was to test; nothing for any other.
 std::optional<int> earlyEnd(const Recording& recording) {
     const WiFiDescription& wifi = recording.wifi;
+    bool isUntested = !hasTested(recording);
+    if (isUntested && (!wifi.radio || !wifi.client)) return kNoManager;
+    if (isUntested && wifi.devices.empty()) return kNoDevice;
     if (wasCutOffByPower(recording)) return kPowerOff;
-    if (hasTested(recording)) return std::nullopt;
-    if (!wifi.radio || !wifi.client) return kNoManager;
-    if (wifi.devices.empty()) return kNoDevice;
-    // Where Wi-Fi was switched on, the list has scanned.
-    bool wasLeftOff = !wifi.power && recording.events.empty() && !isListRun(recording);
-    return wasLeftOff ? std::optional(kPowerDeclined) : std::nullopt;
+    // Where Wi-Fi was switched on, the list has asked for the status, and then scanned.
+    bool wasLeftOff =
+        !wifi.power && recording.events.empty() && recording.status.empty() && !isListRun(recording);
+    return isUntested && wasLeftOff ? std::optional(kPowerDeclined) : std::nullopt;
 }
 
 /// The evidence of a run that ended before the first test.

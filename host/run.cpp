@@ -263,12 +263,12 @@ int Run::conclude(const std::optional<std::string>& obstacle) {
     } else {
         closeScreen();
         Attempts attempts;
+        if (!interrupted && !hasLeft_) attempts.make([&] { fail(*obstacle); });
         writeRecords(attempts);
         attempts.end();
     }
     if (interrupted) return *interrupted;
     if (hasLeft_) return exit_status::leftByUser;
-    if (obstacle) fail(*obstacle);
     return exitStatusOf(controller_->result().statusCode().value_or(1));
 }
 

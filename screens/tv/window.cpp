@@ -78,9 +78,10 @@ void Window::fieldChanged() {
 void Window::keyPressEvent(QKeyEvent* event) {
     event->accept();
     if (auto key = keyOf(static_cast<Qt::Key>(event->key()), event->nativeScanCode())) {
-        // A key that is still held from one question must not answer the next.
+        // A key that is still held from one question must not answer the next; on the keys of a field it repeats them.
+        if (!event->isAutoRepeat()) mayRepeat_ = *key != ui::Key::back && input_.takesText();
         bool isDecision = *key == ui::Key::select || *key == ui::Key::back;
-        if (!isDecision || !event->isAutoRepeat()) input_.press(*key);
+        if (!isDecision || !event->isAutoRepeat() || (mayRepeat_ && input_.takesText())) input_.press(*key);
         return;
     }
     bool isCommand =

@@ -37,6 +37,7 @@ class Window final : public QQuickView {
 
     Input input_;
     InputMethodItem* inputMethod_;
+    bool mayRepeat_ = false;  ///< what is held was pressed in a field
 };
 
 }  // namespace wp::tv

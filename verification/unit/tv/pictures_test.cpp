@@ -402,6 +402,19 @@ TEST_F(Pictures, AHeldKeyChoosesAndGoesBackOnceButKeepsMovingTheFocus) {
     EXPECT_EQ(timesLeft, 0);
 }
 
+TEST_F(Pictures, AHeldKeyOfTheKeyboardOnTheScreenTypesOn) {
+    open();
+    showList(neighbourhood(4));
+    run.choose("Other…");
+    QWindow* window = QGuiApplication::topLevelWindows().front();
+    for (bool isRepeated : {false, true, true}) {
+        QKeyEvent event(QEvent::KeyPress, Qt::Key_Select, Qt::NoModifier, {}, isRepeated);
+        QCoreApplication::sendEvent(window, &event);
+    }
+
+    EXPECT_EQ(run.device.screen.alert()->textFields().front()->text().size(), 3U);
+}
+
 TEST_F(Pictures, AnInputMethodIsToldWhereTheCursorIsPainted) {
     open();
     showList(neighbourhood(4));
