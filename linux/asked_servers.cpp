@@ -44,7 +44,8 @@ AskedServers behindResolver(Known<Bus>& bus, const Link& link, const Servers& na
     const auto resolved = askResolved(bus, link, until);
     if (!resolved) return {ofManager, {}};
     // Where the file is not its own it takes what stands there for entered.
-    if (std::ranges::none_of(named, isResolveds)) return {resolved->ofLink, {}};
+    if (std::ranges::none_of(named, isResolveds))
+        return {resolved->ofLink.empty() ? ofManager : resolved->ofLink, {}};
     return united(*resolved);
 }
 
@@ -55,6 +56,12 @@ void add(Servers& servers, const Servers& more) {
         if (std::ranges::find(servers, each) == servers.end()) servers.push_back(each);
 }
 
+Servers without(Servers servers, const Servers& others) {
+    std::erase_if(servers,
+                  [&](const IPAddress& each) { return std::ranges::find(others, each) != others.end(); });
+    return servers;
+}
+
 AskedServers askedServers(Known<Bus>& bus, const Link& link, const Servers& ofManager, const Until& until) {
     const auto file = readSmallFile("/etc/resolv.conf");
     AskedServers asked{file ? serversFromResolverFile(*file) : Servers(), {}};
@@ -63,7 +70,7 @@ AskedServers askedServers(Known<Bus>& bus, const Link& link, const Servers& ofMa
             if (AskedServers own = united(*resolved); !own.all.empty()) return own;
     if (!std::ranges::any_of(asked.all, &IPAddress::loopback)) return asked;
     AskedServers behind = behindResolver(bus, link, asked.all, ofManager, until);
-    if (behind.all.empty()) return asked;
+    if (behind.all.empty()) return {std::move(asked.all), std::move(behind.entered)};
     std::erase_if(asked.all, [](const IPAddress& each) { return each.loopback(); });
     behind.ofLinkAlone &= asked.all.empty();
     add(asked.all, behind.all);

@@ -20,12 +20,6 @@
 namespace wp {
 namespace {
 
-Servers without(Servers servers, const Servers& others) {
-    std::erase_if(servers,
-                  [&](const IPAddress& each) { return std::ranges::find(others, each) != others.end(); });
-    return servers;
-}
-
 Servers fromWords(const std::string& words) {
     Servers servers;
     std::string spaced = words;
@@ -64,7 +58,7 @@ Known<NameServers> managedNameServers(Known<Bus>& bus, const Link& link, const N
     // Another interface's servers are no setting of this one.
     const auto elsewhere = networkManagerServersElsewhere(*bus, link.interfaceName, until);
     const AskedServers asked = askedServers(bus, link, managed.servers, until);
-    add(names.manual, asked.entered);
+    add(names.manual, without(asked.entered, names.offered));
     names.effective = without(asked.all, elsewhere ? *elsewhere : Servers());
     names.offerKnown = managed.offerRead && elsewhere;
     return names;
@@ -105,7 +99,7 @@ LinkSetup setupFromNetworkd(Known<Bus>& bus, const Link& link, const NetworkdLin
     Servers own = managed.manualServers;
     add(own, managed.offeredServers);
     const AskedServers asked = askedServers(bus, link, own, until);
-    add(names.manual, asked.entered);
+    add(names.manual, without(asked.entered, names.offered));
     names.effective = asked.all;
     names.offerKnown = asked.ofLinkAlone || !leadsElsewhere(link, until);
     // Servers of a router's advertisement stand nowhere but in the list that is asked.
@@ -128,8 +122,9 @@ LinkSetup setupFromConnman(Known<Bus>& bus, const Link& link, const ConnmanLink&
     setup.servers = managed.servers;
     const AskedServers asked = askedServers(bus, link, managed.servers, until);
     NameServers names{managed.manualServers, {}, managed.offeredServers, true};
-    add(names.manual, asked.entered);
+    add(names.manual, without(asked.entered, names.offered));
     names.effective = without(asked.all, managed.serversElsewhere);
+    if (setup.servers.empty()) setup.servers = names.effective;
     setup.nameServers = std::move(names);
     setup.leaseText = failure(Reason::unavailable, "ConnMan does not tell its lease");
     return setup;

@@ -102,7 +102,8 @@ AddressMethods methodsFrom(const Evidence& evidence, const std::string& interfac
     switches.acceptsAdvertisements |= evidence.clients.asksRouters || evidence.isIwds;
     FamilyPlan ipv4 = evidence.plan.ipv4;
     // A client whose lease would have been read asks for an address, but did not set the one that is there.
-    if (ipv4.method.empty() && evidence.clients.leavesLease) ipv4 = {"auto", {}, true};
+    if (evidence.clients.leavesLease && (ipv4.method.empty() || ipv4.method == "auto"))
+        ipv4 = {"auto", {}, true};
     return {methodFromIPv4Addresses(evidence.assigned, evidence.mayHaveLease(), ipv4),
             methodFromIPv6Addresses(evidence.assigned, switches, evidence.plan.ipv6)};
 }
@@ -117,7 +118,7 @@ NameServers serversFrom(const Evidence& evidence, const AskedServers& asked) {
     for (const auto* lease : {&leases.ipv4, &leases.ipv6})
         if (*lease) add(names.offered, (*lease)->servers);
     add(names.offered, records.offered);
-    names.manual = asked.entered;
+    names.manual = without(asked.entered, names.offered);
     // Files do nothing by themselves: what they name must have come to be asked.
     for (const auto* entered : {&evidence.plan.servers, &records.entered})
         for (const IPAddress& each : *entered)
@@ -146,8 +147,10 @@ Known<LinkSetup> setupWithoutManager(Known<Bus>& bus, const Link& link, const Un
     setup.toldBy = evidence->toldBy;
     setup.methods = methodsFrom(*evidence, link.interfaceName);
     const AskedServers asked = askedServers(bus, link, {}, until);
-    setup.nameServers = serversFrom(*evidence, asked);
-    setup.servers = leases.ipv4 && !leases.ipv4->servers.empty() ? leases.ipv4->servers : asked.all;
+    NameServers names = serversFrom(*evidence, asked);
+    setup.servers = names.effective.empty() ? asked.all : names.effective;
+    if (leases.ipv4 && !leases.ipv4->servers.empty()) setup.servers = leases.ipv4->servers;
+    setup.nameServers = std::move(names);
     setup.leaseText = failure(Reason::unavailable,
                               evidence->clients.any ? "the DHCP client left no lease of IPv4 that can be read"
                                                     : "no lease of IPv4 was found");

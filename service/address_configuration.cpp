@@ -16,8 +16,9 @@ bool contains(const std::vector<IPAddress>& list, const IPAddress& address) {
 }  // namespace
 
 bool isAssigned(const FamilyPlan& plan, const std::vector<AssignedAddress>& addresses) {
-    return std::any_of(addresses.begin(), addresses.end(),
-                       [&](const AssignedAddress& each) { return contains(plan.addresses, each.address); });
+    return std::any_of(addresses.begin(), addresses.end(), [&](const AssignedAddress& each) {
+        return each.permanent && contains(plan.addresses, each.address);
+    });
 }
 
 Known<std::string> methodFromIPv4Addresses(const std::vector<AssignedAddress>& addresses, bool hasLease,

@@ -39,7 +39,7 @@ struct FamilyPlan {
     bool started = false;              ///< whether the interface is kept as started by that file
 };
 
-/// Whether the interface has an address that stands in the file. *Any* thread.
+/// Whether the interface has an address that stands in the file, without an end as such addresses are. *Any* thread.
 bool isAssigned(const FamilyPlan& plan, const std::vector<AssignedAddress>& addresses);
 
 /// What a file says of one interface.

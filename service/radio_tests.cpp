@@ -85,7 +85,7 @@ std::map<CountryCode, std::set<MacAddress>> countryWitnesses(const Facts& facts,
     if (judged.says.country) witnesses[*judged.says.country].insert(judged.address);
     if (!facts.nearby) return witnesses;
     for (const AccessPoint& each : *facts.nearby) {
-        if (!each.says.country || each.address == judged.address) continue;
+        if (!each.says.country || each.directOnly || each.address == judged.address) continue;
         if (!each.signal || *each.signal < kWeakestCountrySignal) continue;
         std::set<MacAddress>& addresses = witnesses[*each.says.country];
         // One device is one witness, whatever number of bands and names it has.

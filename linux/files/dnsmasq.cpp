@@ -31,10 +31,20 @@ std::vector<std::string> partsOf(const std::string& list) {
 }
 
 /// "ADDRESS", "ADDRESS#PORT@INTERFACE", or with "/#/" before it; one for some names only counts for nothing.
-void addServer(std::string value, std::vector<IPAddress>& servers) {
+void addServer(std::string value, DnsmasqSettings& into) {
     if (value.starts_with("/#/")) value.erase(0, 3);
-    if (const auto address = IPAddress::fromText(value.substr(0, value.find_first_of("#@"))))
-        servers.push_back(*address);
+    const std::size_t end = std::min(value.find_first_of("#@"), value.size());
+    const auto address = IPAddress::fromText(value.substr(0, end));
+    if (!address) return;
+    into.servers.push_back(*address);
+    const std::string how = value.substr(end);
+    if (!how.empty() && how != "#53") into.special.push_back(*address);
+}
+
+/// A file may name itself, and others that name it.
+void addFile(const std::string& file, DnsmasqSettings& into) {
+    const bool isKnown = std::ranges::find(into.files, file) != into.files.end();
+    if (!isKnown && into.files.size() < kMostFiles) into.files.push_back(file);
 }
 
 void listenAt(const std::string& addresses, DnsmasqSettings& into) {
@@ -51,9 +61,8 @@ bool answersHere(const DnsmasqSettings& settings) {
 void set(const std::string& name, const std::string& value, DnsmasqSettings& into) {
     if (name == "resolv-file") into.resolverFiles.push_back(value);
     if (name == "no-resolv") into.readsResolverFiles = false;
-    if (name == "server") addServer(value, into.servers);
-    if ((name == "conf-file" || name == "servers-file") && into.files.size() < kMostFiles)
-        into.files.push_back(value);
+    if (name == "server") addServer(value, into);
+    if (name == "conf-file" || name == "servers-file") addFile(value, into);
     if (name == "conf-dir" && into.folders.size() < kMostFiles) into.folders.push_back(value);
     if (name == "enable-dbus") into.heedsBus = true;
     if (name == "port" && value == "0") into.answersAtAll = false;
@@ -101,8 +110,7 @@ DnsmasqSettings settingsOf(const std::vector<std::string>& command, const std::s
     std::size_t file = 0, folder = 0;
     while (file < settings.files.size() || folder < settings.folders.size()) {
         if (folder < settings.folders.size()) {
-            for (std::string& each : filesOf(settings.folders[folder++], root))
-                if (settings.files.size() < kMostFiles) settings.files.push_back(std::move(each));
+            for (const std::string& each : filesOf(settings.folders[folder++], root)) addFile(each, settings);
             continue;
         }
         if (const auto text = readSmallFile(root + settings.files[file++])) readDnsmasqFile(*text, settings);
@@ -112,6 +120,9 @@ DnsmasqSettings settingsOf(const std::vector<std::string>& command, const std::s
 
 DnsmasqServers serversOf(const DnsmasqSettings& settings, const std::string& root) {
     DnsmasqServers servers{settings.servers, settings.servers, settings.heedsBus};
+    std::erase_if(servers.asked, [&](const IPAddress& each) {
+        return std::ranges::find(settings.special, each) != settings.special.end();
+    });
     if (!settings.readsResolverFiles) return servers;
     auto files = settings.resolverFiles;
     if (files.empty()) files.emplace_back("/etc/resolv.conf");
@@ -165,10 +176,10 @@ std::optional<DnsmasqServers> dnsmasqServers(const std::string& root) {
     for (const auto& command : commands) {
         const DnsmasqSettings settings = settingsOf(command, root);
         DnsmasqServers servers = serversOf(settings, root);
-        if (answersHere(settings) && (servers.heedsBus || !servers.asked.empty()))
-            all.push_back(std::move(servers));
+        const bool isToldServers = !servers.asked.empty() || !servers.entered.empty();
+        if (answersHere(settings) && (servers.heedsBus || isToldServers)) all.push_back(std::move(servers));
     }
-    if (all.size() != 1 || all[0].asked.empty()) return std::nullopt;
+    if (all.size() != 1 || (all[0].asked.empty() && all[0].entered.empty())) return std::nullopt;
     return all[0];
 }
 

@@ -12,6 +12,7 @@ namespace wp {
 /// What dnsmasq is told, by its command line and its files, of whom it asks for names.
 struct DnsmasqSettings {
     std::vector<IPAddress> servers;  ///< entered by a person, for all names
+    std::vector<IPAddress> special;  ///< of them those that it asks at another port, or over one interface alone
     std::vector<std::string> resolverFiles;
     bool readsResolverFiles = true;
     bool answersAtAll = true;          ///< and not on other interfaces than loopback alone
@@ -29,8 +30,8 @@ void readDnsmasqCommand(const std::vector<std::string>& words, DnsmasqSettings& 
 
 /// Whom the device's own dnsmasq asks.
 struct DnsmasqServers {
-    std::vector<IPAddress> asked;
-    std::vector<IPAddress> entered;  ///< those of them that stand in its settings
+    std::vector<IPAddress> asked;    ///< as everybody can ask them
+    std::vector<IPAddress> entered;  ///< those that stand in its settings
     bool heedsBus = false;           ///< there may be more
 };
 

@@ -45,13 +45,21 @@ TEST_F(DnsmasqOf, ADeviceAsksWhomTheResolversFileNamesBesideItself) {
 TEST_F(DnsmasqOf, ADeviceAsksWhomItsSettingsName) {
     write("/etc/resolv.conf", "nameserver 127.0.0.1\n");
     write("/etc/dnsmasq.conf",
-          "no-resolv\nserver=9.9.9.9#53\nserver=/home.example/10.0.0.1\nserver=2620:fe::9@eth0\n"
+          "no-resolv\nserver=9.9.9.9#53\nserver=/home.example/10.0.0.1\nserver=2620:fe::9\n"
           "server=/#/149.112.112.112\nserver=\nconf-dir=/etc/dnsmasq.d/,*.conf\n");
     write("/etc/dnsmasq.d/more.conf", "server=1.1.1.1\nconf-file=/etc/dnsmasq.conf\n");
     write("/etc/dnsmasq.d/README", "server=10.9.9.9\n");
     runs(12, {"dnsmasq", "-k"});
     const std::string all = "9.9.9.9 2620:fe::9 149.112.112.112 1.1.1.1 ";
-    EXPECT_EQ(found().substr(0, all.size()), all);
+    EXPECT_EQ(found(), all + "| " + all);
+}
+
+TEST_F(DnsmasqOf, ADeviceAloneAsksAServerAtAnotherPortOrOverOneInterface) {
+    write("/etc/dnsmasq.conf", "no-resolv\nserver=10.8.0.1@tun0\nserver=192.168.1.2#5335\n");
+    runs(12, {"dnsmasq"});
+    EXPECT_EQ(found(), "| 10.8.0.1 192.168.1.2 ");
+    runs(12, {"dnsmasq", "-S", "1.1.1.1", "-C", "/etc/dnsmasq.conf"});
+    EXPECT_EQ(found(), "1.1.1.1 | 1.1.1.1 10.8.0.1 192.168.1.2 ");
 }
 
 TEST_F(DnsmasqOf, ADeviceIsToldByItsCommandLineToo) {

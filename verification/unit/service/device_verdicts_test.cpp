@@ -68,6 +68,8 @@ TEST(AddressConfiguration, AnAddressThatStandsInAFileWasEnteredThere) {
     EXPECT_EQ(*methodFromIPv4Addresses({four}, false, plan), "manual");
     EXPECT_EQ(*methodFromIPv4Addresses({four}, true, plan), "manual") << "a client runs beside it";
     EXPECT_EQ(*methodFromIPv4Addresses({granted}, false, plan), "dynamic") << "the file is not in force";
+    const AssignedAddress lent{address("10.0.0.7"), false, false};
+    EXPECT_EQ(*methodFromIPv4Addresses({lent}, true, plan), "dynamic") << "the same address by a lease";
     EXPECT_EQ(*methodFromIPv6Addresses({six}, {.setByClient = true}, plan), "manual");
 }
 

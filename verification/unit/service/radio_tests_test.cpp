@@ -60,6 +60,9 @@ TEST(RadioTests, WantTwoStrongWitnessesOfAnotherCountry) {
     EXPECT_FALSE(verdict({home, one, faint}));
     EXPECT_FALSE(verdict({home, one, letters}));
     EXPECT_TRUE(verdict({home, one, two}));
+    AccessPoint node = two;
+    node.directOnly = true;
+    EXPECT_FALSE(verdict({home, one, node})) << "no access point";
 }
 
 TEST(RadioTests, TakeADevicesBandsAndNamesForOneWitnessOfACountry) {
