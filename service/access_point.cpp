@@ -109,15 +109,12 @@ std::string textOf(const MacAddress& address) {
     return text;
 }
 
-bool areOfOneDevice(const MacAddress& one, const MacAddress& other) {
+bool shareRadio(const AccessPoint& one, const AccessPoint& other) {
     // Multiple BSSID sets of an access point have at most 16 addresses in use.
     constexpr int kMostApart = 15;
-    return std::equal(one.begin() + 1, one.end() - 1, other.begin() + 1) &&
-           std::abs(one.back() - other.back()) <= kMostApart;
-}
-
-bool shareRadio(const AccessPoint& one, const AccessPoint& other) {
-    return one.frequency == other.frequency && areOfOneDevice(one.address, other.address);
+    return one.frequency == other.frequency &&
+           std::equal(one.address.begin() + 1, one.address.end() - 1, other.address.begin() + 1) &&
+           std::abs(one.address.back() - other.address.back()) <= kMostApart;
 }
 
 Advertised decodeAdvertised(std::uint16_t capability, Bytes latest, std::optional<Bytes> beacon) {

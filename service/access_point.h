@@ -17,9 +17,6 @@ using CountryCode = std::array<char, 2>;
 
 /// "02:00:00:00:00:01". *Any* thread.
 std::string textOf(const MacAddress& address);
-/// Whether the addresses are most likely of one device, which has one for each band and name: makers count up
-/// the last byte or change bits of the first one. *Any* thread.
-bool areOfOneDevice(const MacAddress& one, const MacAddress& other);
 
 /// What an access point's elements say, in the tests' terms.
 struct Advertised {
@@ -62,7 +59,8 @@ struct AccessPoint {
     Band band() const { return bandOf(frequency); }
 };
 
-/// Whether the two are names that one radio of a device works under. *Any* thread.
+/// Whether the two are most likely names that one radio works under: makers count up the last byte of its address or
+/// change bits of the first one. *Any* thread.
 bool shareRadio(const AccessPoint& one, const AccessPoint& other);
 
 /// Reads the elements of the latest frame, as far as the kernel tells, and of a beacon, where one was heard. They complete

@@ -24,22 +24,14 @@ bool overlaps(const AccessPoint& accessPoint, const Span& wanted) {
                        [&](const Span& span) { return span.low < wanted.high && wanted.low < span.high; });
 }
 
-/// Of each radio that overlaps the 20 MHz around the frequency, the name that is heard best.
-std::vector<const AccessPoint*> overlappingRadios(std::uint32_t frequency,
-                                                  const std::vector<AccessPoint>& nearby,
-                                                  const AccessPoint* own) {
+/// The others that overlap the 20 MHz around the frequency.
+std::vector<const AccessPoint*> overlapping(std::uint32_t frequency, const std::vector<AccessPoint>& nearby,
+                                            const AccessPoint* own) {
     const Span wanted{frequency - 10, frequency + 10};
-    std::vector<const AccessPoint*> radios;
-    for (const AccessPoint& each : nearby) {
-        if (!each.signal || isOf(own, each) || !overlaps(each, wanted)) continue;
-        const auto same = std::find_if(radios.begin(), radios.end(),
-                                       [&](const AccessPoint* radio) { return shareRadio(*radio, each); });
-        if (same == radios.end())
-            radios.push_back(&each);
-        else if (each.signal > (*same)->signal)
-            *same = &each;
-    }
-    return radios;
+    std::vector<const AccessPoint*> found;
+    for (const AccessPoint& each : nearby)
+        if (each.signal && !isOf(own, each) && overlaps(each, wanted)) found.push_back(&each);
+    return found;
 }
 
 bool ranBackwards(const ChannelTime& before, const ChannelTime& after) {
@@ -76,13 +68,13 @@ std::optional<double> foreignLoad(const ChannelTime& channel) {
 double overlapWeight(std::uint32_t frequency, const std::vector<AccessPoint>& nearby,
                      const AccessPoint* own) {
     double sum = 0;
-    for (const AccessPoint* each : overlappingRadios(frequency, nearby, own)) sum += weight(*each->signal);
+    for (const AccessPoint* each : overlapping(frequency, nearby, own)) sum += weight(*each->signal);
     return sum;
 }
 
 std::size_t strongOverlaps(std::uint32_t frequency, const std::vector<AccessPoint>& nearby,
                            const AccessPoint* own) {
-    const auto radios = overlappingRadios(frequency, nearby, own);
+    const auto radios = overlapping(frequency, nearby, own);
     return static_cast<std::size_t>(std::count_if(
         radios.begin(), radios.end(), [](const AccessPoint* each) { return *each->signal >= kDecodedWell; }));
 }

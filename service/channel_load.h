@@ -36,10 +36,10 @@ Airtime airtimeBetween(const Airtime& before, const Airtime& after);
 /// it, or was there for less than 20 ms, which is no more than a few frames. *Any* thread.
 std::optional<double> foreignLoad(const ChannelTime& channel);
 
-/// How much the access points weigh on the 20 MHz around the frequency: each radio that overlaps counts 1 where
-/// its frames are decoded well (-67 dBm and more), one half down to -82 dBm, at which 20 MHz receivers stop
-/// deferring to it (802.11, 17.3.10.6), and nothing below. A radio counts once, whatever number of names it
-/// works under. \param own its radio is left out, other names and all: it does not compete with itself.
+/// How much the access points weigh on the 20 MHz around the frequency: each that overlaps counts 1 where its frames are
+/// decoded well (-67 dBm and more), one half down to -82 dBm, at which 20 MHz receivers stop deferring to it (802.11,
+/// 17.3.10.6), and nothing below. Each name of a radio counts, as it has beacons of its own.
+/// \param own its radio is left out, other names and all: it does not compete with itself.
 double overlapWeight(std::uint32_t frequency, const std::vector<AccessPoint>& nearby, const AccessPoint* own);
 /// How many of them are decoded well there.
 std::size_t strongOverlaps(std::uint32_t frequency, const std::vector<AccessPoint>& nearby,

@@ -87,10 +87,7 @@ std::map<CountryCode, std::set<MacAddress>> countryWitnesses(const Facts& facts,
     for (const AccessPoint& each : *facts.nearby) {
         if (!each.says.country || each.directOnly || each.address == judged.address) continue;
         if (!each.signal || *each.signal < kWeakestCountrySignal) continue;
-        std::set<MacAddress>& addresses = witnesses[*each.says.country];
-        // One device is one witness, whatever number of bands and names it has.
-        const auto isSame = [&](const MacAddress& other) { return areOfOneDevice(each.address, other); };
-        if (std::ranges::none_of(addresses, isSame)) addresses.insert(each.address);
+        witnesses[*each.says.country].insert(each.address);
     }
     return witnesses;
 }

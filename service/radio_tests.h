@@ -11,8 +11,8 @@ namespace wp {
 
 // The verdicts on modes, rates, channels and signal. All are pure functions; *any* thread.
 
-/// Which access points, by address, say which country; the judged one whatever its strength. Of a device with
-/// several addresses one counts. None where nothing was heard.
+/// Which access points, by address, say which country; the judged one whatever its strength. None where nothing
+/// was heard.
 std::map<CountryCode, std::set<MacAddress>> countryWitnesses(const Facts& facts, const AccessPoint& judged);
 /// The signal in dBm. That of the joined link swings: the middle of several samples counts.
 Known<int> signalOf(const Facts& facts, const AccessPoint& judged);

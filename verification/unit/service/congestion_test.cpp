@@ -85,7 +85,7 @@ TEST(ChannelLoad, NearOnesWeighFullFarOnesHalfOrNothing) {
     EXPECT_DOUBLE_EQ(overlapWeight(2412, nearby, &nearby[0]), 1.0);
 }
 
-TEST(ChannelLoad, ARadioCountsOnceWhateverItsNames) {
+TEST(ChannelLoad, TheOwnRadioDoesNotCompeteWithItselfUnderItsOtherNames) {
     const AccessPoint home = at(2412, -40);
     AccessPoint guests = at(2412, -42), elsewhere = at(2437, -40), stranger = at(2412, -60);
     guests.address = elsewhere.address = home.address;
@@ -94,16 +94,15 @@ TEST(ChannelLoad, ARadioCountsOnceWhateverItsNames) {
     AccessPoint strangersGuests = at(2412, -70);
     strangersGuests.address = stranger.address;
     strangersGuests.address.front() |= 4;
-    AccessPoint neighbour = at(2412, -60);
-    neighbour.address = stranger.address;
+    AccessPoint neighbour = home;
     neighbour.address.back() += 16;
 
     const std::vector<AccessPoint> nearby = {home, guests, elsewhere, strangersGuests, stranger};
-    EXPECT_DOUBLE_EQ(overlapWeight(2412, nearby, &home), 1.0);
-    EXPECT_DOUBLE_EQ(overlapWeight(2412, nearby, nullptr), 2.0);
-    EXPECT_EQ(strongOverlaps(2412, nearby, nullptr), 2U);
-    EXPECT_DOUBLE_EQ(overlapWeight(2437, nearby, &home), 1.0);
-    EXPECT_DOUBLE_EQ(overlapWeight(2412, {stranger, neighbour}, nullptr), 2.0);
+    EXPECT_DOUBLE_EQ(overlapWeight(2412, nearby, &home), 1.5);
+    EXPECT_DOUBLE_EQ(overlapWeight(2412, nearby, nullptr), 3.5);
+    EXPECT_EQ(strongOverlaps(2412, nearby, nullptr), 3U);
+    EXPECT_DOUBLE_EQ(overlapWeight(2437, nearby, &home), 1.0) << "another radio of the same device";
+    EXPECT_DOUBLE_EQ(overlapWeight(2412, {home, neighbour}, &home), 1.0);
 }
 
 TEST(ChannelLoad, TheOwnAccessPointIsLeftOutWhereItHasChangedItsChannelMeanwhile) {

@@ -65,19 +65,6 @@ TEST(RadioTests, WantTwoStrongWitnessesOfAnotherCountry) {
     EXPECT_FALSE(verdict({home, one, node})) << "no access point";
 }
 
-TEST(RadioTests, TakeADevicesBandsAndNamesForOneWitnessOfACountry) {
-    const AccessPoint home = heard(kName + country("US"));
-    const AccessPoint one = heard(nameElement("A") + country("DE"), 2412, -60);
-    AccessPoint otherBand = heard(nameElement("A") + country("DE"), 5180, -60), guests = otherBand;
-    otherBand.address = guests.address = one.address;
-    otherBand.address.back() += 4;
-    guests.address.front() |= 2;
-    Facts facts = joinedTo({home, one, otherBand, guests});
-    facts.regulation = Regulation{"US"};
-
-    EXPECT_FALSE(resultOf(28, facts));
-}
-
 TEST(RadioTests, TakeCodesOfNoCountryForNone) {
     const auto verdict = [](const Frame& element) {
         Facts facts = joinedTo({heard(kName + element)});
