@@ -144,8 +144,8 @@ void Session::handleTest(const WireRequest& request) {
 std::shared_ptr<Phase> Session::phaseFor(PhaseTopic topic) {
     const bool isAhead = topic.subject == Subject::device && toldOfNetwork_;
     if (isAhead) topic.subject = Subject::network;
-    // A scan for the list may come in between.
-    if (isAhead && ahead_ && ahead_->topic() == topic) return phase_ = ahead_;
+    // A scan for the list may have come in between.
+    if (ahead_ && ahead_->topic() == topic) return phase_ = ahead_;
     if (!phase_ || phase_->topic() != topic || topic.subject == Subject::scan) {
         phase_ = begun(topic);
         if (isAhead) ahead_ = phase_;
