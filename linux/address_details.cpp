@@ -3,8 +3,6 @@
 #include <linux/if_addr.h>
 #include <linux/rtnetlink.h>
 
-#include <algorithm>
-
 #include "linux/route_dump.h"
 #include "linux/route_messages.h"
 
@@ -54,8 +52,7 @@ std::vector<AssignedAddress> assignedOf(const std::vector<AddressDetails>& detai
     for (const AddressDetails& each : details) {
         const bool isClients = byClient && !each.assigned.address.isIPv4() && !each.bringsRoute;
         assigned.push_back(each.assigned);
-        assigned.back().byItself |=
-            isClients || std::ranges::find(granted, each.assigned.address) != granted.end();
+        assigned.back().byItself |= isClients || contains(granted, each.assigned.address);
     }
     return assigned;
 }

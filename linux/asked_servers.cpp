@@ -53,13 +53,7 @@ AskedServers behindResolver(Known<Bus>& bus, const Link& link, const Servers& na
 
 void add(Servers& servers, const Servers& more) {
     for (const IPAddress& each : more)
-        if (std::ranges::find(servers, each) == servers.end()) servers.push_back(each);
-}
-
-Servers without(Servers servers, const Servers& others) {
-    std::erase_if(servers,
-                  [&](const IPAddress& each) { return std::ranges::find(others, each) != others.end(); });
-    return servers;
+        if (!contains(servers, each)) servers.push_back(each);
 }
 
 AskedServers askedServers(Known<Bus>& bus, const Link& link, const Servers& ofManager, const Until& until) {

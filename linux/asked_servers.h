@@ -10,8 +10,6 @@ using Servers = std::vector<IPAddress>;
 
 /// Adds those that are not there yet. *Any* thread.
 void add(Servers& servers, const Servers& more);
-/// The servers but for the others. *Any* thread.
-Servers without(Servers servers, const Servers& others);
 
 /// The name servers that are asked.
 struct AskedServers {
@@ -21,8 +19,8 @@ struct AskedServers {
 };
 
 /// Those of the resolver's file; in place of a resolver on the device (systemd-resolved, dnsmasq), and of the file that
-/// systemd-resolved keeps of all links' servers, those that it asks for the link. Where it does not tell, or asks them as nobody
-/// else could, its own address stays. *Any* thread; blocks while the bus is asked.
+/// systemd-resolved keeps of all links' servers, those that it asks for the link. Where it does not tell, or asks them as
+/// nobody else could, its own address stays. *Any* thread; blocks while the bus is asked.
 /// \param ofManager what the interface's manager hands to a resolver that cannot be asked
 AskedServers askedServers(Known<Bus>& bus, const Link& link, const Servers& ofManager, const Until& until);
 

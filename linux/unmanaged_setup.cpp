@@ -1,6 +1,5 @@
 #include "linux/unmanaged_setup.h"
 
-#include <algorithm>
 #include <cstdlib>
 #include <ctime>
 
@@ -45,10 +44,6 @@ ClientLeases readClientLeases(const Link& link, const std::vector<AddressDetails
     if (!kept.ipv4) kept.ipv4 = findLease(link.interfaceName, addresses, now);
     if (!kept.ipv6) kept.ipv6 = findLease6(link.interfaceName, addresses, now);
     return {std::move(kept.ipv4), std::move(kept.ipv6)};
-}
-
-bool contains(const Servers& servers, const IPAddress& server) {
-    return std::ranges::find(servers, server) != servers.end();
 }
 
 /// All that tells how the interface was set up.

@@ -9,10 +9,6 @@ bool isOneOf(const std::string& method, std::initializer_list<std::string_view> 
     return std::find(methods.begin(), methods.end(), method) != methods.end();
 }
 
-bool contains(const std::vector<IPAddress>& list, const IPAddress& address) {
-    return std::find(list.begin(), list.end(), address) != list.end();
-}
-
 }  // namespace
 
 bool isAssigned(const FamilyPlan& plan, const std::vector<AssignedAddress>& addresses) {

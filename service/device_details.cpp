@@ -7,10 +7,6 @@
 namespace wp {
 namespace {
 
-bool contains(const std::vector<IPAddress>& list, const IPAddress& address) {
-    return std::ranges::find(list, address) != list.end();
-}
-
 Details bluetoothDetails(const Facts& facts) {
     if (!facts.bluetooth) return {};
     return {{"controllers", facts.bluetooth->controllers}, {"powered", facts.bluetooth->powered}};

@@ -186,4 +186,13 @@ bool IPAddress::sharesPrefix(const IPAddress& other, unsigned length) const {
     return true;
 }
 
+bool contains(const std::vector<IPAddress>& list, const IPAddress& address) {
+    return std::find(list.begin(), list.end(), address) != list.end();
+}
+
+std::vector<IPAddress> without(std::vector<IPAddress> list, const std::vector<IPAddress>& others) {
+    std::erase_if(list, [&](const IPAddress& each) { return contains(others, each); });
+    return list;
+}
+
 }  // namespace wp

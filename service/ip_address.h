@@ -5,6 +5,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 #include "service/bytes.h"
 
@@ -48,5 +49,10 @@ class IPAddress {
     std::array<std::uint8_t, 16> bytes_{};
     std::uint8_t size_ = 4;
 };
+
+/// Whether the address is among these. *Any* thread.
+bool contains(const std::vector<IPAddress>& list, const IPAddress& address);
+/// The list but for the others, in its order. *Any* thread.
+std::vector<IPAddress> without(std::vector<IPAddress> list, const std::vector<IPAddress>& others);
 
 }  // namespace wp

@@ -1,7 +1,5 @@
 #include "linux/dbus/connman.h"
 
-#include <algorithm>
-
 namespace wp {
 namespace {
 
@@ -30,10 +28,6 @@ std::vector<IPAddress> serversIn(const BusValue& list) {
     for (const BusValue& each : list.list())
         if (const auto address = IPAddress::fromText(each.text())) servers.push_back(*address);
     return servers;
-}
-
-bool contains(const std::vector<IPAddress>& servers, const IPAddress& server) {
-    return std::ranges::find(servers, server) != servers.end();
 }
 
 ConnmanLink linkOf(const BusValue& properties) {
@@ -69,8 +63,7 @@ std::optional<ConnmanLink> connmanLinkIn(const BusValue& services, const std::st
         }
     }
     if (!link) return link;
-    std::erase_if(elsewhere, [&](const IPAddress& each) { return contains(link->servers, each); });
-    link->serversElsewhere = std::move(elsewhere);
+    link->serversElsewhere = without(std::move(elsewhere), link->servers);
     return link;
 }
 

@@ -119,10 +119,7 @@ DnsmasqSettings settingsOf(const std::vector<std::string>& command, const std::s
 }
 
 DnsmasqServers serversOf(const DnsmasqSettings& settings, const std::string& root) {
-    DnsmasqServers servers{settings.servers, settings.servers, settings.heedsBus};
-    std::erase_if(servers.asked, [&](const IPAddress& each) {
-        return std::ranges::find(settings.special, each) != settings.special.end();
-    });
+    DnsmasqServers servers{without(settings.servers, settings.special), settings.servers, settings.heedsBus};
     if (!settings.readsResolverFiles) return servers;
     auto files = settings.resolverFiles;
     if (files.empty()) files.emplace_back("/etc/resolv.conf");

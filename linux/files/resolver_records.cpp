@@ -17,10 +17,6 @@ bool isOneOf(const std::string& word, std::initializer_list<const char*> words) 
     return std::ranges::find(words, word) != words.end();
 }
 
-bool contains(const Servers& servers, const IPAddress& server) {
-    return std::ranges::find(servers, server) != servers.end();
-}
-
 bool isInterface(const std::string& name, const std::string& root) {
     std::error_code failed;
     return std::filesystem::exists(root + "/sys/class/net/" + name, failed);

@@ -18,10 +18,10 @@ struct NameServerSet {
 };
 
 /// Asks for the name's addresses of both families at once, each server 2 s, twice. Addresses by which the interface does
-/// not lead out end no wait for others; IPv6 alone does not for a second, since it often leads nowhere. No cache and no hosts file of
-/// this device is looked into. What the servers say, and that none of them answers, are both answers; that there
-/// is none to be asked too. An error is only that the lookup was stopped, or could not begin, above all because it may
-/// not go over the interface. *Any* thread.
+/// not lead out end no wait for others; IPv6 alone does not for a second, since it often leads nowhere. No cache and no
+/// hosts file of this device is looked into. What the servers say, and that none of them answers, are both answers; that
+/// there is none to be asked too. An error is only that the lookup was stopped, or could not begin, above all because it
+/// may not go over the interface. *Any* thread.
 Known<NameAnswer> lookUpName(const std::string& name, const NameServerSet& whom, const Until& until);
 
 enum class RecordType : int { a = 1, aaaa = 28 };
