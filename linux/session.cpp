@@ -57,6 +57,11 @@ bool isSameConnection(const Known<Link>& before, const Known<Link>& now) {
            before->joined->address == now->joined->address;
 }
 
+/// It is the one reason of this kind that a link has.
+bool asksNotToBeLookedAt(const Known<Link>& link) {
+    return !link && link.error().code == static_cast<int>(Reason::badConfiguration);
+}
+
 /// The reason of whoever was asked first, with the other's.
 Error refusedBoth(Error denied, const Error& byManager) {
     denied.message += ", and " + byManager.message;
@@ -182,10 +187,24 @@ void Session::release(const std::shared_ptr<Phase>& phase, const Known<Link>& li
     answerReadyTests();
 }
 
+/// That the network asks not to be looked at is no answer about the device itself, whose phase then is one of its own.
+bool Session::becomesReady(WaitingTest& waiting) {
+    if (waiting.isHeld || !waiting.phase->isReady(*waiting.test)) return false;
+    PhaseTopic topic = waiting.phase->topic();
+    if (waiting.test->subject != Subject::device || !topic.isJoined() ||
+        !asksNotToBeLookedAt(waiting.phase->facts().link))
+        return true;
+    topic.subject = Subject::device;
+    toldOfNetwork_ = false;
+    ahead_.reset();
+    waiting.phase = phaseFor(topic);
+    return waiting.phase->isReady(*waiting.test);
+}
+
 void Session::answerReadyTests() {
     for (auto each = waiting_.begin(); each != waiting_.end();) {
-        const auto* const waiting = std::get_if<WaitingTest>(&each->second);
-        if (waiting == nullptr || waiting->isHeld || !waiting->phase->isReady(*waiting->test)) {
+        auto* const waiting = std::get_if<WaitingTest>(&each->second);
+        if (waiting == nullptr || !becomesReady(*waiting)) {
             ++each;
             continue;
         }

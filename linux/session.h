@@ -50,6 +50,7 @@ class Session {
     std::shared_ptr<Phase> begun(const PhaseTopic& topic);
     void lookAgain(const std::shared_ptr<Phase>& phase);
     void release(const std::shared_ptr<Phase>& phase, const Known<Link>& link);
+    bool becomesReady(WaitingTest& waiting);
     void answerReadyTests();
     void answerTest(std::uint64_t id, const DiagnosticsTestResponse& response);
     void answerCancelled(std::uint64_t id, const Waiting& waiting);
