@@ -7,7 +7,6 @@
 #include "exchange/answer_book.h"
 #include "exchange/fresh_copy.h"
 #include "exchange/request_list.h"
-#include "exchange/whole_file.h"
 
 namespace wp {
 namespace {
@@ -301,10 +300,6 @@ void Recorder::setAutomation(bool isEnabled) {
 
 Recording Recorder::recording() const {
     return tape_->recording();
-}
-
-std::optional<Refusal> saveRecording(const Recording& recording, const std::string& path) {
-    return writeWholeFile(path, recordingText(recording), 0600);
 }
 
 }  // namespace wp

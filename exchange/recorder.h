@@ -51,8 +51,4 @@ class Recorder {
     std::unique_ptr<Capabilities> capabilities_;
 };
 
-/// Writes the recording to a file, whole or not at all, readable by its owner alone: it holds neighbours'
-/// names. Returns why it could not be done; nothing when it was. *Any* thread.
-std::optional<Refusal> saveRecording(const Recording& recording, const std::string& path);
-
 }  // namespace wp

@@ -1,9 +1,7 @@
 #include "exchange/recorder.h"
 
 #include <gtest/gtest.h>
-#include <sys/stat.h>
 
-#include <filesystem>
 #include <future>
 
 #include "exchange/replay.h"
@@ -235,20 +233,6 @@ TEST(Recorder, LeavesOutAFulfilledWishAlsoBehindAChangeFromOutside) {
     ASSERT_EQ(recording.events.size(), 1U);
     EXPECT_FALSE(recording.events[0].power);
     EXPECT_EQ(recording.wifi.setPower, WiFiDescription::SetPower::works);
-}
-
-TEST(Recorder, SavesForItsOwnerAlone) {
-    std::string path = testing::TempDir() + "recorder_test_" + std::to_string(::getpid()) + ".json";
-    Recording original = accepted(loadRecording(kFolder + "every_form.json"));
-
-    EXPECT_FALSE(saveRecording(original, path));
-
-    struct stat status {};
-    ASSERT_EQ(::stat(path.c_str(), &status), 0);
-    EXPECT_EQ(status.st_mode & 07777, 0600U);
-    EXPECT_EQ(recordingText(accepted(loadRecording(path))), recordingText(original));
-    std::filesystem::remove(path);
-    EXPECT_TRUE(saveRecording(original, "/nonexistent/recording.json"));
 }
 
 }  // namespace

@@ -1,10 +1,6 @@
 #include "exchange/recording.h"
 
 #include <gtest/gtest.h>
-#include <sys/stat.h>
-
-#include <filesystem>
-#include <fstream>
 
 #include "exchange/whole_file.h"
 #include "platform/records.h"
@@ -157,58 +153,11 @@ TEST(Recording, TakesAScanOfTenThousandNetworks) {
     EXPECT_EQ((*scanResults.as<ArrayPointer>())->back().asRecord<WiFiScanResult>()->ssid, "Network 9999");
 }
 
-class WholeFile : public testing::Test {
-  protected:
-    std::string content(const std::filesystem::path& path) {
-        std::ifstream file(path);
-        return {std::istreambuf_iterator<char>(file), {}};
-    }
-    std::size_t count() const {
-        auto files = std::filesystem::directory_iterator(folder_);
-        return static_cast<std::size_t>(std::distance(begin(files), end(files)));
-    }
-
-    fakes::TemporaryFolder temporary_;
-    const std::filesystem::path folder_ = temporary_.path();
-};
-
-TEST_F(WholeFile, ReplacesAFileAndSetsItsPermissions) {
-    std::filesystem::path path = folder_ / "recording.json";
-    std::ofstream(path) << "older and longer";
-
-    EXPECT_FALSE(writeWholeFile(path, "new", 0600));
-
-    EXPECT_EQ(content(path), "new");
-    struct stat status {};
-    ASSERT_EQ(::stat(path.c_str(), &status), 0);
-    EXPECT_EQ(status.st_mode & 07777, 0600U);
-    EXPECT_EQ(count(), 1U);
-}
-
-TEST_F(WholeFile, FollowsASymbolicLink) {
-    std::ofstream(folder_ / "real") << "old";
-    std::filesystem::create_symlink("real", folder_ / "link");
-
-    EXPECT_FALSE(writeWholeFile(folder_ / "link", "new", 0644));
-
-    EXPECT_TRUE(std::filesystem::is_symlink(folder_ / "link"));
-    EXPECT_EQ(content(folder_ / "real"), "new");
-}
-
-TEST_F(WholeFile, LeavesNothingBehindWhereItCannotWrite) {
-    std::filesystem::create_directory(folder_ / "taken");
-    auto missing = writeWholeFile(folder_ / "missing" / "file", "new", 0600);
-    ASSERT_TRUE(missing);
-    EXPECT_EQ(missing->text(), "cannot be created: No such file or directory");
-    EXPECT_TRUE(writeWholeFile(folder_ / "taken", "new", 0600));
-    EXPECT_EQ(count(), 1U);
-    EXPECT_FALSE(writeWholeFile("/dev/null", "new", 0600));
-}
-
-TEST_F(WholeFile, RefusesToReadBeyondTheLimit) {
-    std::ofstream(folder_ / "big") << std::string(100, 'x');
-    EXPECT_EQ(std::get<Refusal>(readWholeFile(folder_ / "big", 99)).text(), "longer than 99 bytes");
-    EXPECT_EQ(std::get<std::string>(readWholeFile(folder_ / "big", 100)).size(), 100U);
+TEST(WholeFile, RefusesToReadBeyondTheLimit) {
+    const fakes::TemporaryFolder folder;
+    folder.write("big", std::string(100, 'x'));
+    EXPECT_EQ(std::get<Refusal>(readWholeFile(folder / "big", 99)).text(), "longer than 99 bytes");
+    EXPECT_EQ(std::get<std::string>(readWholeFile(folder / "big", 100)).size(), 100U);
 }
 
 }  // namespace
