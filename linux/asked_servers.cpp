@@ -51,11 +51,6 @@ AskedServers behindResolver(Known<Bus>& bus, const Link& link, const Servers& na
 
 }  // namespace
 
-void add(Servers& servers, const Servers& more) {
-    for (const IPAddress& each : more)
-        if (!contains(servers, each)) servers.push_back(each);
-}
-
 AskedServers askedServers(Known<Bus>& bus, const Link& link, const Servers& ofManager, const Until& until) {
     const auto file = readSmallFile("/etc/resolv.conf");
     AskedServers asked{file ? serversFromResolverFile(*file) : Servers(), {}};

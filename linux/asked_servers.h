@@ -8,9 +8,6 @@ namespace wp {
 
 using Servers = std::vector<IPAddress>;
 
-/// Adds those that are not there yet. *Any* thread.
-void add(Servers& servers, const Servers& more);
-
 /// The name servers that are asked.
 struct AskedServers {
     Servers all;

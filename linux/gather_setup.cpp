@@ -10,6 +10,7 @@
 #include "linux/dbus/iwd.h"
 #include "linux/dbus/network_manager.h"
 #include "linux/dbus/supplicant.h"
+#include "linux/files/address_list.h"
 #include "linux/files/networkd.h"
 #include "linux/files/proxy_settings.h"
 #include "linux/probe/portal_api.h"
@@ -19,15 +20,6 @@
 
 namespace wp {
 namespace {
-
-Servers fromWords(const std::string& words) {
-    Servers servers;
-    std::string spaced = words;
-    std::ranges::replace(spaced, ',', ' ');
-    for (const std::string& word : wordsOf(spaced))
-        if (const auto address = IPAddress::fromText(word)) servers.push_back(*address);
-    return servers;
-}
 
 const std::string& optionOf(const std::map<std::string, std::string>& lease, const char* name) {
     static const std::string kNone;
@@ -50,8 +42,8 @@ Known<NameServers> managedNameServers(Known<Bus>& bus, const Link& link, const N
     NameServers names;
     names.manual = manualServers(*managed.settings);
     add(names.manual, *global);
-    names.offered = fromWords(optionOf(managed.lease4, "domain_name_servers"));
-    add(names.offered, fromWords(optionOf(managed.lease6, "dhcp6_name_servers")));
+    names.offered = addressesIn(optionOf(managed.lease4, "domain_name_servers"));
+    add(names.offered, addressesIn(optionOf(managed.lease6, "dhcp6_name_servers")));
     // What stands in the settings of IPv6 and was not entered came with a router's advertisement.
     for (const IPAddress& each : without(managed.servers, names.manual))
         if (!each.isIPv4()) names.offered.push_back(each);

@@ -190,6 +190,11 @@ bool contains(const std::vector<IPAddress>& list, const IPAddress& address) {
     return std::find(list.begin(), list.end(), address) != list.end();
 }
 
+void add(std::vector<IPAddress>& list, const std::vector<IPAddress>& more) {
+    for (const IPAddress& each : more)
+        if (!contains(list, each)) list.push_back(each);
+}
+
 std::vector<IPAddress> without(std::vector<IPAddress> list, const std::vector<IPAddress>& others) {
     std::erase_if(list, [&](const IPAddress& each) { return contains(others, each); });
     return list;

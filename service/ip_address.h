@@ -52,6 +52,8 @@ class IPAddress {
 
 /// Whether the address is among these. *Any* thread.
 bool contains(const std::vector<IPAddress>& list, const IPAddress& address);
+/// Adds those that are not there yet. *Any* thread.
+void add(std::vector<IPAddress>& list, const std::vector<IPAddress>& more);
 /// The list but for the others, in its order. *Any* thread.
 std::vector<IPAddress> without(std::vector<IPAddress> list, const std::vector<IPAddress>& others);
 

@@ -3,9 +3,9 @@
 #include <sys/stat.h>
 
 #include <algorithm>
-#include <filesystem>
 
 #include "linux/files/dhcp_packet.h"
+#include "linux/files/folder.h"
 #include "linux/files/key_value_file.h"
 
 namespace wp {
@@ -13,7 +13,7 @@ namespace {
 
 // Debian's, and the program's own.
 constexpr const char* kFolders[] = {"/var/lib/dhcpcd", "/var/db/dhcpcd"};
-constexpr std::size_t kLongestPacket = 65536, kMostFiles = 10'000;
+constexpr std::size_t kLongestPacket = 65536, kMostLeases = 10'000;
 constexpr std::uint32_t kWithoutEnd = 0xFFFFFFFF;
 
 /// "wlan0.lease" and, for each network, "wlan0-NAME.lease"; those of DHCPv6 end in "6".
@@ -38,9 +38,8 @@ std::optional<KeptLease> leaseIn(const std::string& path, std::optional<GrantedL
     if (!granted) return std::nullopt;
     const std::int64_t grantedAt = about.st_mtim.tv_sec;
     const bool isOver = granted->seconds != kWithoutEnd && grantedAt + std::int64_t{granted->seconds} <= now;
-    const bool isHere = std::ranges::any_of(granted->lease.addresses, [&](const IPAddress& each) {
-        return std::ranges::find(assigned, each) != assigned.end();
-    });
+    const bool isHere = std::ranges::any_of(granted->lease.addresses,
+                                            [&](const IPAddress& each) { return contains(assigned, each); });
     if (isOver || !isHere) return std::nullopt;
     return KeptLease{grantedAt, std::move(granted->lease)};
 }
@@ -60,11 +59,8 @@ DhcpcdLeases findDhcpcdLeases(const std::string& interfaceName, const std::vecto
                               std::int64_t now, const std::string& root) {
     std::optional<KeptLease> ipv4, ipv6;
     for (const char* folder : kFolders) {
-        std::error_code failed;
-        std::size_t count = 0;
-        for (std::filesystem::directory_iterator each(root + folder, failed), end;
-             !failed && each != end && ++count < kMostFiles; each.increment(failed)) {
-            const std::string name = each->path().filename().string(), path = each->path().string();
+        for (const std::string& name : namesIn(root + folder, kMostLeases)) {
+            const std::string path = root + folder + "/" + name;
             if (isLeaseOf(name, interfaceName, ".lease"))
                 keepLater(ipv4, leaseIn(path, readDhcpPacket, assigned, now));
             if (isLeaseOf(name, interfaceName, ".lease6"))

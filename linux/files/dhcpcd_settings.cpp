@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "linux/files/address_list.h"
 #include "linux/files/key_value_file.h"
 
 namespace wp {
@@ -11,12 +12,9 @@ namespace {
 enum class Scope { here, profile, elsewhere };
 
 void addAddresses(std::string_view list, std::vector<IPAddress>& addresses) {
-    std::string spaced(list);
-    std::erase(spaced, '"');
-    std::ranges::replace(spaced, ',', ' ');
-    for (const std::string& word : wordsOf(spaced))
-        if (const auto address = IPAddress::fromText(word.substr(0, word.find('/'))))
-            addresses.push_back(*address);
+    std::string unquoted(list);
+    std::erase(unquoted, '"');
+    add(addresses, addressesIn(unquoted));
 }
 
 void enter(std::string_view address, FamilyPlan& plan) {

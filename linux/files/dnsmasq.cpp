@@ -1,17 +1,16 @@
 #include "linux/files/dnsmasq.h"
 
 #include <algorithm>
-#include <filesystem>
 #include <set>
 
+#include "linux/files/address_list.h"
+#include "linux/files/folder.h"
 #include "linux/files/key_value_file.h"
 #include "linux/files/leases.h"
 #include "linux/files/processes.h"
 
 namespace wp {
 namespace {
-
-constexpr std::size_t kMostFiles = 256;
 
 struct Option {
     char letter;  ///< of the command line
@@ -47,11 +46,6 @@ void addFile(const std::string& file, DnsmasqSettings& into) {
     if (!isKnown && into.files.size() < kMostFiles) into.files.push_back(file);
 }
 
-void listenAt(const std::string& addresses, DnsmasqSettings& into) {
-    for (const std::string& each : partsOf(addresses))
-        if (const auto address = IPAddress::fromText(each)) into.listensAt.push_back(*address);
-}
-
 bool answersHere(const DnsmasqSettings& settings) {
     const auto isHere = [](const IPAddress& each) { return each.loopback() || each.unspecified(); };
     return settings.answersAtAll &&
@@ -66,7 +60,7 @@ void set(const std::string& name, const std::string& value, DnsmasqSettings& int
     if (name == "conf-dir" && into.folders.size() < kMostFiles) into.folders.push_back(value);
     if (name == "enable-dbus") into.heedsBus = true;
     if (name == "port" && value == "0") into.answersAtAll = false;
-    if (name == "listen-address") listenAt(value, into);
+    if (name == "listen-address") add(into.listensAt, addressesIn(value));
     if (name == "except-interface" && std::ranges::count(partsOf(value), "lo") != 0)
         into.answersAtAll = false;
 }
@@ -93,12 +87,8 @@ std::vector<std::string> filesOf(const std::string& folder, const std::string& r
     const std::string path = parts[0];
     parts.erase(parts.begin());
     std::vector<std::string> files;
-    std::error_code failed;
-    for (std::filesystem::directory_iterator each(root + path, failed), end;
-         !failed && each != end && files.size() < kMostFiles; each.increment(failed)) {
-        const std::string name = each->path().filename();
+    for (const std::string& name : namesIn(root + path))
         if (counts(name, parts)) files.push_back(path + "/" + name);
-    }
     return files;
 }
 

@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <filesystem>
 
+#include "linux/files/folder.h"
 #include "linux/files/interfaces_file.h"
 #include "linux/files/key_value_file.h"
 
@@ -14,7 +15,6 @@ namespace {
 constexpr const char* kFile = "/etc/network/interfaces";
 // ifupdown's, busybox's and ifupdown-ng's.
 constexpr const char* kStateFiles[] = {"/run/network/ifstate", "/run/ifstate"};
-constexpr std::size_t kMostFiles = 256;
 
 /// A folder's files count whose names are words; editors and packages leave others there.
 bool isPlainName(const std::string& name) {

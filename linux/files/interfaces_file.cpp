@@ -3,8 +3,8 @@
 #include <fnmatch.h>
 
 #include <algorithm>
-#include <optional>
 
+#include "linux/files/address_list.h"
 #include "linux/files/key_value_file.h"
 
 namespace wp {
@@ -126,17 +126,13 @@ void addStanza(const InterfaceStanza& stanza, FamilyPlan& plan) {
     if (method != "manual") return;
     const auto address = stanza.options.find("address");
     if (address == stanza.options.end()) return;
-    for (const std::string& word : wordsOf(address->second))
-        if (const auto read = IPAddress::fromText(word.substr(0, word.find('/'))))
-            plan.addresses.push_back(*read);
+    add(plan.addresses, addressesIn(address->second));
 }
 
 void addServers(const InterfaceStanza& stanza, std::vector<IPAddress>& servers) {
     for (const char* name : {"dns-nameservers", "dns-nameserver"}) {
         const auto option = stanza.options.find(name);
-        if (option == stanza.options.end()) continue;
-        for (const std::string& word : wordsOf(option->second))
-            if (const auto address = IPAddress::fromText(word)) servers.push_back(*address);
+        if (option != stanza.options.end()) add(servers, addressesIn(option->second));
     }
 }
 

@@ -4,6 +4,7 @@
 #include <array>
 #include <charconv>
 
+#include "linux/files/address_list.h"
 #include "linux/files/key_value_file.h"
 #include "linux/utc_time.h"
 #include "service/plain_text.h"
@@ -44,15 +45,6 @@ bool hasPassed(std::string_view expiry, std::int64_t now) {
     return !over || *over <= now;
 }
 
-void addServers(std::string_view list, std::vector<IPAddress>& servers) {
-    while (!list.empty()) {
-        const std::size_t comma = list.find(',');
-        if (const auto address = IPAddress::fromText(trimmed(list.substr(0, comma))))
-            servers.push_back(*address);
-        list.remove_prefix(comma == list.npos ? list.size() : comma + 1);
-    }
-}
-
 bool contains(const std::vector<IPAddress>& list, const std::optional<IPAddress>& address) {
     return address && std::ranges::find(list, *address) != list.end();
 }
@@ -83,7 +75,7 @@ void readStatement(std::string_view line, Block& block, std::int64_t now) {
     if (const auto address = IPAddress::fromText(value); address && name == "fixed-address")
         block.lease.addresses = {*address};
     if (name == "expire") block.passed = hasPassed(value, now);
-    if (name == "domain-name-servers") addServers(value, block.lease.servers);
+    if (name == "domain-name-servers") block.lease.servers = addressesIn(value);
     if (name == "vendor-encapsulated-options" || name == "vendor-class-identifier")
         block.lease.vendorText += textFrom(value);
     if (name == "default-url" || name == "unknown-114" ||
@@ -130,7 +122,7 @@ void readStatement6(std::string_view line, Block6& block) {
     }
     if (block.depth > 1) return;
     if (name == "interface") block.interfaceName = textFrom(value);
-    if (name == "dhcp6.name-servers") addServers(value, block.lease.servers);
+    if (name == "dhcp6.name-servers") block.lease.servers = addressesIn(value);
     if (name == "dhcp6.v6-captive-portal" || name == "dhcp6.unknown-103")
         block.lease.portalApi = portalUriFrom(withoutQuotes(value));
 }

@@ -1,6 +1,8 @@
 #include <gtest/gtest.h>
 
+#include "linux/files/address_list.h"
 #include "linux/files/dhcp_clients.h"
+#include "linux/files/folder.h"
 #include "linux/files/leases.h"
 #include "linux/files/networkd.h"
 #include "linux/files/proxy_settings.h"
@@ -357,6 +359,21 @@ TEST_F(Root, HasADhcpClientThatLooksAtAdvertisementsItself) {
     write("/proc/13/cmdline", commandOf({"/usr/sbin/dhcpcd", "wlan0"}));
     EXPECT_TRUE(dhcpClientsOf("wlan0", root_).asksRouters);
     EXPECT_FALSE(dhcpClientsOf("wlan1", root_).asksRouters);
+}
+
+TEST_F(Root, FoldersAreReadInTheOrderOfTheirNamesAsFarAsIsAllowed) {
+    for (const char* name : {"b", "a", "c"}) write(std::string("/folder/") + name, "");
+    EXPECT_EQ(namesIn(root_ + "/folder"), (std::vector<std::string>{"a", "b", "c"}));
+    EXPECT_EQ(namesIn(root_ + "/folder", 2).size(), 2U);
+    EXPECT_TRUE(namesIn(root_ + "/none").empty());
+}
+
+TEST(AddressList, IsPartedAtBlanksAndCommasAndHoldsNothingButAddresses) {
+    EXPECT_EQ(textsOf(addressesIn("10.0.0.1, 10.0.0.2,,\t2001:db8::7/64 fe80::1%wlan0\n")),
+              "10.0.0.1 10.0.0.2 2001:db8::7 fe80::1 ");
+    EXPECT_EQ(textsOf(addressesIn("auto 10.0.0 10.0.0.256 10.0.0.1;10.0.0.2 / , 10.0.0.3/")), "10.0.0.3 ");
+    EXPECT_TRUE(addressesIn("").empty());
+    EXPECT_TRUE(addressesIn(" ,").empty());
 }
 
 TEST_F(Root, FilesThatAreTooLongOrNoFilesAreNotRead) {
