@@ -21,41 +21,50 @@ bool isInterface(const std::string& name, const std::string& root) {
     return std::filesystem::exists(root + "/sys/class/net/" + name, failed);
 }
 
+/// Servers by whom they were told of; of the interface itself by who told them, too.
+struct Told {
+    ResolverRecords records;
+    Servers own, others;
+};
+
 /// \param source the part of a record's name behind the interface's: "dhclient", "ip6.dhclient", "inet"
 /// \param isOpen whether openresolv keeps it: there "inet6" may be a lease too, and a DHCP client's has no such part
-void addRecord(const std::string& source, bool isOpen, const Servers& servers, ResolverRecords& records) {
+void addOwn(const std::string& source, bool isOpen, const Servers& servers, Told& told) {
+    ResolverRecords& records = told.records;
     const bool isIPv4 =
         isOneOf(source, {"dhclient", "udhcpc", "dhcpcd", "pump", "dhcp"}) || (isOpen && source.empty());
     if (source == "inet" || (source == "inet6" && !isOpen)) add(records.entered, servers);
     if (isIPv4 || isOneOf(source, {"ra", "dhcp6", "ip6.dhclient", "ip6.dhcpcd", "ip6.udhcpc"}))
         add(records.offered, servers);
     records.offerKnown |= isIPv4;
+    add(told.own, servers);
+}
+
+void readRecords(const std::string& folder, bool isOpen, const std::string& interfaceName,
+                 const std::string& root, Told& told) {
+    for (const std::string& name : namesIn(folder)) {
+        const auto text = readSmallFile(folder + "/" + name);
+        const Servers servers = text ? serversFromResolverFile(*text) : Servers();
+        if (name == interfaceName || name.starts_with(interfaceName + "."))
+            addOwn(name.substr(std::min(name.size(), interfaceName.size() + 1)), isOpen, servers, told);
+        // What is set of the loopback interface is set for the whole device.
+        else if (isOneOf(name, {"lo.inet", "lo.inet6"}))
+            add(told.records.entered, servers);
+        // Other records are those of programs, as of what the file held before.
+        else if (isInterface(name.substr(0, name.find('.')), root))
+            add(told.others, servers);
+    }
 }
 
 }  // namespace
 
 ResolverRecords resolverRecords(const std::string& interfaceName, const std::string& root) {
-    ResolverRecords records;
-    Servers others, own;
-    for (const bool isOpen : {false, true}) {
-        const std::string folder =
-            root + (isOpen ? "/run/resolvconf/interfaces" : "/run/resolvconf/interface");
-        for (const std::string& name : namesIn(folder)) {
-            const auto text = readSmallFile(folder + "/" + name);
-            if (!text) continue;
-            const Servers servers = serversFromResolverFile(*text);
-            const bool isOwn = name == interfaceName || name.starts_with(interfaceName + ".");
-            // Other records are those of programs, as of what the file held before.
-            if (!isOwn && !isInterface(name.substr(0, name.find('.')), root)) continue;
-            add(isOwn ? own : others, servers);
-            if (isOwn)
-                addRecord(name == interfaceName ? "" : name.substr(interfaceName.size() + 1), isOpen, servers,
-                          records);
-        }
-    }
-    for (const IPAddress& each : others)
-        if (!each.loopback() && !contains(own, each)) records.elsewhere.push_back(each);
-    return records;
+    Told told;
+    readRecords(root + "/run/resolvconf/interface", false, interfaceName, root, told);
+    readRecords(root + "/run/resolvconf/interfaces", true, interfaceName, root, told);
+    for (const IPAddress& each : without(without(told.others, told.own), told.records.entered))
+        if (!each.loopback()) told.records.elsewhere.push_back(each);
+    return std::move(told.records);
 }
 
 }  // namespace wp

@@ -11,7 +11,7 @@ namespace wp {
 struct ResolverRecords {
     std::vector<IPAddress>
         offered;  ///< a DHCP client of the interface told them, or a program that hears routers
-    std::vector<IPAddress> entered;    ///< they stand in the settings of the interface
+    std::vector<IPAddress> entered;  ///< they stand in the settings of the interface, or of the whole device
     std::vector<IPAddress> elsewhere;  ///< they were told of another interface, and not of this one
     bool offerKnown = false;           ///< whether a DHCP client of IPv4 is among them
 };

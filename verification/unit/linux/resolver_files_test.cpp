@@ -147,6 +147,16 @@ TEST_F(RecordsOf, OtherInterfacesTellWhichServersAreNotItsOwn) {
     EXPECT_EQ(found(), "192.168.1.1 | | 10.0.0.1 known");
 }
 
+TEST_F(RecordsOf, TheLoopbackInterfaceTellWhatWasSetForTheWholeDevice) {
+    folder_.write("/sys/class/net/lo/mtu", "65536\n");
+    write("interface/lo.inet", "9.9.9.9\nnameserver 192.168.1.1");
+    write("interface/lo.inet6", "2620:fe::9");
+    write("interface/lo.dnsmasq", "127.0.0.1");
+    write("interface/eth0.inet", "9.9.9.9\nnameserver 10.0.0.1");
+    write("interface/wlan0.dhclient", "192.168.1.1");
+    EXPECT_EQ(found(), "192.168.1.1 | 9.9.9.9 192.168.1.1 2620:fe::9 | 10.0.0.1 known");
+}
+
 TEST_F(RecordsOf, OpenresolvAreKeptElsewhereUnderOtherNames) {
     write("interfaces/wlan0", "192.168.1.1");
     write("interfaces/wlan0.inet6", "2001:db8::53");
