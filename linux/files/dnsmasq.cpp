@@ -96,7 +96,7 @@ std::vector<std::string> filesOf(const std::string& folder, const std::string& r
 DnsmasqSettings settingsOf(const std::vector<std::string>& command, const std::string& root) {
     DnsmasqSettings settings;
     readDnsmasqCommand(command, settings);
-    if (settings.files.empty()) settings.files.emplace_back("/etc/dnsmasq.conf");
+    if (settings.readsDefaultFile) addFile("/etc/dnsmasq.conf", settings);
     std::size_t file = 0, folder = 0;
     while (file < settings.files.size() || folder < settings.folders.size()) {
         if (folder < settings.folders.size()) {
@@ -150,6 +150,7 @@ void readDnsmasqCommand(const std::vector<std::string>& words, DnsmasqSettings& 
         else if (option->hasValue && i + 1 < words.size())
             value = words[++i];
         set(option->name, value, into);
+        if (option->letter == 'C') into.readsDefaultFile = false;
     }
 }
 

@@ -19,6 +19,7 @@ struct DnsmasqSettings {
     std::vector<IPAddress> listensAt;  ///< empty: everywhere
     bool heedsBus = false;             ///< somebody may tell it servers over the message bus
     std::vector<std::string> files;    ///< with more settings
+    bool readsDefaultFile = true;      ///< unless the command line names another in its place
     /// The same, with endings that are left out or alone count: "PATH,.old,*.conf".
     std::vector<std::string> folders;
 };

@@ -80,6 +80,18 @@ TEST_F(DnsmasqOf, ADeviceIsToldByItsCommandLineToo) {
     EXPECT_TRUE(dnsmasqServers(folder_.path())->heedsBus);
 }
 
+TEST_F(DnsmasqOf, ADeviceReadsAFileOfServersBesideItsSettings) {
+    write("/etc/dnsmasq.conf", "no-resolv\nserver=1.1.1.1\n");
+    write("/etc/servers", "server=9.9.9.9\n");
+    runs(12, {"dnsmasq", "--servers-file=/etc/servers"});
+    EXPECT_EQ(found(), "9.9.9.9 1.1.1.1 | 9.9.9.9 1.1.1.1 ");
+    runs(12, {"dnsmasq", "--servers-file=/etc/servers", "-R", "--conf-file=/dev/null"});
+    EXPECT_EQ(found(), "9.9.9.9 | 9.9.9.9 ");
+    runs(12, {"dnsmasq"});
+    write("/etc/dnsmasq.conf", "no-resolv\nservers-file=/etc/servers\n");
+    EXPECT_EQ(found(), "9.9.9.9 | 9.9.9.9 ");
+}
+
 TEST_F(DnsmasqOf, ADeviceIsTheOneThatAnswersHere) {
     write("/etc/resolv.conf", "nameserver 192.168.1.1\n");
     runs(12, {"dnsmasq", "--conf-file=/var/lib/libvirt/dnsmasq/default.conf"});
