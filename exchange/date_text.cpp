@@ -92,7 +92,9 @@ std::optional<Date> readISO8601(std::string_view text) {
                             day(static_cast<unsigned>(dayNumber)));
     if (scanner.failed() || !scanner.atEnd() || !calendar.ok()) return std::nullopt;
     auto days = (sys_days(calendar) - sys_days(year(2001) / 1 / 1)).count();
-    return Date{86400.0 * static_cast<double>(days) + seconds + fraction};
+    double whole = 86400.0 * static_cast<double>(days) + seconds;
+    // A fraction finer than the sum holds is cut like any other, it does not become the next second.
+    return Date{std::min(whole + fraction, std::nextafter(whole + 1, whole))};
 }
 
 std::string exactISO8601Text(Date date) {

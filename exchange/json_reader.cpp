@@ -144,7 +144,11 @@ std::variant<Value, Refusal> readJSON(std::string_view text, const JSONLimits& l
         return Refusal{"", "longer than " + std::to_string(limits.bytes) + " bytes"};
     Builder builder(text, limits.depth);
     nlohmann::json::sax_parse(text.begin(), text.end(), &builder);
-    return builder.take();
+    auto outcome = builder.take();
+    // The parser takes a NUL behind the value for the end of the text, whatever follows.
+    std::size_t zero = text.find('\0');
+    if (std::holds_alternative<Refusal>(outcome) || zero == std::string_view::npos) return outcome;
+    return Refusal{linePlace(text, zero), "not valid JSON: a NUL byte behind the value"};
 }
 
 }  // namespace wp

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include "platform/date_formatter.h"
+
 namespace wp {
 namespace {
 
@@ -27,6 +29,13 @@ TEST(DateText, ReadsFractions) {
     EXPECT_EQ(seconds("2001-01-01T00:00:01.25Z"), 1.25);
     EXPECT_EQ(seconds("2001-01-01T00:00:01,5+00:00"), 1.5);
     EXPECT_EQ(seconds("2000-12-31T23:59:59.75Z"), -0.25);
+}
+
+TEST(DateText, KeepsTheSecondOfAFractionFinerThanADouble) {
+    for (std::string second :
+         {"2026-05-01T12:34:56", "2001-01-01T00:00:00", "2000-12-31T23:59:59", "1600-02-29T00:00:00"})
+        for (std::string fraction : {".999999999", ".99999999999999999999"})
+            EXPECT_EQ(iso8601Text(Date{seconds(second + fraction + "Z")}), second + "Z") << fraction;
 }
 
 TEST(DateText, RefusesEveryOtherForm) {

@@ -67,6 +67,15 @@ TEST(JSONReader, SaysLineAndColumnOfWhatIsNoJSON) {
     EXPECT_EQ(refusal("[\"\\ud800\"]").substr(0, 7), "line 1,");
 }
 
+TEST(JSONReader, ReadsOnBehindANulByte) {
+    using namespace std::string_view_literals;
+    EXPECT_EQ(refusal("[1]\n\0"sv), "line 2, column 1: not valid JSON: a NUL byte behind the value");
+    EXPECT_EQ(refusal("[1]\0 [2]"sv), "line 1, column 4: not valid JSON: a NUL byte behind the value");
+    EXPECT_EQ(refusal("[1,\0]"sv).substr(0, 32), "line 1, column 4: not valid JSON");
+    EXPECT_EQ(refusal("[\"\0\"]"sv).substr(0, 32), "line 1, column 3: not valid JSON");
+    EXPECT_EQ(accepted(R"("\u0000")"), Value(std::string(1, '\0')));
+}
+
 TEST(JSONReader, SaysWhereUTF8IsInvalid) {
     EXPECT_EQ(refusal("[\n\"a\xff\"]"), "line 2, column 3: invalid UTF-8");
     EXPECT_EQ(refusal("\"\xed\xa0\x80\""), "line 1, column 3: invalid UTF-8");
