@@ -3,11 +3,15 @@
 #include <fcntl.h>
 #include <sys/stat.h>
 
+#include <algorithm>
+
 #include "exchange/descriptor.h"
 
 namespace wp {
 namespace {
 
+// Files of the kernel tell no size: they are read by so much at a time.
+constexpr std::size_t kPage = 4096;
 constexpr std::string_view kBlanks = " \t\r\n";
 
 std::string unquoted(std::string_view text) {
@@ -22,9 +26,11 @@ std::optional<std::string> readSmallFile(const std::string& path, std::size_t lo
     const Descriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
     struct stat about {};
     if (!file || ::fstat(file.number(), &about) != 0 || !S_ISREG(about.st_mode)) return std::nullopt;
-    std::string content(longest + 1, '\0');
+    const std::size_t step = std::max(kPage, static_cast<std::size_t>(about.st_size) + 1);
+    std::string content;
     std::size_t size = 0;
-    while (size < content.size()) {
+    while (size <= longest) {
+        if (size == content.size()) content.resize(std::min(size + step, longest + 1));
         const ssize_t count = ::read(file.number(), content.data() + size, content.size() - size);
         if (count < 0) return std::nullopt;
         if (count == 0) break;

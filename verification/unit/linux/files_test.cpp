@@ -384,6 +384,14 @@ TEST_F(Root, FilesThatAreTooLongOrNoFilesAreNotRead) {
     EXPECT_FALSE(readSmallFile("/dev/zero"));
 }
 
+TEST(SmallFile, IsReadWholeWhereItTellsNoSize) {
+    const auto mappings = readSmallFile("/proc/self/smaps");
+    ASSERT_TRUE(mappings);
+    EXPECT_GT(mappings->size(), 2 * 4096U);
+    EXPECT_EQ(mappings->back(), '\n');
+    EXPECT_FALSE(readSmallFile("/proc/self/smaps", 4096));
+}
+
 const char* noVariable(const char*) {
     return nullptr;
 }
