@@ -146,6 +146,10 @@ double SettingsTableView::contentHeight() const {
     return sectionTop(numberOfSections()) + contentInset_.bottom;
 }
 
+double SettingsTableView::lowestContentOffset() const {
+    return std::max(0.0, contentHeight() - viewHeight());
+}
+
 Rect SettingsTableView::rectForHeader(int section) const {
     if (section < 0 || section >= numberOfSections()) return {};
     return {0, sectionTop(section), frame().width, sections_[section].headerHeight};
@@ -160,15 +164,17 @@ Rect SettingsTableView::rectForRow(IndexPath indexPath) const {
 
 std::vector<IndexPath> SettingsTableView::indexPathsForVisibleRows() const {
     std::vector<IndexPath> visible;
-    double lowerEdge = contentOffset_ + viewHeight();
+    // Rows may have gone since the last layout.
+    double upperEdge = std::min(contentOffset_, lowestContentOffset());
+    double lowerEdge = upperEdge + viewHeight();
     for (int section = 0; section < numberOfSections(); ++section) {
         double top = rectForHeader(section).bottom();
         double height = sections_[section].rowHeight;
-        int first = std::max(0, static_cast<int>((contentOffset_ - top) / height));
+        int first = std::max(0, static_cast<int>((upperEdge - top) / height));
         for (int row = first; row < numberOfRows(section); ++row) {
             double rowTop = top + row * height;
             if (rowTop >= lowerEdge) break;
-            if (rowTop + height > contentOffset_) visible.push_back({row, section});
+            if (rowTop + height > upperEdge) visible.push_back({row, section});
         }
     }
     return visible;
@@ -180,12 +186,11 @@ void SettingsTableView::scrollToRow(IndexPath indexPath, ScrollPosition /*positi
     Rect row = rectForRow(indexPath);
     // The row above, or the section's title, is seen as well, so that nobody takes the row for the first.
     double top = row.y - kHeaderHeight;
-    double lowest = std::max(0.0, contentHeight() - viewHeight());
     double wanted = contentOffset_;
     if (row.bottom() + contentInset_.bottom > wanted + viewHeight())
         wanted = row.bottom() + contentInset_.bottom - viewHeight();
     if (top < wanted) wanted = top;
-    wanted = std::clamp(wanted, 0.0, lowest);
+    wanted = std::clamp(wanted, 0.0, lowestContentOffset());
     if (wanted == contentOffset_) return;
     contentOffset_ = wanted;
     changed();
@@ -195,8 +200,7 @@ void SettingsTableView::scrollToRow(IndexPath indexPath, ScrollPosition /*positi
 void SettingsTableView::layoutSubviews() {
     loadIfNeeded();
     measureRows();
-    double lowest = std::max(0.0, contentHeight() - viewHeight());
-    contentOffset_ = std::min(contentOffset_, lowest);
+    contentOffset_ = std::min(contentOffset_, lowestContentOffset());
 }
 
 }  // namespace wp::ui

@@ -198,6 +198,7 @@ class SettingsTableView : public View {
     double sectionTop(int section) const;
     double gapAbove(const Section& section) const;
     double viewHeight() const { return frame().height; }
+    double lowestContentOffset() const;
 
     Style style_;
     TableViewDataSource* dataSource_ = nullptr;

@@ -132,6 +132,21 @@ TEST(ListUpdate, KeepsTheFocusOnItsNetwork) {
     EXPECT_EQ(run.list(), " / (CHOOSE_NETWORK) a, b, >n / OTHER / REFRESH");
 }
 
+TEST(ListUpdate, ThatLosesAllOfALongListHandsTheFocusToTheFirstRowLeft) {
+    ListRun run;
+    std::vector<AccessPoint> many;
+    for (char name = 'a'; name <= 'l'; ++name) many.push_back({std::string(1, name), "1"});
+    run.hear(many);
+    run.showList();
+
+    run.choose("REFRESH");
+    run.focus("d");  // the list stays scrolled almost to its end
+    run.hear({});
+    run.device.queues.runReady();
+
+    EXPECT_EQ(run.list(), " / (CHOOSE_NETWORK) / >OTHER / REFRESH");
+}
+
 TEST(ListUpdate, OfNamesThatDifferOnlyInCaseAndChangedPlacesRepairsTheTableOnce) {
     ListRun run;
     run.hear({{"Home", "1"}, {"home", "2"}});
