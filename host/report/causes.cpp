@@ -28,10 +28,19 @@ bool endedWith(const View& view, std::int64_t statusCode) {
 }
 
 /// After a selected network that opted out, a result alone does not tell whether one was joined.
-bool isNotJoined(const View& view) {
+bool hasNoJoined(const View& view) {
     std::int64_t code = view.evidence.statusCode;
     bool isTold = code == 0 || (code == -7 && view.evidence.hasAnswers);
     return isTold && !view.isJoined() && !view.evidence.joinedName;
+}
+
+/// A result alone holds the same for a device that did not tell.
+bool isNotJoined(const View& view) {
+    return hasNoJoined(view) && !view.evidence.isStatusUntold;
+}
+
+bool isJoinedUntold(const View& view) {
+    return hasNoJoined(view) && view.evidence.isStatusUntold;
 }
 
 bool hasNoAddress(const View& view) {
@@ -129,6 +138,7 @@ const CauseRow kOutages[] = {
     {{"POWER_OFF",      "POWER_OFF_WHOLE",      0, device, broken, viewer, {}}, [](const View& v) { return endedWith(v, -5); }},
     {{"T31", "NO_NETWORKS_WHOLE", 31, joined, broken, viewer, {}}, [](const View& v) { return v.no(31) && !v.isJoined(); }},
     {{"NOT_JOINED", "NOT_JOINED_WHOLE",  0, device, broken, viewer, {}}, isNotJoined},
+    {{"JOINED_UNTOLD", "JOINED_UNTOLD_WHOLE", 0, device, broken, viewer, {}}, isJoinedUntold},
     {{"LOST", "LOST_WHOLE", 34, joined, broken, viewer,
       {8, 35, 38, 39, 40, 41, 42, 43, 44, 46, 45, 36, 37, 33, 3, 6, 12, 13, 7, 9, 11, 24, 25, 26, 27, 28, 32, 30}}, isLost},
     {{"NO_ADDRESS", "NO_ADDRESS_WHOLE", 12, joined, broken, routerOwner, {13, 3, 6, 7, 9, 11, 46, 8}}, hasNoAddress},

@@ -33,6 +33,7 @@ struct Evidence {
     bool hasAnswers = false;
     std::vector<Answer> answers;            ///< in the order of the requests
     std::optional<std::string> joinedName;  ///< where it is known
+    bool isStatusUntold = false;            ///< whether the device was asked for its network, and never told
     std::optional<std::string> selectedName;
 };
 

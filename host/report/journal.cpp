@@ -23,10 +23,10 @@ DiagnosticsTestResponse Journal::runTestRequests(const std::vector<DiagnosticsTe
 DiagnosticsStatusResponse Journal::queryStatus() {
     DiagnosticsStatusResponse response = client_.queryStatus();
     // What stands beside an error the diagnostic does not take for the joined network, either.
-    if (!response.error || response.error->code == 0) {
-        std::lock_guard lock(mutex_);
-        joinedName_ = response.status ? response.status->ssid : std::nullopt;
-    }
+    const bool isTold = !response.error || response.error->code == 0;
+    std::lock_guard lock(mutex_);
+    statusTold_ = statusTold_.value_or(false) || isTold;
+    if (isTold) joinedName_ = response.status ? response.status->ssid : std::nullopt;
     return response;
 }
 
@@ -48,6 +48,7 @@ Evidence Journal::evidence(std::int64_t statusCode, const DictionaryPointer& dat
     std::lock_guard lock(mutex_);
     Evidence evidence = evidenceFrom(statusCode, data, answers_);
     if (joinedName_) evidence.joinedName = joinedName_;
+    evidence.isStatusUntold = !statusTold_.value_or(true);
     return evidence;
 }
 

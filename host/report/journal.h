@@ -43,6 +43,7 @@ class Journal final : public DiagnosticsClient {
     mutable std::mutex mutex_;
     std::vector<Answer> answers_;
     std::optional<std::string> joinedName_;
+    std::optional<bool> statusTold_;  ///< once or more; absent: nobody asked
     int begun_ = 0;
     int planned_ = 0;
 };

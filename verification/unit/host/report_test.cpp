@@ -508,6 +508,23 @@ TEST(Journal, KeepsWhatWasAnsweredAboutWhichNetwork) {
     EXPECT_TRUE(answerTo(evidence, Part::selected, 32));
 }
 
+TEST(Journal, KnowsWhetherTheDeviceEverToldItsNetwork) {
+    fakes::FakeDiagnosticsClient client;
+    Journal journal(client, [](const TestStep&) {});
+    auto isUntold = [&] { return journal.evidence(0, Dictionary::make()).isStatusUntold; };
+
+    EXPECT_FALSE(isUntold()) << "nobody asked";
+    client.setStatus({nullptr, Error{7, "timeout"}});
+    journal.queryStatus();
+    EXPECT_TRUE(isUntold());
+    client.setJoinedNetwork("Home");
+    journal.queryStatus();
+    EXPECT_FALSE(isUntold());
+    client.setStatus({nullptr, Error{7, "timeout"}});
+    journal.queryStatus();
+    EXPECT_FALSE(isUntold()) << "what was told before goes on to hold";
+}
+
 TEST(Journal, CountsTheTestsOfTheRunAndPassesThemOn) {
     fakes::FakeDiagnosticsClient service;
     service.setJoinedNetwork("Home");
