@@ -10,6 +10,7 @@
 #include "linux/files/dhcpcd_leases.h"
 #include "linux/files/dhcpcd_settings.h"
 #include "linux/files/ifupdown.h"
+#include "linux/files/iwd_settings.h"
 #include "linux/files/key_value_file.h"
 #include "linux/files/resolver_records.h"
 
@@ -25,8 +26,9 @@ KernelIPv6 kernelSwitches(const std::string& interfaceName) {
     return {number("disable_ipv6") != 0, number("accept_ra") > 0};
 }
 
-/// iwd looks at routers' advertisements itself and has the kernel leave them alone.
-bool iwdManages(Known<Bus>& bus, const Link& link, const Until& until) {
+/// Where iwd sets addresses, it looks at routers' advertisements itself and has the kernel leave them alone.
+bool iwdSetsAddresses(Known<Bus>& bus, const Link& link, const Until& until) {
+    if (!iwdMaySetAddresses()) return false;
     const Known<BusValue> objects = bus ? iwdObjects(*bus, until) : bus.error();
     return objects && !iwdDevice(*objects, link.interfaceName).empty();
 }
@@ -34,6 +36,7 @@ bool iwdManages(Known<Bus>& bus, const Link& link, const Until& until) {
 /// What DHCP clients without a manager wrote down.
 struct ClientLeases {
     std::optional<Lease> ipv4, ipv6;
+    bool ofDhcpcd = false;  ///< dhcpcd is among those who did
 };
 
 ClientLeases readClientLeases(const Link& link, const std::vector<AddressDetails>& details) {
@@ -41,9 +44,10 @@ ClientLeases readClientLeases(const Link& link, const std::vector<AddressDetails
     for (const AddressDetails& each : details) addresses.push_back(each.assigned.address);
     const std::time_t now = std::time(nullptr);
     DhcpcdLeases kept = findDhcpcdLeases(link.interfaceName, addresses, now);
+    const bool ofDhcpcd = kept.ipv4 || kept.ipv6;
     if (!kept.ipv4) kept.ipv4 = findLease(link.interfaceName, addresses, now);
     if (!kept.ipv6) kept.ipv6 = findLease6(link.interfaceName, addresses, now);
-    return {std::move(kept.ipv4), std::move(kept.ipv6)};
+    return {std::move(kept.ipv4), std::move(kept.ipv6), ofDhcpcd};
 }
 
 /// All that tells how the interface was set up.
@@ -60,15 +64,24 @@ struct Evidence {
     bool mayHaveLease() const { return leases.ipv4 || clients.ipv4; }
 };
 
-/// What files say of the interface: ifupdown's; dhcpcd's of a family of which it set an address that stands there.
+/// Whether dhcpcd set up the interface. One that ended left its addresses behind.
+bool isByDhcpcd(const Evidence& evidence, const InterfacePlan& plan) {
+    return evidence.clients.dhcpcd || evidence.leases.ofDhcpcd || isAssigned(plan.ipv4, evidence.assigned) ||
+           isAssigned(plan.ipv6, evidence.assigned);
+}
+
+/// What the files of those say who set up the interface: ifupdown's; dhcpcd's, of a family of which it set an address that
+/// stands there.
 void readPlans(const Link& link, Evidence& evidence) {
     InterfacePlan& plan = evidence.plan;
     plan = ifupdownPlan(link.interfaceName);
     if (!plan.ipv4.method.empty() || !plan.ipv6.method.empty()) evidence.toldBy = "ifupdown";
     const std::string network = link.joined ? textFromName(link.joined->says.name) : "";
     const InterfacePlan dhcpcds = dhcpcdPlan(link.interfaceName, network);
+    if (!isByDhcpcd(evidence, dhcpcds)) return;
     for (const auto family : {&InterfacePlan::ipv4, &InterfacePlan::ipv6}) {
-        if (!isAssigned(dhcpcds.*family, evidence.assigned)) continue;
+        const bool isIfupdowns = isAssigned(plan.*family, evidence.assigned);
+        if (isIfupdowns || !isAssigned(dhcpcds.*family, evidence.assigned)) continue;
         plan.*family = dhcpcds.*family;
         evidence.toldBy = "dhcpcd";
     }
@@ -80,8 +93,8 @@ Known<Evidence> gatherEvidence(Known<Bus>& bus, const Link& link, const Until& u
     if (!details) return details.error();
     Evidence evidence;
     evidence.ways = gatherWaysOut(link.interfaceIndex, until);
-    evidence.isIwds = iwdManages(bus, link, until);
-    evidence.clients = dhcpClientsOf(link.interfaceName);
+    evidence.isIwds = iwdSetsAddresses(bus, link, until);
+    evidence.clients = dhcpClientsOf(link.interfaceName, bus ? Connman::answers : Connman::silent);
     evidence.leases = readClientLeases(link, *details);
     const bool byClient = evidence.isIwds || evidence.clients.asksRouters;
     evidence.assigned = assignedOf(*details, byClient && evidence.ways && evidence.ways->advertised,
@@ -97,8 +110,7 @@ AddressMethods methodsFrom(const Evidence& evidence, const std::string& interfac
     switches.acceptsAdvertisements |= evidence.clients.asksRouters || evidence.isIwds;
     FamilyPlan ipv4 = evidence.plan.ipv4;
     // A client whose lease would have been read asks for an address, but did not set the one that is there.
-    if (evidence.clients.leavesLease && (ipv4.method.empty() || ipv4.method == "auto"))
-        ipv4 = {"auto", {}, true};
+    if (evidence.clients.leavesLease && (ipv4.method.empty() || ipv4.method == "auto")) ipv4 = {"auto", {}};
     return {methodFromIPv4Addresses(evidence.assigned, evidence.mayHaveLease(), ipv4),
             methodFromIPv6Addresses(evidence.assigned, switches, evidence.plan.ipv6)};
 }

@@ -27,7 +27,7 @@ Known<std::string> methodFromIPv4Addresses(const std::vector<AssignedAddress>& a
         routable |= !each.address.linkLocal();
         // A client without a manager may set its address without an end, but it leaves a lease behind.
         if (!each.permanent || each.address.linkLocal() || hasLease) continue;
-        if (plan.started && plan.method == "auto")
+        if (plan.method == "auto")
             return failure(Reason::unavailable,
                            "the interface was started to ask for an address, but has one without an end, of "
                            "which no DHCP client tells");

@@ -32,11 +32,10 @@ struct KernelIPv6 {
     bool setByClient = false;
 };
 
-/// How addresses of one family are to be set by a file's word, for devices where what reads it cannot be asked.
+/// How addresses of one family are to be set by a file's word, for devices where the program that goes by it cannot be asked.
 struct FamilyPlan {
     std::string method;                ///< "auto", "manual", "link-local"; empty where the file does not say
     std::vector<IPAddress> addresses;  ///< entered there by hand
-    bool started = false;              ///< whether the interface is kept as started by that file
 };
 
 /// Whether the interface has an address that stands in the file, without an end as such addresses are. *Any* thread.
@@ -50,7 +49,7 @@ struct InterfacePlan {
 
 /// The method of IPv4 as the addresses give it away: an address without an end that no lease accounts for was
 /// put there by hand. Where there is no address a plan tells; so it does of an address that stands in it. An address without
-/// an end on an interface that was started to ask for one tells nothing. *Any* thread.
+/// an end on an interface that is to ask for one tells nothing. *Any* thread.
 /// \param hasLease whether there is a lease in force, or a client that may have one
 Known<std::string> methodFromIPv4Addresses(const std::vector<AssignedAddress>& addresses, bool hasLease,
                                            const FamilyPlan& plan = {});

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <vector>
 
+#include "linux/files/dhcpcd_settings.h"
 #include "linux/files/processes.h"
 
 namespace wp {
@@ -20,18 +21,20 @@ constexpr Client kClients[] = {{"udhcpc", true, false, false},
                                {"dhcpcd", true, true, true},
                                {"connmand", true, false, true}};
 
-/// A client that names interfaces looks after those, one that names none after all.
-bool looksAfter(const std::vector<std::string>& words, const std::string& interfaceName) {
+/// A client that names interfaces looks after those, one that names none after all that it finds.
+bool looksAfter(const std::vector<std::string>& words, const std::string& interfaceName, Connman connman,
+                const std::string& root) {
+    const std::string program = programOf(words[0]);
+    if (program == "connmand") return connman == Connman::silent;
     const auto names = [&](const std::string& word) {
         return word == interfaceName || word == "-i" + interfaceName;
     };
     if (std::ranges::any_of(words, names)) return true;
-    const std::string program = programOf(words[0]);
     const auto isOption = [](const std::string& word) {
         return word.empty() || word.starts_with("-") || word.starts_with("[") || word.find('/') != word.npos;
     };
-    return (program == "dhcpcd" && std::all_of(words.begin() + 1, words.end(), isOption)) ||
-           program == "connmand";
+    return program == "dhcpcd" && std::all_of(words.begin() + 1, words.end(), isOption) &&
+           !dhcpcdPassesOver(interfaceName, root);
 }
 
 /// Whether options, or the title, say that only IPv6 is asked for.
@@ -50,12 +53,13 @@ const Client* clientIn(const std::vector<std::string>& words) {
 
 }  // namespace
 
-DhcpClients dhcpClientsOf(const std::string& interfaceName, const std::string& root) {
+DhcpClients dhcpClientsOf(const std::string& interfaceName, Connman connman, const std::string& root) {
     DhcpClients clients;
     forEachProcess(root, [&](const std::vector<std::string>& words) {
         const Client* client = clientIn(words);
-        if (client == nullptr || !looksAfter(words, interfaceName)) return;
+        if (client == nullptr || !looksAfter(words, interfaceName, connman, root)) return;
         clients.any = true;
+        clients.dhcpcd |= std::string_view(client->program) == "dhcpcd";
         const bool ipv4 = client->ipv4 && !isForIPv6Alone(words);
         clients.ipv4 |= ipv4 && !client->leavesLease;
         clients.leavesLease |= ipv4 && client->leavesLease;

@@ -11,9 +11,14 @@ struct DhcpClients {
     bool ipv4 = false;         ///< one asks for addresses of IPv4, and may set them without an end or a lease
     bool leavesLease = false;  ///< one asks for addresses of IPv4, and leaves a lease of any without an end
     bool asksRouters = false;  ///< one looks at advertisements itself, and has the kernel leave them alone
+    bool dhcpcd = false;       ///< dhcpcd is among them
 };
+
+/// Where ConnMan answers it has said that the interface is none of its own; else that it runs is all that is known.
+enum class Connman { answers, silent };
+
 /// The clients among the processes that this user sees. *Any* thread.
 /// \param root a root folder
-DhcpClients dhcpClientsOf(const std::string& interfaceName, const std::string& root = "");
+DhcpClients dhcpClientsOf(const std::string& interfaceName, Connman connman, const std::string& root = "");
 
 }  // namespace wp

@@ -14,8 +14,12 @@ namespace wp {
 InterfacePlan readDhcpcdSettings(std::string_view text, std::string_view interfaceName,
                                  std::string_view networkName);
 
-/// The same of the file where dhcpcd keeps it. \param root a root folder
+/// The same of the file where dhcpcd keeps it. It counts only where dhcpcd set up the interface. \param root a root folder
 InterfacePlan dhcpcdPlan(const std::string& interfaceName, const std::string& networkName,
                          const std::string& root = "");
+
+/// Whether its settings have dhcpcd pass over the interface where it looks for interfaces itself. *Any* thread.
+/// \param root a root folder
+bool dhcpcdPassesOver(const std::string& interfaceName, const std::string& root = "");
 
 }  // namespace wp

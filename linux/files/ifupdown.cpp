@@ -70,11 +70,8 @@ std::string startedAs(const std::string& interfaceName, const std::string& root)
 }  // namespace
 
 InterfacePlan ifupdownPlan(const std::string& interfaceName, const std::string& root) {
-    const InterfacesFile file = readAll(root);
     const std::string started = startedAs(interfaceName, root);
-    InterfacePlan plan = planIn(file, started.empty() ? logicalNameIn(file, interfaceName) : started);
-    plan.ipv4.started = plan.ipv6.started = !started.empty();
-    return plan;
+    return started.empty() ? InterfacePlan{} : planIn(readAll(root), started);
 }
 
 }  // namespace wp

@@ -6,9 +6,9 @@
 
 namespace wp {
 
-/// What `/etc/network/interfaces`, and the files that it includes, say of an interface. Its logical name is the one under which
-/// ifupdown (or busybox) keeps it as started, else the one under which it would be started. Nothing is planned where the
-/// file leaves the interface out. *Any* thread.
+/// What `/etc/network/interfaces`, and the files that it includes, say of an interface under the logical name under which
+/// ifupdown (or busybox) keeps it as started. It does so from the moment when it begins, and also where no address came of it.
+/// Nothing where it was not started: the file may be left from before. *Any* thread.
 /// \param root a root folder
 InterfacePlan ifupdownPlan(const std::string& interfaceName, const std::string& root = "");
 

@@ -1,7 +1,5 @@
 #include "linux/files/interfaces_file.h"
 
-#include <fnmatch.h>
-
 #include <algorithm>
 
 #include "linux/files/address_list.h"
@@ -11,7 +9,7 @@ namespace wp {
 namespace {
 
 // More is no configuration of a device, but an attempt to keep its reader busy.
-constexpr std::size_t kMostStanzas = 1000, kMostWords = 10'000, kMostIncludes = 256;
+constexpr std::size_t kMostStanzas = 1000, kMostIncludes = 256;
 constexpr int kDeepestInheritance = 8;
 
 /// The lines without comments; one that ends in a backslash goes on with the next.
@@ -28,11 +26,6 @@ std::vector<std::string> logicalLines(std::string_view text) {
     return lines;
 }
 
-void addWords(const std::vector<std::string>& words, std::vector<std::string>& into) {
-    for (auto word = words.begin() + 1; word != words.end() && into.size() < kMostWords; ++word)
-        into.push_back(*word);
-}
-
 /// "iface NAME [FAMILY METHOD] [inherits PARENT]"
 InterfaceStanza stanzaFrom(const std::vector<std::string>& words) {
     InterfaceStanza stanza;
@@ -46,6 +39,12 @@ InterfaceStanza stanzaFrom(const std::vector<std::string>& words) {
     return stanza;
 }
 
+/// Whether a stanza begins of which nothing matters here.
+bool beginsAnother(const std::string& word) {
+    constexpr const char* kWords[] = {"auto", "mapping", "no-auto-down", "no-scripts", "rename"};
+    return word.starts_with("allow-") || std::ranges::find(kWords, word) != std::end(kWords);
+}
+
 /// Reads line after line; knows whose options follow.
 class Reader {
   public:
@@ -55,11 +54,7 @@ class Reader {
         const auto words = wordsOf(line);
         if (words.empty()) return;
         const std::string& first = words[0];
-        if (first == "auto" || first.starts_with("allow-")) {
-            addWords(words, into_.started);
-        } else if (first == "mapping") {
-            addWords(words, into_.mappings);
-        } else if (first == "source" || first == "source-directory") {
+        if (first == "source" || first == "source-directory") {
             for (auto path = words.begin() + 1; path != words.end() && into_.includes.size() < kMostIncludes;
                  ++path)
                 into_.includes.push_back({*path, first == "source-directory"});
@@ -67,7 +62,7 @@ class Reader {
             hasStanza_ = into_.stanzas.size() < kMostStanzas;
             if (hasStanza_) into_.stanzas.push_back(stanzaFrom(words));
             return;
-        } else if (first != "no-auto-down" && first != "no-scripts" && first != "rename") {
+        } else if (!beginsAnother(first)) {
             readOption(line, first);
             return;
         }
@@ -86,13 +81,6 @@ class Reader {
     InterfacesFile& into_;
     bool hasStanza_ = false;
 };
-
-/// "NAME", or "/PATTERN[/N]"; patterns over anything but names are nothing that a file alone can answer.
-bool matches(const std::string& word, const std::string& interfaceName) {
-    if (!word.starts_with("/")) return word == interfaceName;
-    const std::string pattern = word.substr(1, word.find('/', 1) - 1);
-    return ::fnmatch(pattern.c_str(), interfaceName.c_str(), 0) == 0;
-}
 
 /// The stanza together with what it inherits.
 InterfaceStanza whole(const InterfacesFile& file, InterfaceStanza stanza) {
@@ -141,19 +129,6 @@ void addServers(const InterfaceStanza& stanza, std::vector<IPAddress>& servers) 
 void readInterfaces(std::string_view text, InterfacesFile& into) {
     Reader reader(into);
     for (const std::string& line : logicalLines(text)) reader.read(line);
-}
-
-std::string logicalNameIn(const InterfacesFile& file, const std::string& interfaceName) {
-    std::string name = interfaceName;
-    for (const std::string& word : file.started) {
-        const std::size_t equals = word.find('=');
-        if (equals == word.npos || !matches(word.substr(0, equals), interfaceName)) continue;
-        name = word.substr(equals + 1);
-        break;
-    }
-    for (const std::string& pattern : file.mappings)
-        if (::fnmatch(pattern.c_str(), name.c_str(), 0) == 0) return "";
-    return name;
 }
 
 InterfacePlan planIn(const InterfacesFile& file, const std::string& logicalName) {

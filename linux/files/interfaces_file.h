@@ -28,18 +28,11 @@ struct InterfacesInclude {
 /// The content of the file, and of those that it includes.
 struct InterfacesFile {
     std::vector<InterfaceStanza> stanzas;
-    std::vector<std::string>
-        started;  ///< the words of "auto" and "allow-...": interfaces, patterns, "PATTERN=LOGICAL"
-    std::vector<std::string>
-        mappings;  ///< patterns of interfaces for which a script chooses the logical name
     std::vector<InterfacesInclude> includes;
 };
 
 /// Reads such a text in addition to what was read. *Any* thread.
 void readInterfaces(std::string_view text, InterfacesFile& into);
-
-/// The logical name under which an interface would be started; empty where a script chooses it. *Any* thread.
-std::string logicalNameIn(const InterfacesFile& file, const std::string& interfaceName);
 
 /// What the file says of a logical interface; all absent or empty where it says nothing. *Any* thread.
 InterfacePlan planIn(const InterfacesFile& file, const std::string& logicalName);

@@ -69,6 +69,16 @@ std::string_view trimmed(std::string_view text) {
     return text.substr(start, text.find_last_not_of(kBlanks) - start + 1);
 }
 
+std::string_view uncommented(std::string_view line) {
+    bool isQuoted = false;
+    for (std::size_t at = 0; at < line.size(); ++at) {
+        if (line[at] == '"') isQuoted = !isQuoted;
+        const bool isApart = at == 0 || kBlanks.find(line[at - 1]) != kBlanks.npos;
+        if (line[at] == '#' && isApart && !isQuoted) return line.substr(0, at);
+    }
+    return line;
+}
+
 std::map<std::string, std::string> readAssignments(std::string_view text) {
     std::map<std::string, std::string> values;
     for (std::string_view line : linesOf(text)) {

@@ -19,6 +19,9 @@ std::vector<std::string> wordsOf(std::string_view text);
 /// Without blanks at both ends.
 std::string_view trimmed(std::string_view text);
 
+/// A line without its comment, which begins with '#' at the line's start or behind a blank, but not between double quotes.
+std::string_view uncommented(std::string_view line);
+
 /// "KEY=VALUE" lines as service managers and shells write them: a comment begins with '#', a value may stand in
 /// quotes, `export ` before a key is dropped. A later line wins. *Any* thread.
 std::map<std::string, std::string> readAssignments(std::string_view text);

@@ -3,6 +3,7 @@
 #include <algorithm>
 
 #include "linux/files/leases.h"
+#include "linux/files/processes.h"
 #include "service/plain_text.h"
 
 namespace wp {
@@ -54,6 +55,12 @@ UnitFile readSettings(const std::map<std::string, std::string>& state, const std
     return settings;
 }
 
+/// Whether it was told not to manage the interface, or manages it no more.
+bool isLeftAlone(const std::map<std::string, std::string>& state) {
+    const auto how = state.find("ADMIN_STATE");
+    return how != state.end() && (how->second == "unmanaged" || how->second == "linger");
+}
+
 void addLease(const std::map<std::string, std::string>& lease, NetworkdLink& link) {
     const auto value = [&lease](const char* key) {
         const auto found = lease.find(key);
@@ -89,9 +96,10 @@ AddressMethods methodsFromNetworkd(const UnitFile& settings) {
 std::optional<NetworkdLink> readNetworkdLink(unsigned interfaceIndex, const std::string& root) {
     const std::string number = std::to_string(interfaceIndex);
     const auto text = readSmallFile(root + "/run/systemd/netif/links/" + number);
-    if (!text) return std::nullopt;
+    // One that was killed leaves its state behind.
+    if (!text || !mayRun("systemd-networkd", root)) return std::nullopt;
     const auto state = readAssignments(*text);
-    if (state.count("NETWORK_FILE") == 0) return std::nullopt;
+    if (state.count("NETWORK_FILE") == 0 || isLeftAlone(state)) return std::nullopt;
     const UnitFile settings = readSettings(state, root);
     NetworkdLink link;
     link.methods = methodsFromNetworkd(settings);

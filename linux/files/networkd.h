@@ -22,7 +22,7 @@ struct NetworkdLink {
 /// The methods that the settings stand for, in the connection manager's words.
 AddressMethods methodsFromNetworkd(const UnitFile& settings);
 
-/// Reads state, settings and lease below a root folder; absent where networkd does not manage the interface.
+/// Reads state, settings and lease below a root folder; absent where networkd does not run, or does not manage the interface.
 /// *Any* thread.
 std::optional<NetworkdLink> readNetworkdLink(unsigned interfaceIndex, const std::string& root = "");
 

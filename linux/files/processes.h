@@ -12,6 +12,10 @@ namespace wp {
 void forEachProcess(const std::string& root,
                     const std::function<void(const std::vector<std::string>&)>& call);
 
+/// Whether a program of this name runs; where other users' processes are hidden it may. *Any* thread.
+/// \param root a root folder
+bool mayRun(const std::string& program, const std::string& root);
+
 /// The name of a program that a word of a command line names by its path.
 std::string programOf(const std::string& word);
 

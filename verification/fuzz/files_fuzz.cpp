@@ -17,7 +17,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     serversFromResolverFile(text);
     InterfacesFile interfaces;
     readInterfaces(text, interfaces);
-    planIn(interfaces, logicalNameIn(interfaces, "wlan0"));
+    planIn(interfaces, "wlan0");
     readDhcpcdSettings(text, "wlan0", "Northlight");
     DnsmasqSettings resolver;
     readDnsmasqFile(text, resolver);

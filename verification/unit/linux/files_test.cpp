@@ -3,6 +3,7 @@
 #include "linux/files/address_list.h"
 #include "linux/files/dhcp_clients.h"
 #include "linux/files/folder.h"
+#include "linux/files/iwd_settings.h"
 #include "linux/files/leases.h"
 #include "linux/files/networkd.h"
 #include "linux/files/proxy_settings.h"
@@ -23,6 +24,12 @@ class Root : public ::testing::Test {
     fakes::TemporaryFolder folder_;
     const std::string& root_ = folder_.path();
 };
+
+std::string commandOf(const std::vector<std::string>& words) {
+    std::string command;
+    for (const std::string& word : words) command += word + '\0';
+    return command;
+}
 
 constexpr const char* kLeases = R"(default-duid "\000\001";
 lease {
@@ -288,6 +295,31 @@ TEST_F(Root, OfASystemWithNetworkdTellsThePortalOfAnAdvertisementToo) {
 TEST_F(Root, WithoutANetworkFileIsNotManagedByNetworkd) {
     write("/run/systemd/netif/links/3", "ADMIN_STATE=unmanaged\n");
     EXPECT_FALSE(readNetworkdLink(3, root_));
+    write("/run/systemd/netif/links/3",
+          "ADMIN_STATE=unmanaged\nNETWORK_FILE=/etc/systemd/network/a.network\n");
+    EXPECT_FALSE(readNetworkdLink(3, root_));
+}
+
+TEST_F(Root, OfASystemWhereNetworkdWasKilledIsNotManagedByIt) {
+    write("/run/systemd/netif/links/3",
+          "ADMIN_STATE=configured\nNETWORK_FILE=/etc/systemd/network/a.network\n");
+    EXPECT_TRUE(readNetworkdLink(3, root_)) << "others' processes are hidden";
+    write("/proc/1/cmdline", commandOf({"/sbin/init"}));
+    EXPECT_FALSE(readNetworkdLink(3, root_));
+    write("/proc/240/cmdline", commandOf({"/lib/systemd/systemd-networkd"}));
+    EXPECT_TRUE(readNetworkdLink(3, root_));
+}
+
+TEST_F(Root, OfASystemWithIwdSaysWhetherThatSetsAddresses) {
+    EXPECT_FALSE(iwdMaySetAddresses(root_));
+    write("/etc/iwd/main.conf", "# [General]\n#EnableNetworkConfiguration=true\n[General]\n");
+    EXPECT_FALSE(iwdMaySetAddresses(root_));
+    write("/etc/iwd/main.conf", "[General]\nEnableNetworkConfiguration=true\n");
+    EXPECT_TRUE(iwdMaySetAddresses(root_));
+    write("/etc/iwd/main.conf", "[General]\nenable_network_config = false\n");
+    EXPECT_FALSE(iwdMaySetAddresses(root_));
+    write("/etc/iwd/main.conf", std::string(300'000, '#'));
+    EXPECT_TRUE(iwdMaySetAddresses(root_)) << "it cannot be read";
 }
 
 TEST_F(Root, KeepsALeaseWhereItsClientPutsIt) {
@@ -299,40 +331,42 @@ TEST_F(Root, KeepsALeaseWhereItsClientPutsIt) {
 }
 
 /// A process of a program with arguments, as /proc shows it.
-std::string commandOf(const std::vector<std::string>& words) {
-    std::string command;
-    for (const std::string& word : words) command += word + '\0';
-    return command;
-}
+/// A root where ConnMan, should it run, cannot be asked about its interfaces.
+class DhcpClientsIn : public Root {
+  protected:
+    DhcpClients clientsOf(const char* interfaceName) const {
+        return dhcpClientsOf(interfaceName, Connman::silent, root_);
+    }
+};
 
-TEST_F(Root, HasADhcpClientForTheInterfaceThatItNames) {
-    EXPECT_FALSE(dhcpClientsOf("wlan0", root_).any);
+TEST_F(DhcpClientsIn, ASystemLookAfterTheInterfacesThatTheyName) {
+    EXPECT_FALSE(clientsOf("wlan0").any);
     write("/proc/1/cmdline", commandOf({"/sbin/init"}));
     write("/proc/12/cmdline", commandOf({"/bin/busybox", "udhcpc", "-i", "wlan0", "-n"}));
     write("/proc/13/cmdline", commandOf({"/sbin/dhclient", "-iwlan2"}));
     write("/proc/14/cmdline", "");
     write("/proc/self/cmdline", commandOf({"dhclient", "eth0"}));
-    EXPECT_TRUE(dhcpClientsOf("wlan0", root_).any);
-    EXPECT_TRUE(dhcpClientsOf("wlan2", root_).any);
-    EXPECT_FALSE(dhcpClientsOf("wlan", root_).any);
-    EXPECT_FALSE(dhcpClientsOf("eth0", root_).any);
+    EXPECT_TRUE(clientsOf("wlan0").any);
+    EXPECT_TRUE(clientsOf("wlan2").any);
+    EXPECT_FALSE(clientsOf("wlan").any);
+    EXPECT_FALSE(clientsOf("eth0").any);
 }
 
-TEST_F(Root, HasADhcpClientForAllInterfacesWhereItNamesNone) {
+TEST_F(DhcpClientsIn, ASystemLookAfterAllInterfacesWhereTheyNameNone) {
     write("/proc/12/cmdline", commandOf({"dhcpcd", "eth0", "-q"}));
-    EXPECT_FALSE(dhcpClientsOf("wlan0", root_).any);
+    EXPECT_FALSE(clientsOf("wlan0").any);
     write("/proc/13/cmdline", commandOf({"/usr/sbin/dhcpcd", "-q", "-f", "/etc/dhcpcd.conf"}));
-    EXPECT_TRUE(dhcpClientsOf("wlan0", root_).any);
+    EXPECT_TRUE(clientsOf("wlan0").any);
     write("/proc/13/cmdline", commandOf({"/usr/sbin/connmand", "-n", "-r"}));
-    EXPECT_TRUE(dhcpClientsOf("wlan0", root_).any);
+    EXPECT_TRUE(clientsOf("wlan0").any);
     write("/proc/13/cmdline", commandOf({"grep", "connmand.conf"}));
-    EXPECT_FALSE(dhcpClientsOf("wlan0", root_).any);
+    EXPECT_FALSE(clientsOf("wlan0").any);
 }
 
-TEST_F(Root, HasADhcpClientOfIPv6ThatDoesNotAskForIPv4) {
+TEST_F(DhcpClientsIn, ASystemDoNotAskForIPv4WhereTheyAreOfIPv6) {
     const auto asksForIPv4 = [&](const std::string& command) {
         write("/proc/12/cmdline", command);
-        const DhcpClients clients = dhcpClientsOf("wlan0", root_);
+        const DhcpClients clients = clientsOf("wlan0");
         EXPECT_TRUE(clients.any);
         EXPECT_FALSE(clients.ipv4 && clients.leavesLease);
         return clients.ipv4 || clients.leavesLease;
@@ -345,20 +379,39 @@ TEST_F(Root, HasADhcpClientOfIPv6ThatDoesNotAskForIPv4) {
     EXPECT_FALSE(asksForIPv4("dhcpcd: wlan0 [ip6]"));
 }
 
-TEST_F(Root, HasADhcpClientThatShowsATitleInPlaceOfItsCommandLine) {
+TEST_F(DhcpClientsIn, ASystemMayShowATitleInPlaceOfTheirCommandLine) {
     write("/proc/13/cmdline", std::string("dhcpcd: wlan0 [ip4] [ip6]") + std::string(8, '\0'));
-    EXPECT_TRUE(dhcpClientsOf("wlan0", root_).any);
-    EXPECT_FALSE(dhcpClientsOf("wlan1", root_).any);
+    EXPECT_TRUE(clientsOf("wlan0").any);
+    EXPECT_FALSE(clientsOf("wlan1").any);
     write("/proc/13/cmdline", "dhcpcd: [manager] [ip4] [ip6]");
-    EXPECT_TRUE(dhcpClientsOf("wlan1", root_).any);
+    EXPECT_TRUE(clientsOf("wlan1").any);
 }
 
-TEST_F(Root, HasADhcpClientThatLooksAtAdvertisementsItself) {
+TEST_F(DhcpClientsIn, ASystemAreNoneOfAnInterfaceThatConnmanSaysIsNotItsOwn) {
+    write("/proc/13/cmdline", commandOf({"/usr/sbin/connmand", "-n", "-i", "wlan0"}));
+    EXPECT_TRUE(clientsOf("wlan0").any);
+    EXPECT_FALSE(dhcpClientsOf("wlan0", Connman::answers, root_).any);
+}
+
+TEST_F(DhcpClientsIn, ASystemPassOverInterfacesByTheirSettings) {
+    write("/proc/13/cmdline", "dhcpcd: [manager] [ip4] [ip6]");
+    EXPECT_TRUE(clientsOf("wlan0").dhcpcd);
+    write("/etc/dhcpcd.conf", "denyinterfaces eth*,wlan? # not these\n");
+    EXPECT_FALSE(clientsOf("wlan0").any);
+    EXPECT_TRUE(clientsOf("wlan10").any);
+    write("/etc/dhcpcd.conf", "#denyinterfaces wlan0\nallowinterfaces eth0\nallowinterfaces wlan0\n");
+    EXPECT_TRUE(clientsOf("wlan0").any);
+    EXPECT_FALSE(clientsOf("wlan1").any);
+    write("/proc/13/cmdline", "dhcpcd: wlan1 [ip4]");
+    EXPECT_TRUE(clientsOf("wlan1").any) << "it was told to on the command line";
+}
+
+TEST_F(DhcpClientsIn, ASystemMayLookAtAdvertisementsThemselves) {
     write("/proc/12/cmdline", commandOf({"udhcpc", "-i", "wlan0"}));
-    EXPECT_FALSE(dhcpClientsOf("wlan0", root_).asksRouters);
+    EXPECT_FALSE(clientsOf("wlan0").asksRouters);
     write("/proc/13/cmdline", commandOf({"/usr/sbin/dhcpcd", "wlan0"}));
-    EXPECT_TRUE(dhcpClientsOf("wlan0", root_).asksRouters);
-    EXPECT_FALSE(dhcpClientsOf("wlan1", root_).asksRouters);
+    EXPECT_TRUE(clientsOf("wlan0").asksRouters);
+    EXPECT_FALSE(clientsOf("wlan1").asksRouters);
 }
 
 TEST_F(Root, FoldersAreReadInTheOrderOfTheirNamesAsFarAsIsAllowed) {

@@ -196,6 +196,18 @@ TEST(DhcpcdSettings, SetAddressesAndServersByHand) {
         " |  | ");
 }
 
+TEST(DhcpcdSettings, HaveCommentsAndTheLastWordOfEachOption) {
+    EXPECT_EQ(enteredIn("static domain_name_servers=9.9.9.9\nstatic dhcp6_name_servers=2620:fe::9\n"
+                        "interface wlan0 # the Wi-Fi\nstatic domain_name_servers=1.1.1.1 # 1.0.0.1\n"
+                        "inform 10.0.0.6\nstatic ip_address=10.0.0.7/24\n"),
+              "manual 10.0.0.7 |  | 1.1.1.1 2620:fe::9 ");
+    EXPECT_EQ(enteredIn("static domain_name_servers=9.9.9.9\nstatic domain_name_servers=\n"), " |  | ");
+    EXPECT_EQ(enteredIn("interface \"wlan0\"\nstatic ip_address=10.0.0.7\nssid \"Northlight\"\n"
+                        "static ip_address=10.0.0.8\n"),
+              " |  | ")
+        << "these names stand without quotes";
+}
+
 TEST(DhcpcdSettings, CountForTheInterfaceAndTheNetworkThatTheyName) {
     EXPECT_EQ(
         enteredIn("interface eth0\nstatic ip_address=10.0.0.7/24\nssid Other\nstatic ip_address=10.0.0.8\n"),

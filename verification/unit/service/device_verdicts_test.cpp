@@ -54,15 +54,15 @@ TEST(AddressConfiguration, AnEndlessIPv4AddressWithoutALeaseIsStatic) {
 
 TEST(AddressConfiguration, AFileSaysHowIPv4IsSetUpWhereThereIsNoAddress) {
     const AssignedAddress local{address("169.254.7.7"), true, false};
-    EXPECT_EQ(*methodFromIPv4Addresses({}, false, {"auto", {}, false}), "auto");
-    EXPECT_EQ(*methodFromIPv4Addresses({}, false, {"manual", {address("10.0.0.7")}, false}), "manual");
-    EXPECT_EQ(*methodFromIPv4Addresses({local}, false, {"link-local", {}, true}), "link-local");
-    EXPECT_EQ(*methodFromIPv4Addresses({}, true, {"manual", {address("10.0.0.7")}, false}), "dynamic")
+    EXPECT_EQ(*methodFromIPv4Addresses({}, false, {"auto", {}}), "auto");
+    EXPECT_EQ(*methodFromIPv4Addresses({}, false, {"manual", {address("10.0.0.7")}}), "manual");
+    EXPECT_EQ(*methodFromIPv4Addresses({local}, false, {"link-local", {}}), "link-local");
+    EXPECT_EQ(*methodFromIPv4Addresses({}, true, {"manual", {address("10.0.0.7")}}), "dynamic")
         << "a client looks for one";
 }
 
 TEST(AddressConfiguration, AnAddressThatStandsInAFileWasEnteredThere) {
-    const FamilyPlan plan{"manual", {address("10.0.0.7"), address("2001:db8::7")}, false};
+    const FamilyPlan plan{"manual", {address("10.0.0.7"), address("2001:db8::7")}};
     const AssignedAddress four{address("10.0.0.7"), true, false}, six{address("2001:db8::7"), true, false},
         granted{address("10.0.0.8"), false, false};
     EXPECT_EQ(*methodFromIPv4Addresses({four}, false, plan), "manual");
@@ -75,19 +75,18 @@ TEST(AddressConfiguration, AnAddressThatStandsInAFileWasEnteredThere) {
 
 TEST(AddressConfiguration, AnEndlessAddressOfAnInterfaceThatAsksForOneTellsNothing) {
     const AssignedAddress endless{address("10.0.0.7"), true, false};
-    EXPECT_EQ(methodFromIPv4Addresses({endless}, false, {"auto", {}, true}).error().code,
+    EXPECT_EQ(methodFromIPv4Addresses({endless}, false, {"auto", {}}).error().code,
               static_cast<int>(Reason::unavailable));
-    EXPECT_EQ(*methodFromIPv4Addresses({endless}, true, {"auto", {}, true}), "dynamic");
-    EXPECT_EQ(*methodFromIPv4Addresses({endless}, false, {"auto", {}, false}), "static")
-        << "it was never started";
+    EXPECT_EQ(*methodFromIPv4Addresses({endless}, true, {"auto", {}}), "dynamic");
+    EXPECT_EQ(*methodFromIPv4Addresses({endless}, false), "static");
 }
 
 TEST(AddressConfiguration, AFileSaysHowIPv6IsSetUpWhereThereIsNoGlobalAddress) {
     const AssignedAddress local{address("fe80::5"), true, true}, byHand{address("2001:db8::6"), true, false};
-    EXPECT_EQ(*methodFromIPv6Addresses({local}, {}, {"manual", {address("2001:db8::7")}, false}), "manual");
-    EXPECT_EQ(*methodFromIPv6Addresses({local}, {false, false}, {"auto", {}, false}), "auto");
-    EXPECT_EQ(*methodFromIPv6Addresses({byHand}, {}, {"auto", {}, true}), "static");
-    EXPECT_EQ(*methodFromIPv6Addresses({local}, {true, false}, {"auto", {}, false}), "disabled");
+    EXPECT_EQ(*methodFromIPv6Addresses({local}, {}, {"manual", {address("2001:db8::7")}}), "manual");
+    EXPECT_EQ(*methodFromIPv6Addresses({local}, {false, false}, {"auto", {}}), "auto");
+    EXPECT_EQ(*methodFromIPv6Addresses({byHand}, {}, {"auto", {}}), "static");
+    EXPECT_EQ(*methodFromIPv6Addresses({local}, {true, false}, {"auto", {}}), "disabled");
 }
 
 TEST(AddressConfiguration, IPv6OfARoutersAdvertisementIsDynamicEvenWithoutAnEnd) {
