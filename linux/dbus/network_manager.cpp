@@ -4,6 +4,7 @@
 #include <functional>
 
 #include "linux/dbus/network_records.h"
+#include "service/access_point.h"
 
 namespace wp {
 namespace {
@@ -13,6 +14,12 @@ const BusObject kManager{kService, "/org/freedesktop/NetworkManager"};
 const BusObject kSettings{kService, "/org/freedesktop/NetworkManager/Settings"};
 /// Beyond these a store is broken rather than full.
 constexpr std::size_t kMostConnections = 2000;
+
+std::string inUpperCase(std::string text) {
+    for (char& each : text)
+        if (each >= 'a' && each <= 'z') each = static_cast<char>(each - 'a' + 'A');
+    return text;
+}
 
 bool isPath(const std::string& path) {
     return !path.empty() && path != "/";
@@ -90,6 +97,16 @@ void addManual(const BusValue& family, std::vector<IPAddress>& servers) {
         }
         if (address) servers.push_back(*address);
     }
+}
+
+/// The radio's own hardware address, in upper case: the one in use may be made up anew each time. Empty where it is not known.
+Known<std::string> permanentAddress(Bus& bus, const std::string& interfaceName, const Until& until) {
+    const auto device = deviceOf(bus, interfaceName, until);
+    if (!device) return device.error();
+    const auto address = bus.property(*device, kService + ".Device.Wireless", "PermHwAddress", until);
+    if (!address && address.error().code == static_cast<int>(Reason::notFound)) return std::string();
+    if (!address) return address.error();
+    return inUpperCase(address->text());
 }
 
 bool allowsOnlyFirstWpa(const BusValue& protocols) {
@@ -201,11 +218,32 @@ std::optional<SavedNetwork> savedFromNetworkManager(const BusValue& settings) {
     return network;
 }
 
+bool isBoundElsewhere(const BusValue& settings, const std::string& interfaceName,
+                      const std::string& hardwareAddress) {
+    const std::string name = settings["connection"]["interface-name"].text();
+    if (!name.empty() && name != interfaceName) return true;
+    if (hardwareAddress.empty()) return false;
+    const BusValue& wireless = settings["802-11-wireless"];
+    const auto& wanted = wireless["mac-address"].bytes();
+    MacAddress address{};
+    if (wanted.size() == address.size()) {
+        std::ranges::copy(wanted, address.begin());
+        if (inUpperCase(textOf(address)) != hardwareAddress) return true;
+    }
+    // The second is the name of newer versions, which tell both.
+    for (const char* list : {"mac-address-blacklist", "mac-address-denylist"})
+        for (const BusValue& each : wireless[list].list())
+            if (inUpperCase(each.text()) == hardwareAddress) return true;
+    return false;
+}
+
 Known<SavedNetworks> networkManagerNetworks(Bus& bus, const std::string& interfaceName, const Until& until) {
     const auto paths = bus.call(kSettings, kService + ".Settings", "ListConnections", {}, until);
     if (!paths) return paths.error();
     if (paths->list().size() > kMostConnections)
         return failure(Reason::malformed, "NetworkManager lists more connections than can be real");
+    const auto hardwareAddress = permanentAddress(bus, interfaceName, until);
+    if (!hardwareAddress) return hardwareAddress.error();
     SavedNetworks saved{"NetworkManager", {}};
     for (const BusValue& path : paths->list()) {
         const auto settings =
@@ -213,8 +251,7 @@ Known<SavedNetworks> networkManagerNetworks(Bus& bus, const std::string& interfa
         // One that was deleted meanwhile is not remembered any more.
         if (!settings && settings.error().code == static_cast<int>(Reason::notFound)) continue;
         if (!settings) return settings.error();
-        const std::string boundTo = (*settings)["connection"]["interface-name"].text();
-        if (!boundTo.empty() && boundTo != interfaceName) continue;
+        if (isBoundElsewhere(*settings, interfaceName, *hardwareAddress)) continue;
         if (auto network = savedFromNetworkManager(*settings)) saved.networks.push_back(*network);
     }
     return saved;

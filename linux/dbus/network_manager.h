@@ -41,8 +41,12 @@ Known<std::vector<IPAddress>> networkManagerGlobalServers(Bus& bus, const Until&
 Known<std::vector<IPAddress>> networkManagerServersElsewhere(Bus& bus, const std::string& interfaceName,
                                                              const Until& until);
 
-/// All Wi-Fi networks that NetworkManager remembers for the interface: those bound to another one are never joined
-/// on it. *Any* thread.
+/// Whether the settings of a connection bind it to another interface, by name or hardware, or exclude this one: it is never joined
+/// on it.
+/// \param hardwareAddress the interface's permanent one as an upper-case text; empty where it is not known
+bool isBoundElsewhere(const BusValue& settings, const std::string& interfaceName,
+                      const std::string& hardwareAddress);
+/// All Wi-Fi networks that NetworkManager remembers for the interface, without those that are bound elsewhere. *Any* thread.
 Known<SavedNetworks> networkManagerNetworks(Bus& bus, const std::string& interfaceName, const Until& until);
 
 /// Whether Wi-Fi is switched on, by software and by hardware.

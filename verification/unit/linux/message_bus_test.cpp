@@ -257,6 +257,28 @@ TEST_F(MessageBus, NetworkManagerTellsItsNetworks) {
               "Cellar 0 hidden\n");
 }
 
+TEST(NetworkManagerSettings, BindAConnectionByNameAndByHardware) {
+    using Map = BusValue::Map;
+    const auto isBound = [](const char* section, const char* key, BusValue value,
+                            const char* hardware = "02:00:00:00:0A:00") {
+        const BusValue settings(Map{{section, BusValue(Map{{key, std::move(value)}})}});
+        return isBoundElsewhere(settings, "wlan0", hardware);
+    };
+    const auto text = [](const char* content) { return BusValue(std::string(content)); };
+    const auto list = [&](const char* content) { return BusValue(BusValue::List{text("x"), text(content)}); };
+    const BusValue own(BusValue::Bytes{2, 0, 0, 0, 10, 0}), other(BusValue::Bytes{2, 0, 0, 0, 10, 1});
+    EXPECT_FALSE(isBound("connection", "interface-name", text("")));
+    EXPECT_FALSE(isBound("connection", "interface-name", text("wlan0")));
+    EXPECT_TRUE(isBound("connection", "interface-name", text("wlan1")));
+    EXPECT_FALSE(isBound("802-11-wireless", "mac-address", own));
+    EXPECT_TRUE(isBound("802-11-wireless", "mac-address", other));
+    EXPECT_FALSE(isBound("802-11-wireless", "mac-address", other, "")) << "its own is not known";
+    EXPECT_FALSE(isBound("802-11-wireless", "mac-address", BusValue(BusValue::Bytes{2, 0})));
+    EXPECT_TRUE(isBound("802-11-wireless", "mac-address-blacklist", list("02:00:00:00:0a:00")));
+    EXPECT_TRUE(isBound("802-11-wireless", "mac-address-denylist", list("02:00:00:00:0A:00")));
+    EXPECT_FALSE(isBound("802-11-wireless", "mac-address-denylist", list("02:00:00:00:0A:01")));
+}
+
 TEST_F(MessageBus, NetworkManagerSwitchesWiFi) {
     Bus bus = this->bus();
     ASSERT_TRUE(networkManagerPower(bus, patience()));

@@ -43,6 +43,8 @@ def network_manager():
     }, [])
     dbusmock.get_object(base + "/Devices/1").AddMethod(
         device + ".Wireless", "RequestScan", "a{sv}", "", "")
+    dbusmock.get_object(base + "/Devices/1").AddProperty(
+        device + ".Wireless", "PermHwAddress", "02:00:00:00:0A:00")
     main.AddObject(base + "/Devices/2", device, {"Managed": False}, [])
     main.AddObject(base + "/Devices/4", device, {"Managed": True}, [])
     dbusmock.get_object(base + "/Devices/4").AddMethod(
@@ -98,6 +100,8 @@ def network_manager():
                    "802-11-wireless": {"ssid": text(b"Cellar"), "hidden": True}})
     connection(6, {"connection": {"type": "802-11-wireless", "interface-name": "wlan1"},
                    "802-11-wireless": {"ssid": text(b"Elsewhere")}})
+    connection(7, {"connection": {"type": "802-11-wireless"},
+                   "802-11-wireless": {"ssid": text(b"Stick"), "mac-address": text(b"\x02\0\0\0\x0b\0")}})
     connection(4, {"connection": {"type": "802-11-wireless"},
                    "802-11-wireless": {"ssid": text(b"Hotspot"), "mode": "ap"}})
     # One that belongs to somebody else.
