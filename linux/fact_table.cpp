@@ -40,8 +40,33 @@ Store fromLink(const Gathering& g, Known<T> Facts::*place, Gather gather) {
     return kept<T>(place, g.facts.link.error());
 }
 
+Error leavesByAnother(const Link& link) {
+    return failure(Reason::notJoined, link.interfaceName + " only stands by in " + link.master->name +
+                                          ": what this device sends leaves by another interface");
+}
+
+/// The same of what has the link's addresses: the interface, or the bridge or bond that it is part of.
+template <class T, class Gather>
+Store fromAddressed(const Gathering& g, Known<T> Facts::*place, Gather gather) {
+    return fromLink(g, place, [&](const Link& found) -> Known<T> { return gather(addressed(found)); });
+}
+
+/// The same of what is asked over the network, which must be asked by this interface.
+template <class T, class Gather>
+Store overNetwork(const Gathering& g, Known<T> Facts::*place, Gather gather) {
+    return fromLink(g, place, [&](const Link& found) -> Known<T> {
+        if (found.master && found.master->sendsElsewhere) return leavesByAnother(found);
+        return gather(addressed(found));
+    });
+}
+
 Known<Link> linkOf(const Gathering& g) {
     Known<Link> link = gatherLink(g.sources.interfaceName, g.until);
+    if (link && link->master)
+        g.sources.notes.once(
+            link->interfaceName + " is part of " + link->master->name +
+            ", which has its addresses: they, and what is asked over the network, are those of " +
+            link->master->name);
     if (g.topic.isJoined() && link && link->joined && optsOutOfTests(link->joined->says.name)) {
         return failure(Reason::badConfiguration, "the network's name asks not to be looked at (_nomap)");
     }
@@ -100,11 +125,12 @@ Store regulation(const Gathering& g) {
 }
 
 Store addresses(const Gathering& g) {
-    return fromLink(g, &Facts::addresses, [&](const Link& found) { return gatherAddresses(found, g.until); });
+    return fromAddressed(g, &Facts::addresses,
+                         [&](const Link& found) { return gatherAddresses(found, g.until); });
 }
 
 Store gatewayEcho(const Gathering& g) {
-    return fromLink(g, &Facts::gatewayEcho, [&](const Link& found) {
+    return overNetwork(g, &Facts::gatewayEcho, [&](const Link& found) {
         Known<Echo> echo = gatherGatewayEcho(found, g.sources.gatewayEcho, *g.stay, g.until);
         const bool isSilent =
             echo && std::ranges::none_of(echo->roundTrips, [](auto& each) { return each.has_value(); });
@@ -116,7 +142,7 @@ Store gatewayEcho(const Gathering& g) {
 }
 
 Store setup(const Gathering& g) {
-    return fromLink(g, &Facts::setup, [&](const Link& found) { return gatherSetup(found, g.until); });
+    return fromAddressed(g, &Facts::setup, [&](const Link& found) { return gatherSetup(found, g.until); });
 }
 
 Store saved(const Gathering& g) {
@@ -152,7 +178,7 @@ Store allowedChannels(const Gathering& g) {
 }
 
 Store outsideEcho(const Gathering& g) {
-    return fromLink(g, &Facts::outsideEcho, [&](const Link& found) {
+    return overNetwork(g, &Facts::outsideEcho, [&](const Link& found) {
         return gatherOutsideEcho(found, g.sources.config.endpoints, g.sources.outsideEcho, *g.stay, g.until);
     });
 }
@@ -161,7 +187,7 @@ Store outsideEcho(const Gathering& g) {
 template <class T, class Gather>
 Store fromSetup(const Gathering& g, Known<T> Facts::*place, Gather gather) {
     if (g.facts.link && !g.facts.setup) return kept<T>(place, g.facts.setup.error());
-    return fromLink(g, place, [&](const Link& found) -> Known<T> { return gather(found, *g.facts.setup); });
+    return overNetwork(g, place, [&](const Link& found) { return gather(found, *g.facts.setup); });
 }
 
 Store nameAnswer(const Gathering& g) {
@@ -183,7 +209,7 @@ Store vendorService(const Gathering& g) {
 }
 
 Store router(const Gathering& g) {
-    return fromLink(g, &Facts::router, [&](const Link& found) { return gatherRouter(found, g.until); });
+    return overNetwork(g, &Facts::router, [&](const Link& found) { return gatherRouter(found, g.until); });
 }
 
 Store translation(const Gathering& g) {

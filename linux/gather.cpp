@@ -10,6 +10,7 @@
 #include <cmath>
 #include <map>
 
+#include "linux/link_master.h"
 #include "linux/route_dump.h"
 #include "linux/route_messages.h"
 #include "service/ip_address.h"
@@ -146,11 +147,21 @@ Known<Link> gatherLink(const std::optional<std::string>& wantedInterface, const 
     const Known<RadioInterface> chosen = chooseInterface(*stations, wantedInterface);
     if (!chosen) return chosen.error();
     Link link{chosen->name, chosen->index, chosen->radio, isUp(chosen->name), std::nullopt};
+    if (const auto links = routeDump<ifinfomsg>(RTM_GETLINK, "interfaces", until))
+        link.master = readMaster(*links, link.interfaceIndex);
     if (!link.up) return link;
     Known<std::optional<AccessPoint>> joined = radio->joined(link.interfaceIndex, until);
     if (!joined) return joined.error();
     link.joined = std::move(*joined);
     return link;
+}
+
+Link addressed(const Link& link) {
+    Link whole = link;
+    if (!link.master) return whole;
+    whole.interfaceName = link.master->name;
+    whole.interfaceIndex = link.master->index;
+    return whole;
 }
 
 Known<Station> gatherStation(const Link& link, const Until& until) {

@@ -17,6 +17,9 @@ namespace wp {
 /// The Wi-Fi interface to look at: the named one, else the first that has joined a network, else the first.
 Known<Link> gatherLink(const std::optional<std::string>& wantedInterface, const Until& until);
 
+/// The link as its addresses, routes and set-up know it: under name and number of the bridge or bond that it is part of.
+Link addressed(const Link& link);
+
 /// The link's parameters and its signal, sampled over one second.
 Known<Station> gatherStation(const Link& link, const Until& until);
 Known<Survey> gatherSurvey(const Link& link, const Until& until);

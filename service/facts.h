@@ -12,6 +12,15 @@
 
 namespace wp {
 
+/// The bridge or bond that an interface is part of.
+struct LinkMaster {
+    std::string name;
+    std::uint32_t index = 0;
+    bool sendsElsewhere =
+        false;  ///< the interface only stands by: what is sent over the whole leaves by another part
+    friend bool operator==(const LinkMaster&, const LinkMaster&) = default;
+};
+
 /// The Wi-Fi interface that is looked at, and what it is joined to.
 struct Link {
     std::string interfaceName;
@@ -19,6 +28,8 @@ struct Link {
     std::uint32_t radio = 0;  ///< the kernel's number of the radio
     bool up = false;
     std::optional<AccessPoint> joined;  ///< the access point, as the kernel keeps it up to date
+    /// What has addresses and routes in the interface's place; absent where it has them itself.
+    std::optional<LinkMaster> master{};
 };
 
 /// What the driver says of the link to the joined access point.

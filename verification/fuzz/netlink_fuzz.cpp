@@ -1,3 +1,4 @@
+#include "linux/link_master.h"
 #include "linux/radio_messages.h"
 #include "linux/route_messages.h"
 
@@ -16,5 +17,6 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     readScanEvents(buffer);
     readAddresses(buffer, 3);
     readGateways(buffer, 3);
+    readMaster(buffer, 3);
     return 0;
 }
