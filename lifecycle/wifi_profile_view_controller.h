@@ -2,6 +2,7 @@
 
 #include <atomic>
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <optional>
 #include <string>
@@ -540,6 +541,7 @@ class WiFiProfileViewController final : public DiagnosticViewController,
     void selectName(const std::optional<std::string>& name);
     void takeFromList(const WiFiScanResultPointer& network);
     void putBackPreviousNetwork();
+    void inBatch(const std::function<void()>& changes);
 
     std::optional<std::string> previousSelectedNetworkName_;
 

@@ -73,15 +73,19 @@ void WiFiProfileViewController::putBackPreviousNetwork() {
     insertPreviousSelectedNetwork(previous);
 }
 
+/// Changes as one batch of the table; before there is one the selection changes all the same.
+void WiFiProfileViewController::inBatch(const std::function<void()>& changes) {
+    if (tableView_) tableView_->beginUpdates();
+    changes();
+    if (tableView_) tableView_->endUpdates();
+}
+
 void WiFiProfileViewController::updateSelectedNetwork(const WiFiScanResultPointer& network) {
-    if (!tableView_) return;
-    tableView_->beginUpdates();
-    selectName(network->ssid);
-    takeFromList(network);
-    tableView_->endUpdates();
-    tableView_->beginUpdates();
-    putBackPreviousNetwork();
-    tableView_->endUpdates();
+    inBatch([&] {
+        selectName(network->ssid);
+        takeFromList(network);
+    });
+    inBatch([&] { putBackPreviousNetwork(); });
 }
 
 void WiFiProfileViewController::reloadSelectedNetwork(bool hadSelection) {
@@ -142,14 +146,12 @@ void WiFiProfileViewController::textFieldAlertDidChange(ui::TextField&) {
 }
 
 void WiFiProfileViewController::updateSelectedNetworkFromOtherWithSSID(const std::string& ssid) {
-    if (!tableView_ || inputs_->selectedNetworkName() == ssid) return;
-    tableView_->beginUpdates();
-    selectName(ssid);
-    if (WiFiScanResultPointer listed = filteredNetworks().network(ssid)) takeFromList(listed);
-    tableView_->endUpdates();
-    tableView_->beginUpdates();
-    putBackPreviousNetwork();
-    tableView_->endUpdates();
+    if (inputs_->selectedNetworkName() == ssid) return;
+    inBatch([&] {
+        selectName(ssid);
+        if (WiFiScanResultPointer listed = filteredNetworks().network(ssid)) takeFromList(listed);
+    });
+    inBatch([&] { putBackPreviousNetwork(); });
 }
 
 }  // namespace wp

@@ -150,6 +150,16 @@ TEST_F(Neighbourhood, ATypedBlankIsANetworksName) {
     EXPECT_EQ(run.list(), "(SELECTED_NETWORK)   / (CHOOSE_NETWORK) Cafe, Home, Zoo / >OTHER / REFRESH");
 }
 
+TEST_F(Neighbourhood, ASelectionBeforeThereAreViewsIsKeptAndShownWithThem) {
+    run.controller->updateSelectedNetworkFromOtherWithSSID("Attic");
+    run.controller->updateSelectedNetwork(scanEntry({"Cafe", "2"}));
+
+    EXPECT_EQ(run.selected(), "Cafe");
+    EXPECT_EQ(run.controller->previousSelectedNetworkName(), "Attic");
+    run.showList();
+    EXPECT_EQ(run.list(), "(SELECTED_NETWORK) >Cafe / (CHOOSE_NETWORK) Home, Zoo / OTHER / REFRESH");
+}
+
 TEST_F(Neighbourhood, CancelLeavesEverythingAsItWas) {
     showJoined();
 
