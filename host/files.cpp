@@ -59,12 +59,16 @@ std::string readFile(const std::string& option, const std::string& path) {
     }
 }
 
+std::filesystem::path installedResource(const std::filesystem::path& name) {
+    return (programFolder() / "../../share/wifi-profile" / name).lexically_normal();
+}
+
 std::optional<std::filesystem::path> resourceFile(const std::filesystem::path& name) {
-    std::filesystem::path program = programFolder();
-    for (const char* folder : {"resources", "../resources", "../../share/wifi-profile"}) {
-        std::filesystem::path candidate = (program / folder / name).lexically_normal();
+    const std::filesystem::path program = programFolder();
+    for (const std::filesystem::path& file :
+         {program / "resources" / name, program / "../resources" / name, installedResource(name)}) {
         std::error_code error;
-        if (std::filesystem::is_regular_file(candidate, error)) return candidate;
+        if (std::filesystem::is_regular_file(file, error)) return file.lexically_normal();
     }
     return std::nullopt;
 }

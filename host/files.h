@@ -14,6 +14,9 @@ void occupyStandardDescriptors();
 /// reason. *Main*.
 std::string readFile(const std::string& option, const std::string& path);
 
+/// Where an installed program keeps a file of `resources/`, whether it is there or not. *Any*.
+std::filesystem::path installedResource(const std::filesystem::path& name);
+
 /// A file of the product's `resources/` folder: beside the program, in the source tree around the build
 /// folder, or where an installed program keeps it. Nothing where it is in none of them. *Any*.
 std::optional<std::filesystem::path> resourceFile(const std::filesystem::path& name);

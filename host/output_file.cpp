@@ -87,6 +87,22 @@ std::optional<std::string> writeAll(int descriptor, std::string_view bytes) {
     return std::nullopt;
 }
 
+void refuseOneFileForTwo(std::initializer_list<NamedFile> files) {
+    for (const NamedFile& first : files) {
+        const bool isStream = first.path == "-" && first.use == FileUse::read;
+        if (!first.path || first.path == "/dev/null" || isStream) continue;
+        for (const NamedFile* second = &first + 1; second != files.end(); ++second) {
+            if (second->use == FileUse::read || !second->path) continue;
+            if (finalFile(*first.path) != finalFile(*second->path)) continue;
+            const std::string other = first.use == FileUse::read
+                                          ? std::string("that ") + first.option + " reads"
+                                          : std::string("of ") + first.option + " too";
+            refuse(std::string(second->option) + ": " + *second->path + ": is the file " + other +
+                   "; give another");
+        }
+    }
+}
+
 OutputFile::OutputFile(std::string option, std::string path, std::optional<mode_t> mode)
     : option_(std::move(option)), path_(std::move(path)), mode_(mode) {
     std::string place = option_ + ": " + path_ + ": ";

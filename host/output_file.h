@@ -3,6 +3,7 @@
 #include <sys/types.h>
 
 #include <filesystem>
+#include <initializer_list>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -14,6 +15,19 @@ std::optional<std::string> writeAll(int descriptor, std::string_view bytes);
 
 /// The file that the path leads to in the end, all links followed, whether there is one yet or not. *Any*.
 std::filesystem::path finalFile(const std::string& path);
+
+enum class FileUse { read, written };
+
+/// What an option names: no file, a file, or `-` for a standard stream.
+struct NamedFile {
+    const char* option;
+    std::optional<std::string> path;
+    FileUse use;
+};
+
+/// Throws `Exit` (status 2) where a file is to be written that an option before it names too: what is read from
+/// it would be lost, or one output the other. *Main*.
+void refuseOneFileForTwo(std::initializer_list<NamedFile> files);
 
 /// A file that is written whole or not at all: the bytes go to a new file beside it, which takes its place
 /// when they are on the disk. An earlier file keeps its mode, and survives every failure. What is no regular

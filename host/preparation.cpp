@@ -3,7 +3,9 @@
 #include <fcntl.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <cstdlib>
+#include <string_view>
 
 #include "host/exit.h"
 #include "host/files.h"
@@ -27,9 +29,12 @@ std::shared_ptr<const Recording> loaded(const std::string& option, const std::st
 }
 
 std::shared_ptr<const Recording> demo(const std::string& name) {
-    std::optional<std::filesystem::path> file;
-    bool isPlain = name.find('/') == std::string::npos && name.front() != '.';
-    if (isPlain) file = resourceFile("recordings/" + name + ".json");
+    const bool isPlain = name.find('/') == std::string::npos && name.front() != '.';
+    const std::string place = "recordings/" + name + ".json";
+    const std::optional<std::filesystem::path> file = isPlain ? resourceFile(place) : std::nullopt;
+    constexpr std::string_view kShipped[] = {"home", "troubled", "selected"};
+    if (!file && std::ranges::find(kShipped, name) != std::end(kShipped))
+        refuse("--demo: " + installedResource(place).string() + ": not found; it is part of the program");
     if (!file)
         refuse("--demo: no recording \"" + name +
                "\" ships with the program; give home, troubled or selected");
@@ -87,24 +92,6 @@ std::optional<OutputFile> outputFile(const char* option, const std::optional<std
     return OutputFile(option, *path, mode);
 }
 
-void refuseOneFileForTwo(const RunOptions& options) {
-    const std::pair<const char*, const std::optional<std::string>*> files[] = {
-        {"--output", &options.outputFile},
-        {"--record", &options.recordFile},
-        {"--automation", &options.automationFile},
-        {"--transcript", &options.transcriptFile}};
-    for (std::size_t i = 0; i < std::size(files); ++i) {
-        const std::optional<std::string>& first = *files[i].second;
-        if (!first || *first == "/dev/null") continue;
-        for (std::size_t j = i + 1; j < std::size(files); ++j) {
-            const std::optional<std::string>& second = *files[j].second;
-            if (!second || finalFile(*first) != finalFile(*second)) continue;
-            refuse(std::string(files[j].first) + ": " + *second + ": is the file of " + files[i].first +
-                   " too; give another");
-        }
-    }
-}
-
 }  // namespace
 
 LocaleChoice localeChoice(const std::optional<std::string>& name) {
@@ -132,7 +119,13 @@ Preparation prepare(const RunOptions& options) {
     // Before anything is measured, so that nothing measured is lost.
     if (asksForList(*prepared.parameters) || options.format == OutputFormat::text) needUnicode();
     prepared.script = scriptOf(options, prepared.screen);
-    refuseOneFileForTwo(options);
+    refuseOneFileForTwo({{"--request", options.requestFile, FileUse::read},
+                         {"--replay", options.replayFile, FileUse::read},
+                         {"--config", options.configFile, FileUse::read},
+                         {"--output", options.outputFile, FileUse::written},
+                         {"--record", options.recordFile, FileUse::written},
+                         {"--automation", options.automationFile, FileUse::written},
+                         {"--transcript", options.transcriptFile, FileUse::written}});
     prepared.output = outputFile("--output", options.outputFile);
     prepared.record = outputFile("--record", options.recordFile, kRecordingMode);
     prepared.automation = outputFile("--automation", options.automationFile);

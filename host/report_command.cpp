@@ -50,6 +50,10 @@ Thresholds thresholdsOf(const ReportOptions& options) {
 int writeReport(const ReportOptions& options) {
     Texts texts(localeChoice(options.locale).stringTable);
     Thresholds thresholds = thresholdsOf(options);
+    refuseOneFileForTwo({{"report", options.file, FileUse::read},
+                         {"--compare", options.compareFile, FileUse::read},
+                         {"--config", options.configFile, FileUse::read},
+                         {"--output", options.outputFile, FileUse::written}});
     std::optional<OutputFile> output;
     if (options.outputFile && *options.outputFile != "-") output.emplace("--output", *options.outputFile);
     Evidence evidence = evidenceFromFile("report", options.file, options);

@@ -197,7 +197,9 @@ void Run::onTest(const TestStep& step) {
 void Run::setUp() {
     ExtensionObjects objects = module_.makeObjects(platform_);
     if (!objects.inputs->validateAndInitializeParameters(prepared_.parameters)) {
-        std::string source = options_.requestFile ? "--request: " + *options_.requestFile : "request";
+        std::string source = "request";
+        if (const std::optional<std::string>& file = options_.requestFile)
+            source = "--request: " + (*file == "-" ? std::string("standard input") : *file);
         refuse(source + ": " + objects.inputs->failureReason());
     }
     controller_ = objects.controller;

@@ -106,7 +106,7 @@ Known<RadioSocket> RadioSocket::open(const Until& until) {
     if (answer.error == ECANCELED || answer.error == ETIME)
         return failureOf(answer.error, "Wi-Fi of the kernel");
     std::optional<RadioFamily> family = readFamily(answer.messages);
-    if (!family) return failure(Reason::unavailable, "the kernel knows no Wi-Fi (nl80211)");
+    if (!family) return failure(Reason::noInterface, "the kernel knows no Wi-Fi (nl80211)");
     return RadioSocket(std::move(*questions), std::move(*family));
 }
 

@@ -71,6 +71,7 @@ TEST(GatherRadio, WithoutTheInterfaceSaysWhatIsMissing) {
     const bool namesIt = link.error().message == "the kernel knows no Wi-Fi (nl80211)" ||
                          link.error().message == "no Wi-Fi interface named no-such-wifi";
     EXPECT_TRUE(namesIt) << link.error().text();
+    EXPECT_EQ(link.error().code, static_cast<int>(Reason::noInterface));
 }
 
 TEST(GatherRadio, OfALinkThatHasJoinedNothingNothingIsAsked) {
