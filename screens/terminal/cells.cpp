@@ -19,6 +19,25 @@ Cell ellipsis(Charset charset) {
     return {charset == Charset::unicode ? L"\u2026" : L"~", 1};
 }
 
+/// What stands on a terminal of ASCII alone for the marks that texts are set with; empty: an escape does.
+std::string_view plainMark(char32_t c) {
+    switch (c) {
+        case 0x2013:
+            return "-";
+        case 0x2018:
+        case 0x2019:
+            return "'";
+        case 0x201C:
+        case 0x201D:
+        case 0x201E:
+            return "\"";
+        case 0x2026:
+            return "...";
+        default:
+            return {};
+    }
+}
+
 class Composer {
   public:
     explicit Composer(Charset charset) : charset_(charset) {}
@@ -28,7 +47,10 @@ class Composer {
         auto wide = static_cast<wchar_t>(c);
         bool isSendable = c < 0x7F || charset_ == Charset::unicode;
         int width = isSendable ? wcwidth(wide) : -1;
-        if (width > 0) {
+        std::string_view plain = isSendable ? std::string_view() : plainMark(c);
+        if (!plain.empty()) {
+            addPlain(plain);
+        } else if (width > 0) {
             cells_.push_back({{wide}, width});
             takesMarks_ = true;
         } else if (width < 0 || !addMark(wide)) {
@@ -50,8 +72,11 @@ class Composer {
     void addEscape(char32_t c) {
         std::array<char, 16> text{};
         std::snprintf(text.data(), text.size(), "\\u{%04X}", static_cast<unsigned>(c));
-        for (char letter : std::string_view(text.data()))
-            cells_.push_back({{static_cast<wchar_t>(letter)}, 1});
+        addPlain(text.data());
+    }
+
+    void addPlain(std::string_view text) {
+        for (char letter : text) cells_.push_back({{static_cast<wchar_t>(letter)}, 1});
         takesMarks_ = false;
     }
 

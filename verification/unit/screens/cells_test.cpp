@@ -79,6 +79,7 @@ TEST_F(CellsTest, NeverHoldAControlCharacter) {
 
 TEST_F(CellsTest, HoldOnlyAsciiWhereTheTerminalHasNoMore) {
     EXPECT_EQ(shown("Café 東", Charset::ascii), L"Caf\\u{00E9} \\u{6771}");
+    EXPECT_EQ(shown("Other… “Home” – it’s", Charset::ascii), L"Other... \"Home\" - it's");
 }
 
 TEST_F(CellsTest, ShowWhatTheSystemKnowsNoWidthOfAsAnEscape) {
