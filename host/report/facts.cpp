@@ -20,7 +20,7 @@ constexpr Latency kEchoLatency{100, 1500};
 constexpr Latency kNameLatency{kSlowName.count(), kVerySlowName.count()};
 constexpr Latency kServiceLatency{500, 1000};
 
-constexpr int kHighest2GHzChannel = 14;
+constexpr int kHighest2GHzChannel = 14, kHighest5GHzChannel = 177;
 
 /// Collects the facts of one part.
 class Collector {
@@ -118,8 +118,10 @@ void Collector::addChannel() {
     std::optional<double> channel = numberIn(section_, "currentChannel");
     if (!channel) return;
     const char* band = *channel <= kHighest2GHzChannel ? "BAND_2" : "BAND_5";
-    // A channel's number alone does not tell 5 and 6 GHz apart.
-    if (textIn(joinedIn(detailsOf(input_.evidence, part_, 24)), "band") == "6GHz") band = "BAND_6";
+    // A channel's number alone does not tell 5 and 6 GHz apart, but where only the latter has one so high.
+    if (*channel > kHighest5GHzChannel ||
+        textIn(joinedIn(detailsOf(input_.evidence, part_, 24)), "band") == "6GHz")
+        band = "BAND_6";
     add("FACT_CHANNEL", texts_.text("FACT_CHANNEL_VALUE",
                                     {{"channel", texts_.number(*channel, 0)}, {"band", texts_.text(band)}}));
 }
@@ -135,7 +137,7 @@ void Collector::addPing(const char* label, const char* key) {
     DictionaryPointer ping = dictionaryIn(section_, key);
     std::optional<double> time = numberIn(ping, "avg"), loss = numberIn(ping, "packetLoss"),
                           count = numberIn(ping, "count");
-    if (!time || !loss || !count) return;
+    if (!time || !loss || !count || !(*loss >= 0 && *loss <= 1)) return;
     const char* word = latencyWord(*time, kEchoLatency);
     add(label, texts_.text("FACT_PING_VALUE", {{"time", echoTime(*time, texts_)},
                                                {"word", texts_.text(word)},

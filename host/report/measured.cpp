@@ -1,7 +1,5 @@
 #include "host/report/measured.h"
 
-#include <cmath>
-
 #include "platform/records.h"
 #include "platform/ui/display_text.h"
 
@@ -24,7 +22,7 @@ std::shared_ptr<const PingStatistics> pingOf(const Answer* answer) {
 /// From the answers, since the result keeps the numbers of a ping only when it was answered.
 std::string pingValue(const Check& check, const Texts& texts) {
     std::shared_ptr<const PingStatistics> ping = pingOf(check.answer);
-    if (!ping || !std::isfinite(ping->packetLoss)) return "";
+    if (!ping || !(ping->packetLoss >= 0 && ping->packetLoss <= 1)) return "";
     double answered = static_cast<double>(ping->count) * (1 - ping->packetLoss);
     return texts.text("PING_VALUE",
                       {{"answered", texts.number(answered, 0)}, {"count", std::to_string(ping->count)}});

@@ -4,6 +4,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <cmath>
 
 #include "exchange/json_reader.h"
 #include "exchange/place.h"
@@ -246,6 +247,21 @@ TEST(Report, NoAnswerIsSaidToTakeNoTime) {
 
     ASSERT_FALSE(report.facts.empty());
     EXPECT_EQ(report.facts[0].value, "answers in <0.1 ms (quick), 0 of 5 requests lost");
+}
+
+TEST(Report, ALossThatIsNoShareIsNotTold) {
+    for (double loss : {-0.1, 1.5, 1e300, std::nan("")}) {
+        DictionaryPointer ping = Dictionary::make({{"avg", 2.0}, {"packetLoss", loss}, {"count", 5}});
+        EXPECT_TRUE(reportOn(withJoined({{"pingLANResult", ping}})).facts.empty()) << loss;
+    }
+}
+
+TEST(Report, AChannelAboveThoseOf5GHzIsOneOf6GHz) {
+    for (auto [channel, value] : {std::pair{177, "177 (5 GHz)"}, std::pair{233, "233 (6 GHz)"}}) {
+        Report report = reportOn(withJoined({{"currentChannel", channel}}));
+        ASSERT_EQ(report.facts.size(), 1U);
+        EXPECT_EQ(report.facts[0].value, value);
+    }
 }
 
 TEST(Report, ASilentHostBesideOneThatAnswersAlarmsNobody) {
