@@ -1,6 +1,7 @@
 #include "linux/files/dnsmasq.h"
 
 #include <algorithm>
+#include <filesystem>
 #include <set>
 
 #include "linux/files/address_list.h"
@@ -17,11 +18,13 @@ struct Option {
     const char* name;
     bool hasValue;
 };
-constexpr Option kOptions[] = {{'r', "resolv-file", true},    {'R', "no-resolv", false},
-                               {'S', "server", true},         {'C', "conf-file", true},
-                               {'7', "conf-dir", true},       {'p', "port", true},
-                               {'a', "listen-address", true}, {'I', "except-interface", true},
-                               {'\0', "servers-file", true},  {'1', "enable-dbus", false}};
+constexpr Option kOptions[] = {
+    {'r', "resolv-file", true},    {'R', "no-resolv", false},       {'S', "server", true},
+    {'C', "conf-file", true},      {'7', "conf-dir", true},         {'p', "port", true},
+    {'a', "listen-address", true}, {'I', "except-interface", true}, {'\0', "servers-file", true},
+    {'1', "enable-dbus", false},   {'\0', "local", true},           {'i', "interface", true}};
+// Letters of the command line that take no value, so that others may follow in one word.
+constexpr std::string_view kFlags = "159DEKLNRZbdefhknoqvwyz";
 
 std::vector<std::string> partsOf(const std::string& list) {
     std::string spaced = list;
@@ -48,21 +51,34 @@ void addFile(const std::string& file, DnsmasqSettings& into) {
 
 bool answersHere(const DnsmasqSettings& settings) {
     const auto isHere = [](const IPAddress& each) { return each.loopback() || each.unspecified(); };
-    return settings.answersAtAll &&
-           (settings.listensAt.empty() || std::ranges::any_of(settings.listensAt, isHere));
+    // To interfaces that it is told of it adds loopback itself.
+    return settings.answersAtAll && settings.answersAtUsualPort &&
+           (settings.listensAt.empty() || settings.namesInterfaces ||
+            std::ranges::any_of(settings.listensAt, isHere));
 }
 
 void set(const std::string& name, const std::string& value, DnsmasqSettings& into) {
     if (name == "resolv-file") into.resolverFiles.push_back(value);
     if (name == "no-resolv") into.readsResolverFiles = false;
-    if (name == "server") addServer(value, into);
+    if (name == "server" || name == "local") addServer(value, into);
     if (name == "conf-file" || name == "servers-file") addFile(value, into);
     if (name == "conf-dir" && into.folders.size() < kMostFiles) into.folders.push_back(value);
     if (name == "enable-dbus") into.heedsBus = true;
-    if (name == "port" && value == "0") into.answersAtAll = false;
+    if (name == "port") into.answersAtUsualPort = value == "53";
+    if (name == "interface") into.namesInterfaces = true;
     if (name == "listen-address") add(into.listensAt, addressesIn(value));
     if (name == "except-interface" && std::ranges::count(partsOf(value), "lo") != 0)
         into.answersAtAll = false;
+}
+
+/// A word of the command line without letters that others follow: "-kR", "-kS9.9.9.9".
+std::string withoutFlags(std::string word, DnsmasqSettings& into) {
+    while (word.size() > 2 && word[0] == '-' && kFlags.find(word[1]) != kFlags.npos) {
+        if (word[1] == 'R') into.readsResolverFiles = false;
+        if (word[1] == '1') into.heedsBus = true;
+        word.erase(1, 1);
+    }
+    return word;
 }
 
 /// "PATH,.old,*.conf": whether a file of the folder counts.
@@ -108,16 +124,22 @@ DnsmasqSettings settingsOf(const std::vector<std::string>& command, const std::s
     return settings;
 }
 
+/// Of several files it goes by the one that was written last.
+std::string newestOf(const std::vector<std::string>& files, const std::string& root) {
+    const auto writtenAt = [&](const std::string& file) {
+        std::error_code failed;
+        const auto at = std::filesystem::last_write_time(root + file, failed);
+        return failed ? std::filesystem::file_time_type::min() : at;
+    };
+    return files.empty() ? "/etc/resolv.conf" : *std::ranges::max_element(files, {}, writtenAt);
+}
+
 DnsmasqServers serversOf(const DnsmasqSettings& settings, const std::string& root) {
     DnsmasqServers servers{without(settings.servers, settings.special), settings.servers, settings.heedsBus};
     if (!settings.readsResolverFiles) return servers;
-    auto files = settings.resolverFiles;
-    if (files.empty()) files.emplace_back("/etc/resolv.conf");
-    for (const std::string& file : files) {
-        const auto text = readSmallFile(root + file);
-        for (const IPAddress& each : text ? serversFromResolverFile(*text) : std::vector<IPAddress>())
-            if (!each.loopback()) servers.asked.push_back(each);
-    }
+    const auto text = readSmallFile(root + newestOf(settings.resolverFiles, root));
+    for (const IPAddress& each : text ? serversFromResolverFile(*text) : std::vector<IPAddress>())
+        if (!each.loopback()) servers.asked.push_back(each);
     return servers;
 }
 
@@ -125,16 +147,17 @@ DnsmasqServers serversOf(const DnsmasqSettings& settings, const std::string& roo
 
 void readDnsmasqFile(std::string_view text, DnsmasqSettings& into) {
     for (std::string_view line : linesOf(text)) {
-        line = trimmed(line.substr(0, line.find('#') == 0 ? 0 : line.find(" #")));
+        line = trimmed(uncommented(line));
         const std::size_t equals = line.find('=');
-        const std::string name(trimmed(line.substr(0, equals)));
-        set(name, equals == line.npos ? "" : std::string(trimmed(line.substr(equals + 1))), into);
+        std::string value(equals == line.npos ? "" : trimmed(line.substr(equals + 1)));
+        std::erase(value, '"');
+        set(std::string(trimmed(line.substr(0, equals))), value, into);
     }
 }
 
 void readDnsmasqCommand(const std::vector<std::string>& words, DnsmasqSettings& into) {
     for (std::size_t i = 1; i < words.size(); ++i) {
-        const std::string& word = words[i];
+        const std::string word = withoutFlags(words[i], into);
         const std::size_t equals = word.find('=');
         const bool isLong = word.starts_with("--");
         if (word.size() < 2 || word[0] != '-') continue;
@@ -147,7 +170,8 @@ void readDnsmasqCommand(const std::vector<std::string>& words, DnsmasqSettings& 
             value = word.substr(equals + 1);
         else if (!isLong && word.size() > 2)
             value = word.substr(2);
-        else if (option->hasValue && i + 1 < words.size())
+        // The long form of one option does without a value.
+        else if (option->hasValue && !(isLong && option->letter == 'C') && i + 1 < words.size())
             value = words[++i];
         set(option->name, value, into);
         if (option->letter == 'C') into.readsDefaultFile = false;

@@ -12,10 +12,13 @@ namespace wp {
 /// What dnsmasq is told, by its command line and its files, of whom it asks for names.
 struct DnsmasqSettings {
     std::vector<IPAddress> servers;  ///< entered by a person, for all names
-    std::vector<IPAddress> special;  ///< of them those that it asks at another port, or over one interface alone
+    std::vector<IPAddress>
+        special;  ///< of them those that it asks at another port, or over one interface alone
     std::vector<std::string> resolverFiles;
     bool readsResolverFiles = true;
     bool answersAtAll = true;          ///< and not on other interfaces than loopback alone
+    bool answersAtUsualPort = true;    ///< where those ask who go by the resolver's file
+    bool namesInterfaces = false;      ///< on which it answers beside its addresses, and on loopback then
     std::vector<IPAddress> listensAt;  ///< empty: everywhere
     bool heedsBus = false;             ///< somebody may tell it servers over the message bus
     std::vector<std::string> files;    ///< with more settings

@@ -108,6 +108,40 @@ TEST_F(DnsmasqOf, ADeviceIsTheOneThatAnswersHere) {
     EXPECT_EQ(found(), "nothing") << "either may answer";
 }
 
+TEST_F(DnsmasqOf, ADeviceGoesByTheResolversFileThatWasWrittenLast) {
+    write("/a", "nameserver 192.168.1.1\n");
+    write("/b", "nameserver 192.168.1.2\n");
+    runs(12, {"dnsmasq", "-r/a", "-r", "/b", "--resolv-file=/none"});
+    const auto now = std::filesystem::last_write_time(folder_ / "a");
+    std::filesystem::last_write_time(folder_ / "b", now - std::chrono::seconds(9));
+    EXPECT_EQ(found(), "192.168.1.1 | ");
+    std::filesystem::last_write_time(folder_ / "b", now + std::chrono::seconds(9));
+    EXPECT_EQ(found(), "192.168.1.2 | ");
+}
+
+TEST_F(DnsmasqOf, ADeviceHasFormsOfTheirOwn) {
+    write("/etc/resolv.conf", "nameserver 192.168.1.1\n");
+    write("/etc/dnsmasq.conf", "no-resolv\t# x\n  # server=10.9.9.9\nlocal=\"9.9.9.9\"\t# y\nlocal=/lan/\n");
+    runs(12, {"dnsmasq", "-k"});
+    EXPECT_EQ(found(), "9.9.9.9 | 9.9.9.9 ");
+    runs(12, {"dnsmasq", "-kRS1.1.1.1", "--conf-file"});
+    EXPECT_EQ(found(), "1.1.1.1 | 1.1.1.1 ");
+    runs(12, {"dnsmasq", "--conf-file", "--no-resolv", "-kS", "1.1.1.1"});
+    EXPECT_EQ(found(), "1.1.1.1 | 1.1.1.1 ");
+}
+
+TEST_F(DnsmasqOf, ADeviceAnswerOnLoopbackBesideInterfacesThatAreNamedAndAtTheUsualPort) {
+    write("/etc/resolv.conf", "nameserver 192.168.1.1\n");
+    runs(12, {"dnsmasq", "-C", "/dev/null", "-a", "10.42.0.1"});
+    EXPECT_EQ(found(), "nothing");
+    runs(12, {"dnsmasq", "-C", "/dev/null", "-a", "10.42.0.1", "-i", "eth0"});
+    EXPECT_EQ(found(), "192.168.1.1 | ");
+    runs(12, {"dnsmasq", "-C", "/dev/null", "-p", "5353"});
+    EXPECT_EQ(found(), "nothing") << "another answers at the usual one";
+    runs(12, {"dnsmasq", "-C", "/dev/null", "--port=53"});
+    EXPECT_EQ(found(), "192.168.1.1 | ");
+}
+
 TEST(DnsmasqSettings, CutOrTwistedAreReadAsFarAsTheyGo) {
     const std::string text = "no-resolv\nserver=9.9.9.9\nconf-dir=/x,*.y\nlisten-address=::1,\nport=0\n";
     for (std::size_t size = 0; size <= text.size(); ++size) {
