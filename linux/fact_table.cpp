@@ -5,6 +5,7 @@
 
 #include "linux/gather_reach.h"
 #include "linux/gather_setup.h"
+#include "linux/within_memory.h"
 #include "service/thresholds.h"
 
 namespace wp {
@@ -36,8 +37,8 @@ Store stored(const Gathering& g, Known<T> Facts::*place, Known<T> found) {
 /// A store of what the function makes of the link, or of the reason why there is no link.
 template <class T, class Gather>
 Store fromLink(const Gathering& g, Known<T> Facts::*place, Gather gather) {
-    if (g.facts.link) return stored(g, place, Known<T>(gather(*g.facts.link)));
-    return kept<T>(place, g.facts.link.error());
+    if (!g.facts.link) return kept<T>(place, g.facts.link.error());
+    return stored(g, place, withinMemory([&] { return Known<T>(gather(*g.facts.link)); }));
 }
 
 Error leavesByAnother(const Link& link) {
@@ -94,7 +95,7 @@ Error isDown(const Link& link) {
 }
 
 Store link(const Gathering& g) {
-    return stored(g, &Facts::link, linkOf(g));
+    return stored(g, &Facts::link, withinMemory([&] { return linkOf(g); }));
 }
 
 Store nearby(const Gathering& g) {
@@ -150,7 +151,7 @@ Store saved(const Gathering& g) {
 }
 
 Store bluetooth(const Gathering& g) {
-    return stored(g, &Facts::bluetooth, gatherBluetooth(g.until));
+    return stored(g, &Facts::bluetooth, withinMemory([&] { return gatherBluetooth(g.until); }));
 }
 
 Store driverSharesAirtime(const Gathering& g) {

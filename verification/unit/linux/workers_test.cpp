@@ -7,6 +7,8 @@
 #include <latch>
 #include <thread>
 
+#include "linux/within_memory.h"
+
 namespace wp {
 namespace {
 
@@ -33,6 +35,15 @@ TEST(WorkersTest, PiecesThatWaitForEachOtherAllRunAtOnceAndPublishOnTheOwnersThr
     }
     publish(inbox, published, kPieces);
     EXPECT_EQ(published, kPieces);
+}
+
+TEST(WithinMemory, AFactThatNoMemoryIsLeftForIsAnErrorThatSaysSo) {
+    const Known<std::string> fits = withinMemory([]() -> Known<std::string> { return std::string("a"); });
+    const Known<std::string> tooMuch = withinMemory([]() -> Known<std::string> { throw std::bad_alloc(); });
+    ASSERT_TRUE(fits);
+    EXPECT_EQ(*fits, "a");
+    ASSERT_FALSE(tooMuch);
+    EXPECT_EQ(tooMuch.error().message, "there is not enough memory");
 }
 
 TEST(WorkersTest, WhatIsStillWorkedOnWhenTheyGoIsWaitedForAndDropped) {
