@@ -94,8 +94,8 @@ LinkSetup setupFromNetworkd(Known<Bus>& bus, const Link& link, const NetworkdLin
     add(names.manual, without(asked.entered, names.offered));
     names.effective = asked.all;
     names.offerKnown = asked.ofLinkAlone || !leadsElsewhere(link, until);
-    // Servers of a router's advertisement stand nowhere but in the list that is asked.
-    if (*managed.methods.ipv6 == "auto")
+    // Where it does not tell, servers of a router's advertisement stand nowhere but in the list that is asked.
+    if (!managed.advertisementsKnown && *managed.methods.ipv6 == "auto")
         for (const IPAddress& each : names.effective)
             if (!each.isIPv4()) names.offered.push_back(each);
     setup.servers = own.empty() ? names.effective : own;

@@ -4,6 +4,7 @@
 #include <functional>
 
 #include "linux/dbus/network_records.h"
+#include "linux/files/address_list.h"
 #include "service/access_point.h"
 
 namespace wp {
@@ -83,7 +84,7 @@ bool readServers(Bus& bus, const std::string& path, const std::string& kind, con
 /// `dns-data` has both as texts.
 void addManual(const BusValue& family, std::vector<IPAddress>& servers) {
     for (const BusValue& each : family["dns-data"].list())
-        if (const auto address = IPAddress::fromText(each.text())) servers.push_back(*address);
+        if (const auto address = serverFrom(each.text())) servers.push_back(*address);
     if (!family["dns-data"].list().empty()) return;
     for (const BusValue& each : family["dns"].list()) {
         std::optional<IPAddress> address;
@@ -171,7 +172,7 @@ Known<std::vector<IPAddress>> networkManagerGlobalServers(Bus& bus, const Until&
     if (!global && global.error().code == static_cast<int>(Reason::notFound)) return servers;
     if (!global) return global.error();
     for (const BusValue& each : (*global)["domains"]["*"]["servers"].list())
-        if (const auto address = IPAddress::fromText(each.text())) servers.push_back(*address);
+        if (const auto address = serverFrom(each.text())) servers.push_back(*address);
     return servers;
 }
 
@@ -185,7 +186,7 @@ Known<std::vector<IPAddress>> networkManagerServersElsewhere(Bus& bus, const std
         const std::string of = each["interface"].text();
         // Servers for all interfaces name none.
         for (const BusValue& text : each["nameservers"].list())
-            if (const auto address = IPAddress::fromText(text.text()))
+            if (const auto address = serverFrom(text.text()))
                 (of.empty() || of == interfaceName ? here : servers).push_back(*address);
     }
     std::erase_if(servers, [&](const IPAddress& each) {

@@ -16,4 +16,14 @@ std::vector<IPAddress> addressesIn(std::string_view list) {
     }
 }
 
+std::optional<IPAddress> serverFrom(std::string_view text) {
+    if (const std::size_t scheme = text.find("://"); scheme != text.npos) text.remove_prefix(scheme + 3);
+    text = text.substr(0, text.find('#'));
+    if (text.starts_with("[")) return IPAddress::fromText(text.substr(1, text.find(']') - 1));
+    // One colon alone parts the port from an address of IPv4.
+    const std::size_t colon = text.find(':');
+    const bool isPort = colon != text.npos && text.find(':', colon + 1) == text.npos;
+    return IPAddress::fromText(isPort ? text.substr(0, colon) : text);
+}
+
 }  // namespace wp

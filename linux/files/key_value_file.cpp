@@ -19,6 +19,22 @@ std::string unquoted(std::string_view text) {
     return std::string(quoted ? text.substr(1, text.size() - 2) : text);
 }
 
+/// A line with its continuations: "[SECTION]" or "KEY=VALUE".
+void readUnitLine(std::string_view line, std::string& section, UnitFile& into) {
+    if (line.starts_with("[") && line.ends_with("]")) {
+        section = line.substr(1, line.size() - 2);
+        return;
+    }
+    const std::size_t equals = line.find('=');
+    if (equals == line.npos || section.empty()) return;
+    auto& values = into[section][std::string(trimmed(line.substr(0, equals)))];
+    const std::string_view value = trimmed(line.substr(equals + 1));
+    if (value.empty())
+        values.clear();
+    else
+        values.emplace_back(value);
+}
+
 }  // namespace
 
 std::optional<std::string> readSmallFile(const std::string& path, std::size_t longest) {
@@ -92,23 +108,18 @@ std::map<std::string, std::string> readAssignments(std::string_view text) {
 }
 
 void readUnitFile(std::string_view text, UnitFile& into) {
-    std::string section;
+    std::string section, whole;
     for (std::string_view line : linesOf(text)) {
         line = trimmed(line);
-        if (line.empty() || line[0] == '#' || line[0] == ';') continue;
-        if (line.front() == '[' && line.back() == ']') {
-            section = line.substr(1, line.size() - 2);
-            continue;
-        }
-        const std::size_t equals = line.find('=');
-        if (equals == line.npos || section.empty()) continue;
-        auto& values = into[section][std::string(trimmed(line.substr(0, equals)))];
-        const std::string_view value = trimmed(line.substr(equals + 1));
-        if (value.empty())
-            values.clear();
-        else
-            values.emplace_back(value);
+        if (line.starts_with("#") || line.starts_with(";")) continue;
+        const bool goesOn = line.ends_with("\\");
+        if (goesOn) line.remove_suffix(1);
+        whole.append(line).append(goesOn ? " " : "");
+        if (goesOn) continue;
+        readUnitLine(trimmed(whole), section, into);
+        whole.clear();
     }
+    readUnitLine(trimmed(whole), section, into);
 }
 
 }  // namespace wp

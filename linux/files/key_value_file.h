@@ -27,7 +27,7 @@ std::string_view uncommented(std::string_view line);
 std::map<std::string, std::string> readAssignments(std::string_view text);
 
 /// The settings of a unit file: section, then key, then the values in their order; an empty value clears those
-/// before it. *Any* thread.
+/// before it. A line that ends in a backslash goes on with the next that is no comment. *Any* thread.
 using UnitFile = std::map<std::string, std::map<std::string, std::vector<std::string>>>;
 void readUnitFile(std::string_view text, UnitFile& into);
 

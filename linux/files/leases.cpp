@@ -6,6 +6,7 @@
 
 #include "linux/files/address_list.h"
 #include "linux/files/key_value_file.h"
+#include "linux/files/octets.h"
 #include "linux/utc_time.h"
 #include "service/plain_text.h"
 
@@ -14,13 +15,34 @@ namespace {
 
 constexpr std::size_t kLongestUri = 2048, kLongestText = 512;
 
-std::string_view withoutQuotes(std::string_view text) {
-    const bool isQuoted = text.size() >= 2 && text.front() == '"' && text.back() == '"';
-    return isQuoted ? text.substr(1, text.size() - 2) : text;
+bool isOctal(std::string_view digits) {
+    return digits.size() == 3 && digits[0] <= '3' &&
+           std::ranges::all_of(digits, [](char each) { return each >= '0' && each <= '7'; });
+}
+
+/// What stands in double quotes with a backslash before quotes, backslashes and a byte's three octal digits; or, where some
+/// of its bytes are no text, all of them in hexadecimal.
+std::string bytesFrom(std::string_view value) {
+    const bool isQuoted = value.size() >= 2 && value.front() == '"' && value.back() == '"';
+    if (!isQuoted) return octetsFrom(value).value_or(std::string(value));
+    value = value.substr(1, value.size() - 2);
+    std::string bytes;
+    for (std::size_t at = 0; at < value.size(); ++at) {
+        const std::string_view digits = value.substr(at + 1, 3);
+        if (value[at] != '\\' || at + 1 == value.size()) {
+            bytes += value[at];
+        } else if (isOctal(digits)) {
+            bytes += static_cast<char>((digits[0] - '0') * 64 + (digits[1] - '0') * 8 + digits[2] - '0');
+            at += 3;
+        } else {
+            bytes += value[++at];
+        }
+    }
+    return bytes;
 }
 
 std::string textFrom(std::string_view value) {
-    return plainText(withoutQuotes(value), kLongestText);
+    return plainText(bytesFrom(value), kLongestText);
 }
 
 /// "4 2026/11/20 18:30:00" in UTC; "never" and "epoch N" are the other forms.
@@ -80,7 +102,7 @@ void readStatement(std::string_view line, Block& block, std::int64_t now) {
         block.lease.vendorText += textFrom(value);
     if (name == "default-url" || name == "unknown-114" ||
         (name == "v4-captive-portal" && block.lease.portalApi.empty()))
-        block.lease.portalApi = portalUriFrom(withoutQuotes(value));
+        block.lease.portalApi = portalUriFrom(bytesFrom(value));
 }
 
 /// An address that a lease of DHCPv6 grants; or a prefix, which is passed over.
@@ -124,7 +146,7 @@ void readStatement6(std::string_view line, Block6& block) {
     if (name == "interface") block.interfaceName = textFrom(value);
     if (name == "dhcp6.name-servers") block.lease.servers = addressesIn(value);
     if (name == "dhcp6.v6-captive-portal" || name == "dhcp6.unknown-103")
-        block.lease.portalApi = portalUriFrom(withoutQuotes(value));
+        block.lease.portalApi = portalUriFrom(bytesFrom(value));
 }
 
 bool isInForce(const Grant& grant, const std::vector<IPAddress>& assigned, std::int64_t now) {

@@ -1,8 +1,14 @@
 #include "linux/files/networkd.h"
 
-#include <algorithm>
+#include <strings.h>
 
+#include <algorithm>
+#include <filesystem>
+
+#include "linux/files/address_list.h"
+#include "linux/files/folder.h"
 #include "linux/files/leases.h"
+#include "linux/files/octets.h"
 #include "linux/files/processes.h"
 #include "service/plain_text.h"
 
@@ -23,7 +29,9 @@ std::string lastOf(const UnitFile& settings, const std::string& key, const std::
 }
 
 bool isYes(const std::string& value) {
-    return value == "yes" || value == "true" || value == "1" || value == "on";
+    constexpr const char* kYes[] = {"yes", "y", "true", "t", "1", "on"};
+    return std::ranges::any_of(kYes,
+                               [&](const char* each) { return ::strcasecmp(each, value.c_str()) == 0; });
 }
 
 /// Whether an address of the family stands in the settings.
@@ -38,20 +46,24 @@ bool hasAddress(const UnitFile& settings, bool ipv4) {
 
 void addServers(const std::string& words, std::vector<IPAddress>& servers) {
     for (const std::string& word : wordsOf(words))
-        // A port or a name for encryption may follow.
-        if (const auto address = IPAddress::fromText(word.substr(0, word.find('#'))))
-            servers.push_back(*address);
+        if (const auto address = serverFrom(word)) add(servers, {*address});
 }
 
-UnitFile readSettings(const std::map<std::string, std::string>& state, const std::string& root) {
+/// A file's settings, and then those of the files that add to it: of all its folders in the order of their names, each name from
+/// the first folder that has it.
+UnitFile readSettings(const std::string& file, const std::string& root) {
+    constexpr const char* kFolders[] = {"/etc", "/run", "/usr/local/lib", "/usr/lib", "/lib"};
+    std::map<std::string, std::string> more;
+    for (const char* each : kFolders) {
+        const std::string folder =
+            root + each + "/systemd/network/" + std::filesystem::path(file).filename().string() + ".d";
+        for (const std::string& name : namesIn(folder))
+            if (name.ends_with(".conf")) more.emplace(name, folder + "/" + name);
+    }
     UnitFile settings;
-    std::vector<std::string> files = {state.at("NETWORK_FILE")};
-    if (const auto more = state.find("NETWORK_FILE_DROPINS"); more != state.end())
-        for (const std::string& each : wordsOf(more->second))
-            files.push_back(
-                each.substr(each.find_first_not_of('"') == each.npos ? 0 : each.find_first_not_of('"')));
-    for (const std::string& file : files)
-        if (const auto text = readSmallFile(root + file)) readUnitFile(*text, settings);
+    if (const auto text = readSmallFile(root + file)) readUnitFile(*text, settings);
+    for (const auto& [name, path] : more)
+        if (const auto text = readSmallFile(path)) readUnitFile(*text, settings);
     return settings;
 }
 
@@ -69,7 +81,7 @@ void addLease(const std::map<std::string, std::string>& lease, NetworkdLink& lin
     link.hasLease = !value("ADDRESS").empty();
     addServers(value("DNS"), link.offeredServers);
     link.portalApi = portalUriFrom(value("CAPTIVE_PORTAL"));
-    link.vendorText = plainText(value("VENDOR_SPECIFIC"));
+    link.vendorText = plainText(octetsFrom(value("VENDOR_SPECIFIC")).value_or(""));
 }
 
 }  // namespace
@@ -100,13 +112,20 @@ std::optional<NetworkdLink> readNetworkdLink(unsigned interfaceIndex, const std:
     if (!text || !mayRun("systemd-networkd", root)) return std::nullopt;
     const auto state = readAssignments(*text);
     if (state.count("NETWORK_FILE") == 0 || isLeftAlone(state)) return std::nullopt;
-    const UnitFile settings = readSettings(state, root);
+    const UnitFile settings = readSettings(state.at("NETWORK_FILE"), root);
     NetworkdLink link;
     link.methods = methodsFromNetworkd(settings);
     for (const std::string& words : valuesOf(settings, "Network", "DNS"))
         addServers(words, link.manualServers);
     if (const auto lease = readSmallFile(root + "/run/systemd/netif/leases/" + number))
         addLease(readAssignments(*lease), link);
+    // All servers of the link: besides those entered they are of a lease, or a router advertised them.
+    if (const auto all = state.find("DNS"); all != state.end()) {
+        std::vector<IPAddress> known;
+        addServers(all->second, known);
+        add(link.offeredServers, without(known, link.manualServers));
+        link.advertisementsKnown = true;
+    }
     // From its version 254 on: of DHCPv4, DHCPv6 or a router's advertisement.
     if (const auto portal = state.find("CAPTIVE_PORTAL"); portal != state.end())
         link.portalApi = portalUriFrom(portal->second);

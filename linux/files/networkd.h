@@ -14,6 +14,7 @@ struct NetworkdLink {
     AddressMethods methods;
     std::vector<IPAddress> manualServers;
     std::vector<IPAddress> offeredServers;
+    bool advertisementsKnown = false;  ///< whether those that a router advertised are among them
     bool hasLease = false;
     std::string portalApi;   ///< what lease or advertisement names; empty where none does
     std::string vendorText;  ///< of the lease

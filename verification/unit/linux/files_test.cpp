@@ -6,6 +6,7 @@
 #include "linux/files/iwd_settings.h"
 #include "linux/files/leases.h"
 #include "linux/files/networkd.h"
+#include "linux/files/octets.h"
 #include "linux/files/proxy_settings.h"
 #include "linux/files/user_folder.h"
 #include "linux/utc_time.h"
@@ -266,8 +267,7 @@ TEST(Networkd, SettingsBecomeMethods) {
 
 TEST_F(Root, OfASystemWithNetworkdTellsMethodsServersAndLease) {
     write("/run/systemd/netif/links/3",
-          "ADMIN_STATE=configured\nNETWORK_FILE=/etc/systemd/network/wlan0.network\n"
-          "NETWORK_FILE_DROPINS=\"/etc/systemd/network/wlan0.network.d/dns.conf\"\n");
+          "ADMIN_STATE=configured\nNETWORK_FILE=/etc/systemd/network/wlan0.network\n");
     write("/etc/systemd/network/wlan0.network", "[Match]\nName=wlan0\n[Network]\nDHCP=ipv4\n");
     write("/etc/systemd/network/wlan0.network.d/dns.conf", "[Network]\nDNS=9.9.9.9#dns.example 2620:fe::9\n");
     write("/run/systemd/netif/leases/3",
@@ -282,6 +282,37 @@ TEST_F(Root, OfASystemWithNetworkdTellsMethodsServersAndLease) {
     EXPECT_TRUE(link->hasLease);
     EXPECT_EQ(link->portalApi, "https://p.example/");
     EXPECT_FALSE(readNetworkdLink(4, root_));
+}
+
+TEST_F(Root, OfASystemWithNetworkdHasSettingsThatAddToAFile) {
+    write("/run/systemd/netif/links/3", "NETWORK_FILE=/run/systemd/network/wlan0.network\n");
+    write("/run/systemd/network/wlan0.network", "[Network]\nDHCP=yes\nDNS=9.9.9.9\n");
+    write("/run/systemd/network/wlan0.network.d/b.conf", "[Network]\nDNS=10.9.9.9\n");
+    write("/usr/lib/systemd/network/wlan0.network.d/a.conf", "[Network]\nDNS=\nDNS=1.1.1.1\n");
+    write("/etc/systemd/network/wlan0.network.d/b.conf",
+          "[Network]\nDNS=8.8.8.8:5353%wlan0#dns.example \\\n; no comment goes on \\\n  [2620:fe::9]:53 \\\n"
+          "# nor parts a line\n 2620:fe::10#x\nDHCP=\\\nNO");
+    write("/etc/systemd/network/wlan0.network.d/b.dpkg-old", "[Network]\nDNS=10.9.9.8\n");
+    const auto link = readNetworkdLink(3, root_);
+    ASSERT_TRUE(link);
+    EXPECT_EQ(textsOf(link->manualServers), "1.1.1.1 8.8.8.8 2620:fe::9 2620:fe::10 ");
+    EXPECT_EQ(*link->methods.ipv4, "disabled");
+}
+
+TEST_F(Root, OfASystemWithNetworkdTellsWhatWasAdvertisedAndTheVendorsText) {
+    write("/run/systemd/netif/links/3",
+          "NETWORK_FILE=/etc/systemd/network/wlan0.network\nDNS=9.9.9.9 192.168.1.1 2001:db8::53#x "
+          "fe80::1%3\n");
+    write("/etc/systemd/network/wlan0.network", "[Network]\nDHCP=TRUE\nDNS=9.9.9.9\n");
+    write("/run/systemd/netif/leases/3",
+          "ADDRESS=192.168.1.20\nDNS=192.168.1.1\n"
+          "VENDOR_SPECIFIC=4558414d504c455f4d45544552454400\n");
+    const auto link = readNetworkdLink(3, root_);
+    ASSERT_TRUE(link);
+    EXPECT_EQ(*link->methods.ipv4, "auto");
+    EXPECT_EQ(textsOf(link->offeredServers), "192.168.1.1 2001:db8::53 fe80::1 ");
+    EXPECT_TRUE(link->advertisementsKnown);
+    EXPECT_EQ(link->vendorText, "EXAMPLE_METERED");
 }
 
 TEST_F(Root, OfASystemWithNetworkdTellsThePortalOfAnAdvertisementToo) {
@@ -412,6 +443,45 @@ TEST_F(DhcpClientsIn, ASystemMayLookAtAdvertisementsThemselves) {
     write("/proc/13/cmdline", commandOf({"/usr/sbin/dhcpcd", "wlan0"}));
     EXPECT_TRUE(clientsOf("wlan0").asksRouters);
     EXPECT_FALSE(clientsOf("wlan1").asksRouters);
+}
+
+TEST(AddressList, HasNameServersAsResolversWriteThem) {
+    const auto read = [](const char* text) {
+        const auto server = serverFrom(text);
+        return server ? server->text() : "none";
+    };
+    EXPECT_EQ(read("9.9.9.9"), "9.9.9.9");
+    EXPECT_EQ(read("9.9.9.9:53"), "9.9.9.9");
+    EXPECT_EQ(read("9.9.9.9%wlan0#dns.example"), "9.9.9.9");
+    EXPECT_EQ(read("2620:fe::9#dns.example"), "2620:fe::9");
+    EXPECT_EQ(read("fe80::1%wlan0"), "fe80::1");
+    EXPECT_EQ(read("[2620:fe::9]:853%wlan0"), "2620:fe::9");
+    EXPECT_EQ(read("dns+tls://9.9.9.9:853#dns.example"), "9.9.9.9");
+    EXPECT_EQ(read("dns+udp://[fe80::1%25wlan0]:53"), "fe80::1");
+    for (const char* none : {"", "#", "[", "[]", "::::", "://", "dns.example:53", "[2620:fe::9", ":53"})
+        EXPECT_EQ(read(none), std::string_view(none) == "[2620:fe::9" ? "2620:fe::9" : "none") << none;
+}
+
+TEST(Octets, StandInHexadecimalOneAfterAnotherOrByThemselves) {
+    EXPECT_EQ(octetsFrom("4558").value_or("none"), "EX");
+    EXPECT_EQ(octetsFrom("45:58:a").value_or("none"), "EX\n");
+    EXPECT_EQ(octetsFrom("").value_or("none"), "");
+    for (const char* none : {"455", "45:", ":45", "45::58", "4g", "0x45", "+4", "045:58", "45 58"})
+        EXPECT_FALSE(octetsFrom(none)) << none;
+}
+
+TEST(Leases, TextsMayHaveBytesThatAreNone) {
+    const auto vendorText = [](const std::string& value) {
+        return lease4(
+                   "lease {\ninterface \"w\";\nfixed-address 10.0.0.2;\noption vendor-encapsulated-options " +
+                       value + ";\nexpire never;\n}\n",
+                   "w", "10.0.0.2", 0)
+            ->vendorText;
+    };
+    EXPECT_EQ(vendorText("45:58:41:0:4d:a"), "EXAM");
+    EXPECT_EQ(vendorText("\"a\\\"b\\\\c\\303\\277\""), "a\"b\\c\xC3\xBF");
+    EXPECT_EQ(vendorText("\"a\\477\\\""), "a477\\");
+    EXPECT_EQ(vendorText("\""), "\"");
 }
 
 TEST_F(Root, FoldersAreReadInTheOrderOfTheirNamesAsFarAsIsAllowed) {

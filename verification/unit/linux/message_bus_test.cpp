@@ -257,6 +257,15 @@ TEST_F(MessageBus, NetworkManagerTellsItsNetworks) {
               "Cellar 0 hidden\n");
 }
 
+TEST(NetworkManagerSettings, NameServersAsAPersonMayWriteThem) {
+    using Map = BusValue::Map;
+    BusValue::List servers;
+    for (const char* each : {"9.9.9.9#dns.example", "dns+tls://[2620:fe::9]:853#dns.example", "bogus"})
+        servers.emplace_back(std::string(each));
+    const BusValue settings(Map{{"ipv4", BusValue(Map{{"dns-data", BusValue(std::move(servers))}})}});
+    EXPECT_EQ(textsOf(manualServers(settings)), "9.9.9.9 2620:fe::9 ");
+}
+
 TEST(NetworkManagerSettings, BindAConnectionByNameAndByHardware) {
     using Map = BusValue::Map;
     const auto isBound = [](const char* section, const char* key, BusValue value,
