@@ -93,36 +93,41 @@ NetlinkAnswer NetlinkSocket::receive(const Until& until) {
     }
 }
 
-NetlinkAnswer NetlinkSocket::gather(std::uint32_t sequence, const Until& until) {
-    NetlinkAnswer answer;
-    bool changed = false;
+bool GatheredAnswer::take(Bytes messages) {
+    Bytes rest = messages;
+    for (Bytes before = rest; const auto message = takeNetlinkMessage(rest); before = rest) {
+        if (message->sequence != sequence_) continue;  // of a question that was given up
+        changed_ = changed_ || (message->flags & NLM_F_DUMP_INTR);
+        if (message->type == NLMSG_ERROR || message->type == NLMSG_DONE) {
+            answer_.error = statusIn(*message);
+            return true;
+        }
+        answer_.messages.insert(answer_.messages.end(), before.begin(), rest.begin());
+    }
+    return false;
+}
+
+GatheredAnswer NetlinkSocket::gather(std::uint32_t sequence, const Until& until) {
+    GatheredAnswer gathered(sequence);
     for (;;) {
         NetlinkAnswer part = receive(until);
-        if (part.error != 0) return part;
-        Bytes rest = part.messages;
-        for (Bytes before = rest; const auto message = takeNetlinkMessage(rest); before = rest) {
-            if (message->sequence != sequence) continue;  // of a question that was given up
-            changed = changed || (message->flags & NLM_F_DUMP_INTR);
-            if (message->type == NLMSG_ERROR || message->type == NLMSG_DONE) {
-                answer.error = statusIn(*message);
-                if (answer.error == 0 && changed) answer.error = EAGAIN;
-                return answer;
-            }
-            answer.messages.insert(answer.messages.end(), before.begin(), rest.begin());
-        }
+        if (part.error != 0)
+            gathered.answer() = std::move(part);
+        else if (!gathered.take(part.messages))
+            continue;
+        return gathered;
     }
 }
 
 NetlinkAnswer NetlinkSocket::ask(NetlinkRequest& request, const Until& until) {
-    NetlinkAnswer answer;
-    for (int attempt = 0; attempt < kDumpAttempts; ++attempt) {
+    for (int attempt = 1;; ++attempt) {
         request.message().nlmsg_seq = ++sequence_;
         if (mnl_socket_sendto(socket_.get(), &request.message(), request.message().nlmsg_len) < 0)
             return {errno, {}};
-        answer = gather(sequence_, until);
-        if (answer.error != EAGAIN) break;
+        GatheredAnswer gathered = gather(sequence_, until);
+        const bool isWorthAnother = gathered.answer().error == 0 && gathered.changed();
+        if (!isWorthAnother || attempt == kDumpAttempts) return std::move(gathered.answer());
     }
-    return answer;
 }
 
 }  // namespace wp

@@ -50,14 +50,32 @@ struct NetlinkAnswer {
     std::vector<std::uint8_t> messages;  ///< as they came, one after another, without the end
 };
 
+/// What the kernel answers to one request, put together from what is received. *Any* thread, one at a time.
+class GatheredAnswer {
+  public:
+    explicit GatheredAnswer(std::uint32_t sequence) : sequence_(sequence) {}
+
+    /// Takes in what came; whether the answer is complete. Messages of other requests are passed over.
+    bool take(Bytes messages);
+    /// Whether what was listed changed meanwhile, so that one of it may be missing, or be there twice.
+    bool changed() const { return changed_; }
+    NetlinkAnswer& answer() { return answer_; }
+
+  private:
+    std::uint32_t sequence_;
+    bool changed_ = false;
+    NetlinkAnswer answer_;
+};
+
 /// A netlink socket. One thread at a time.
 class NetlinkSocket {
   public:
     /// @param protocol `NETLINK_GENERIC` or `NETLINK_ROUTE`
     static Known<NetlinkSocket> open(int protocol);
 
-    /// Sends the request and gathers the answer up to its end or acknowledgement. A dump that the kernel changed
-    /// meanwhile is asked for again. The error is `ETIME` or `ECANCELED` when the wait for the answer ended.
+    /// Sends the request and gathers the answer up to its end or acknowledgement. What changed while the kernel listed it
+    /// is asked for again, a few times; where it changes all the time the last list has to do. The error is `ETIME` or
+    /// `ECANCELED` when the wait for the answer ended.
     NetlinkAnswer ask(NetlinkRequest& request, const Until& until);
 
     /// Also receives what the group is told; returns whether that was possible.
@@ -73,7 +91,7 @@ class NetlinkSocket {
     };
     explicit NetlinkSocket(mnl_socket* socket);
 
-    NetlinkAnswer gather(std::uint32_t sequence, const Until& until);
+    GatheredAnswer gather(std::uint32_t sequence, const Until& until);
 
     std::unique_ptr<mnl_socket, Close> socket_;
     std::unique_ptr<std::uint8_t[]> buffer_;  ///< not cleared: most answers touch little of it

@@ -1,7 +1,12 @@
 #include "linux/netlink_reader.h"
 
 #include <gtest/gtest.h>
+#include <linux/netlink.h>
 
+#include <cerrno>
+#include <cstring>
+
+#include "linux/netlink_socket.h"
 #include "verification/unit/linux/captured.h"
 
 namespace wp {
@@ -48,6 +53,46 @@ TEST(NetlinkReader, ReadsATextUpToItsZero) {
     const Buffer buffer{7, 0, 1, 0, 'U', 'S', 0, 0};
 
     EXPECT_EQ("US", Attributes{Bytes(buffer)}.text(1));
+}
+
+/// A message of an answer; its content is one number.
+Buffer part(std::uint16_t type, std::uint32_t sequence, std::uint16_t flags, std::int32_t number) {
+    const nlmsghdr header{sizeof header + sizeof number, type, flags, sequence, 0};
+    Buffer bytes(header.nlmsg_len);
+    std::memcpy(bytes.data(), &header, sizeof header);
+    std::memcpy(bytes.data() + sizeof header, &number, sizeof number);
+    return bytes;
+}
+
+constexpr std::uint16_t kContent = 0x1C;
+
+TEST(GatheredAnswer, IsCompleteWithItsEnd) {
+    GatheredAnswer gathered(7);
+
+    EXPECT_FALSE(gathered.take(part(kContent, 7, NLM_F_MULTI, 1)));
+    EXPECT_FALSE(gathered.take(part(NLMSG_DONE, 6, NLM_F_MULTI, 0)));
+    EXPECT_TRUE(gathered.take(part(NLMSG_DONE, 7, NLM_F_MULTI, 0)));
+    EXPECT_EQ(part(kContent, 7, NLM_F_MULTI, 1), gathered.answer().messages);
+    EXPECT_EQ(0, gathered.answer().error);
+    EXPECT_FALSE(gathered.changed());
+}
+
+TEST(GatheredAnswer, OfAListThatChangedMeanwhileSaysSoAndHoldsWhatCame) {
+    GatheredAnswer gathered(7);
+    gathered.take(part(kContent, 7, NLM_F_MULTI | NLM_F_DUMP_INTR, 1));
+
+    EXPECT_TRUE(gathered.take(part(NLMSG_DONE, 7, NLM_F_MULTI, 0)));
+    EXPECT_TRUE(gathered.changed());
+    EXPECT_EQ(0, gathered.answer().error);
+    EXPECT_FALSE(gathered.answer().messages.empty());
+}
+
+TEST(GatheredAnswer, TellsADriverThatIsBusyFromAListThatChanged) {
+    GatheredAnswer gathered(7);
+
+    EXPECT_TRUE(gathered.take(part(NLMSG_ERROR, 7, 0, -EAGAIN)));
+    EXPECT_EQ(EAGAIN, gathered.answer().error);
+    EXPECT_FALSE(gathered.changed());
 }
 
 TEST(NetlinkReader, EndsAtAMessageThatBreaksOff) {
