@@ -18,6 +18,8 @@ constexpr int kListenAttempts = 3;
 constexpr std::chrono::seconds kManagersDelay{10};
 // A scan of others mostly calls: 30 to 110 ms on each of some 40 channels, more slowly while the radio is joined.
 constexpr std::chrono::seconds kLongestRunningScan{8};
+// What keeps firmware busy that is no scan of the kernel's: joining a network, or a search of its own.
+constexpr std::chrono::seconds kBusyFirmware{2};
 
 bool is(const Error& error, Reason reason) {
     return error.code == static_cast<int>(reason);
@@ -186,7 +188,8 @@ class ScanRun {
         if (const Wait wait = leave(row, away); wait != Wait::ready) return waitFailure(wait, "scan");
         const int error = radio_.startScan(wish_.interfaceIndex, row.next(), until_);
         if (error == EINVAL && row.skip()) return std::nullopt;
-        if (error == EBUSY) return waitForOthers(row, away);
+        if (error == EBUSY) return waitForOthers(row, away, kLongestRunningScan);
+        if (error == EAGAIN) return waitForOthers(row, away, kBusyFirmware);
         if (error != 0) return startFailure(error);
         const Known<ScanEvent> end = radio_.nextScanEnd(wish_.interfaceIndex, until_);
         if (end) {
@@ -199,11 +202,10 @@ class ScanRun {
 
     /// Waits until the scan that is in the way has ended, on whichever interface of the radio. Where nobody tells its end
     /// the row asks again.
-    std::optional<Error> waitForOthers(ScanRow& row, Away& away) {
+    std::optional<Error> waitForOthers(ScanRow& row, Away& away, std::chrono::seconds atMost) {
         away.takenByOthers();
         keepHeard();
-        const Known<ScanEvent> end =
-            radio_.nextScanEndOfRadio(wish_.radio, until_.within(kLongestRunningScan));
+        const Known<ScanEvent> end = radio_.nextScanEndOfRadio(wish_.radio, until_.within(atMost));
         const bool isUntold = !end && is(end.error(), Reason::timeout) && Clock::now() < until_.deadline;
         if (!end && !isUntold) return end.error();
         row.ended(ScanRow::Whose::others, end ? *end : ScanEvent{ScanEvent::Kind::aborted, 0, {}, false, 0});
@@ -234,14 +236,7 @@ class ScanRun {
         std::erase_if(*found, [&](const AccessPoint& each) {
             return !each.joined && each.lastSeen && *each.lastSeen < oldest;
         });
-        const std::size_t known = found->size();
-        for (const AccessPoint& each : heard_) {
-            const auto isSame = [&](const AccessPoint& other) {
-                return other.address == each.address && other.frequency == each.frequency;
-            };
-            if (std::none_of(found->begin(), found->begin() + static_cast<std::ptrdiff_t>(known), isSame))
-                found->push_back(each);
-        }
+        addForgotten(*found, heard_);
         return found;
     }
 
@@ -314,6 +309,20 @@ Known<RadioSocket> openRadio(const Until& until) {
 }
 
 }  // namespace
+
+void addForgotten(std::vector<AccessPoint>& found, const std::vector<AccessPoint>& heard) {
+    // The kernel keeps those that hide twice, by their beacon and with the name that they told when they were called.
+    const auto isSame = [](const AccessPoint& one, const AccessPoint& other) {
+        return one.address == other.address && one.frequency == other.frequency &&
+               one.says.name.absent() == other.says.name.absent();
+    };
+    const std::size_t known = found.size();
+    for (const AccessPoint& each : heard) {
+        const auto end = found.begin() + static_cast<std::ptrdiff_t>(known);
+        if (std::none_of(found.begin(), end, [&](const AccessPoint& other) { return isSame(each, other); }))
+            found.push_back(each);
+    }
+}
 
 void ScanMemory::keep(std::uint32_t interfaceIndex, const ScanReport& report) {
     if (!report.completedAt) return;

@@ -16,6 +16,9 @@ struct ScanReport {
     std::optional<std::int64_t> completedAt;
 };
 
+/// Adds those access points of `heard` that `found`, a later list, lacks. *Any* thread.
+void addForgotten(std::vector<AccessPoint>& found, const std::vector<AccessPoint>& heard);
+
 /// What is asked of the scanner.
 struct ScanWish {
     std::string interfaceName;

@@ -115,5 +115,24 @@ TEST(ScanMemory, KeepsAScanOverWhatWasHeardWithoutOne) {
     EXPECT_EQ(memory.serving(wish), nullptr);
 }
 
+TEST(AddForgotten, KeepsTheNameOfAnAccessPointWhoseBeaconHidesIt) {
+    const auto heard = [](std::uint8_t last, std::string_view name) {
+        AccessPoint each;
+        each.address = {2, 0, 0, 0, 0, last};
+        each.frequency = 2412;
+        each.says.name = NetworkName({reinterpret_cast<const std::uint8_t*>(name.data()), name.size()});
+        return each;
+    };
+    std::vector<AccessPoint> found = {heard(1, ""), heard(2, "Northlight")};
+    found[1].signal = -50;
+
+    addForgotten(found, {heard(1, ""), heard(1, "Blue Kite"), heard(2, "Northlight"), heard(3, "Cafe")});
+
+    ASSERT_EQ(4U, found.size());
+    EXPECT_EQ(-50, found[1].signal);
+    EXPECT_EQ("Blue Kite", textFromName(found[2].says.name));
+    EXPECT_EQ("Cafe", textFromName(found[3].says.name));
+}
+
 }  // namespace
 }  // namespace wp
