@@ -90,10 +90,6 @@ ScanWish wishOf(const Gathering& g, const Link& link) {
             ScanWish::Manner::calling, std::nullopt};
 }
 
-Error isDown(const Link& link) {
-    return failure(Reason::noInterface, link.interfaceName + " is down");
-}
-
 Store link(const Gathering& g) {
     return stored(g, &Facts::link, withinMemory([&] { return linkOf(g); }));
 }

@@ -8,8 +8,10 @@
 
 #include <algorithm>
 #include <cmath>
+#include <filesystem>
 #include <map>
 
+#include "linux/files/key_value_file.h"
 #include "linux/link_master.h"
 #include "linux/route_dump.h"
 #include "linux/route_messages.h"
@@ -120,8 +122,8 @@ bool isOfHomeAlone(const Counted& counted) {
 }
 
 Error notJoined(const Link& link) {
-    const std::string reason = link.up ? " is not joined to a network" : " is down";
-    return failure(link.up ? Reason::notJoined : Reason::noInterface, link.interfaceName + reason);
+    if (!link.up) return isDown(link);
+    return failure(Reason::notJoined, link.interfaceName + " is not joined to a network");
 }
 
 }  // namespace
@@ -149,6 +151,7 @@ Known<Link> gatherLink(const std::optional<std::string>& wantedInterface, const 
     Link link{chosen->name, chosen->index, chosen->radio, isUp(chosen->name), std::nullopt};
     if (const auto links = routeDump<ifinfomsg>(RTM_GETLINK, "interfaces", until))
         link.master = readMaster(*links, link.interfaceIndex);
+    link.switchedOff = !link.up && isSwitchedOff(link.interfaceName);
     if (!link.up) return link;
     Known<std::optional<AccessPoint>> joined = radio->joined(link.interfaceIndex, until);
     if (!joined) return joined.error();
@@ -164,16 +167,33 @@ Link addressed(const Link& link) {
     return whole;
 }
 
+bool isSwitchedOff(const std::string& interfaceName, const std::string& root) {
+    std::error_code failed;
+    std::filesystem::directory_iterator each(root + "/sys/class/net/" + interfaceName + "/phy80211", failed);
+    for (const std::filesystem::directory_iterator end; !failed && each != end; each.increment(failed)) {
+        if (!each->path().filename().string().starts_with("rfkill")) continue;
+        for (const char* const kind : {"/soft", "/hard"})
+            if (readSmallFile(each->path().string() + kind, 64).value_or("").starts_with("1")) return true;
+    }
+    return false;
+}
+
+Error isDown(const Link& link) {
+    const char* const why = link.switchedOff ? " is down: Wi-Fi is switched off" : " is down";
+    return failure(Reason::noInterface, link.interfaceName + why);
+}
+
 Known<Station> gatherStation(const Link& link, const Until& until) {
     if (!link.joined) return notJoined(link);
     Known<RadioSocket> radio = RadioSocket::open(until);
     if (!radio) return radio.error();
-    Known<Station> station = radio->station(link.interfaceIndex, until);
+    const MacAddress& accessPoint = link.joined->peer();
+    Known<Station> station = radio->station(link.interfaceIndex, accessPoint, until);
     for (int sample = 1; station && sample < kSignalSamples; ++sample) {
         if (waitReadable(-1, until.within(kBetweenSamples)) == Wait::stopped) {
             return waitFailure(Wait::stopped, "signal");
         }
-        const Known<Station> next = radio->station(link.interfaceIndex, until);
+        const Known<Station> next = radio->station(link.interfaceIndex, accessPoint, until);
         if (!next) break;  // the link went away meanwhile: what was heard of it stands
         std::ranges::copy(next->signals, std::back_inserter(station->signals));
     }

@@ -19,6 +19,10 @@ Known<Link> gatherLink(const std::optional<std::string>& wantedInterface, const 
 
 /// The link as its addresses, routes and set-up know it: under name and number of the bridge or bond that it is part of.
 Link addressed(const Link& link);
+/// Whether a switch, of software or of hardware, keeps the interface's radio off. \param root a root folder
+bool isSwitchedOff(const std::string& interfaceName, const std::string& root = "");
+/// The reason why nothing can be told of an interface that is down.
+Error isDown(const Link& link);
 
 /// The link's parameters and its signal, sampled over one second.
 Known<Station> gatherStation(const Link& link, const Until& until);

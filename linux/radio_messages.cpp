@@ -50,14 +50,20 @@ std::optional<int> signalOf(const Attributes& bss) {
     return *hundredths / 100;
 }
 
+/// The elements of a beacon. Drivers whose firmware scans hand frames over without saying of what kind they are, and no
+/// flag then tells a probe response: only beacons carry a traffic map (IEEE 802.11-2020, 9.3.3.2 and 9.3.3.10).
+std::optional<Bytes> beaconOf(const Attributes& bss, Bytes latest) {
+    if (const std::optional<Bytes> beacon = bss.find(NL80211_BSS_BEACON_IES)) return beacon;
+    if (bss.has(NL80211_BSS_PRESP_DATA) || !decodeElements(latest).trafficMap.present()) return std::nullopt;
+    return latest;
+}
+
 std::optional<AccessPoint> accessPointOf(const Attributes& bss, std::int64_t now) {
     constexpr std::uint16_t kOfAccessPoint = 1;  // the capability bit ESS
     const std::optional<MacAddress> address = addressIn(bss.find(NL80211_BSS_BSSID));
     if (!address) return std::nullopt;
     const Bytes latest = bss.find(NL80211_BSS_INFORMATION_ELEMENTS).value_or(Bytes());
-    std::optional<Bytes> beacon = bss.find(NL80211_BSS_BEACON_IES);
-    // Without a word of a probe response, the latest frame was a beacon.
-    if (!beacon && !bss.has(NL80211_BSS_PRESP_DATA) && !latest.empty()) beacon = latest;
+    const std::optional<Bytes> beacon = beaconOf(bss, latest);
 
     AccessPoint accessPoint;
     accessPoint.address = *address;
@@ -70,17 +76,33 @@ std::optional<AccessPoint> accessPointOf(const Attributes& bss, std::int64_t now
     accessPoint.lastSeen = lastSeen(bss, now);
     accessPoint.joined =
         bss.number<std::uint32_t>(NL80211_BSS_STATUS) == std::uint32_t{NL80211_BSS_STATUS_ASSOCIATED};
+    accessPoint.multiLinkAddress = addressIn(bss.find(NL80211_BSS_MLD_ADDR));
     accessPoint.elements.assign(latest.begin(), latest.end());
     if (beacon) accessPoint.beaconElements.emplace(beacon->begin(), beacon->end());
     accessPoint.says = decodeAdvertised(accessPoint.capability, latest, beacon);
     return accessPoint;
 }
 
+/// Of an access point that hides the kernel leaves beacon and answer apart where the driver does not say which is which.
+void completeByBeacons(std::vector<AccessPoint>& accessPoints) {
+    for (AccessPoint& each : accessPoints) {
+        if (each.beaconElements || each.says.name.absent()) continue;
+        const auto beacon = std::ranges::find_if(accessPoints, [&](const AccessPoint& other) {
+            return other.address == each.address && other.frequency == each.frequency &&
+                   other.says.name.absent() && other.beaconElements;
+        });
+        if (beacon == accessPoints.end()) continue;
+        each.beaconElements = beacon->beaconElements;
+        each.says = decodeAdvertised(each.capability, each.elements, Bytes(*each.beaconElements));
+    }
+}
+
 /// The first of several ways in which drivers tell the signal.
 std::optional<int> stationSignal(const Attributes& station) {
     for (const std::uint16_t type :
          {NL80211_STA_INFO_SIGNAL_AVG, NL80211_STA_INFO_SIGNAL, NL80211_STA_INFO_BEACON_SIGNAL_AVG}) {
-        if (const auto signal = station.number<std::int8_t>(type)) return *signal;
+        // One that was not measured is named all the same: that of a link which is one of several, for one.
+        if (const auto signal = station.number<std::int8_t>(type); signal && isLevel(*signal)) return *signal;
     }
     return std::nullopt;
 }
@@ -197,6 +219,7 @@ std::vector<AccessPoint> readAccessPoints(Bytes buffer, std::int64_t now) {
         std::optional<AccessPoint> each = accessPointOf(message.nested(NL80211_ATTR_BSS), now);
         if (each) accessPoints.push_back(std::move(*each));
     });
+    completeByBeacons(accessPoints);
     return accessPoints;
 }
 

@@ -150,8 +150,16 @@ Known<std::optional<AccessPoint>> RadioSocket::joined(std::uint32_t interfaceInd
     return joined;
 }
 
-Known<Station> RadioSocket::station(std::uint32_t interfaceIndex, const Until& until) {
-    const NetlinkAnswer answer = ask(NL80211_CMD_GET_STATION, NLM_F_DUMP, interfaceIndex, until);
+/// Some drivers list no links, and some list those to other stations too; a few only list.
+Known<Station> RadioSocket::station(std::uint32_t interfaceIndex, const MacAddress& accessPoint,
+                                    const Until& until) {
+    NetlinkRequest request(family_.number, 0);
+    request.header<genlmsghdr>() = {NL80211_CMD_GET_STATION, 0, 0};
+    request.put(NL80211_ATTR_IFINDEX, interfaceIndex);
+    request.put(NL80211_ATTR_MAC, accessPoint);
+    NetlinkAnswer answer = questions_.ask(request, until);
+    if (answer.error == EOPNOTSUPP) answer = ask(NL80211_CMD_GET_STATION, NLM_F_DUMP, interfaceIndex, until);
+    if (answer.error == ENOENT) return failure(Reason::notJoined, "no longer joined to the access point");
     if (answer.error != 0) return failureOf(answer.error, "link");
     std::optional<Station> station = readStation(answer.messages);
     if (!station) return failure(Reason::notJoined, "not joined to a network");

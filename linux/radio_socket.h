@@ -31,7 +31,8 @@ class RadioSocket {
     Known<std::vector<AccessPoint>> accessPoints(std::uint32_t interfaceIndex, const Until& until);
     /// The access point that the interface is joined to, of several at once the strongest; nothing where it has not joined.
     Known<std::optional<AccessPoint>> joined(std::uint32_t interfaceIndex, const Until& until);
-    Known<Station> station(std::uint32_t interfaceIndex, const Until& until);
+    /// The link to the access point of this address.
+    Known<Station> station(std::uint32_t interfaceIndex, const MacAddress& accessPoint, const Until& until);
     Known<Survey> survey(std::uint32_t interfaceIndex, const Until& until);
     Known<Airtime> airtime(std::uint32_t interfaceIndex, const Until& until);
     Known<Regulation> regulation(std::uint32_t radio, const Until& until);

@@ -54,7 +54,7 @@ bool hasRadio() {
 
 bool isSameConnection(const Known<Link>& before, const Known<Link>& now) {
     return before && now && before->joined && now->joined && before->interfaceIndex == now->interfaceIndex &&
-           before->master == now->master && before->joined->address == now->joined->address;
+           before->master == now->master && before->joined->peer() == now->joined->peer();
 }
 
 /// It is the one reason of this kind that a link has.

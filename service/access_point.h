@@ -18,6 +18,13 @@ using CountryCode = std::array<char, 2>;
 /// "02:00:00:00:00:01". *Any* thread.
 std::string textOf(const MacAddress& address);
 
+/// Whether a number can be the strength of a signal or of noise, in dBm. Drivers that do not measure name others, above all
+/// 0. *Any* thread.
+constexpr bool isLevel(int number) {
+    constexpr int kLowestLevel = -110, kHighestLevel = -1;
+    return number >= kLowestLevel && number <= kHighestLevel;
+}
+
 /// What an access point's elements say, in the tests' terms.
 struct Advertised {
     NetworkName name;                        ///< empty while no frame has told it
@@ -51,12 +58,16 @@ struct AccessPoint {
     std::optional<int> signal;             ///< dBm
     std::optional<std::int64_t> lastSeen;  ///< ms on the clock that counts suspended time too
     bool joined = false;                   ///< this device is joined to it
+    /// Of the whole of which it is one link, while this device is joined over several at once (802.11be).
+    std::optional<MacAddress> multiLinkAddress;
     bool directOnly = false;  ///< none: a node of a mesh or an ad-hoc network, which shares the air
     std::vector<std::uint8_t> elements;  ///< of the latest probe response, else of the latest beacon
     std::optional<std::vector<std::uint8_t>> beaconElements;  ///< absent while no beacon was heard
     Advertised says;
 
     Band band() const { return bandOf(frequency); }
+    /// Whom a device that is joined to it takes for its access point.
+    const MacAddress& peer() const { return multiLinkAddress ? *multiLinkAddress : address; }
 };
 
 /// Whether the two are most likely names that one radio works under: makers count up the last byte of its address or

@@ -30,6 +30,7 @@ struct Link {
     std::optional<AccessPoint> joined;  ///< the access point, as the kernel keeps it up to date
     /// What has addresses and routes in the interface's place; absent where it has them itself.
     std::optional<LinkMaster> master{};
+    bool switchedOff = false;  ///< its radio, which is why it is down
 };
 
 /// What the driver says of the link to the joined access point.

@@ -15,14 +15,6 @@ constexpr std::uint8_t kSecondaryBelow = 3;
 constexpr std::uint8_t kOlderStationsPresent = 1;
 constexpr std::uint8_t kProtectionInUse = 2;
 
-// dBm, of signal and noise. Beyond that are the numbers of drivers that do not measure, above all 0.
-constexpr int kLowestLevel = -110;
-constexpr int kHighestLevel = -1;
-
-bool isSensible(int level) {
-    return level >= kLowestLevel && level <= kHighestLevel;
-}
-
 /// World-wide and combined regulatory domains name no country that others could contradict.
 bool isCountry(const std::string& code) {
     return code.size() == 2 && code != "XX" &&
@@ -74,7 +66,7 @@ Known<int> signalOf(const Facts& facts, const AccessPoint& judged) {
 std::optional<int> noiseOf(const Facts& facts, const AccessPoint& judged) {
     if (!facts.survey) return std::nullopt;
     for (const SurveyedChannel& channel : *facts.survey) {
-        if (channel.frequency == judged.frequency && channel.noise && isSensible(*channel.noise))
+        if (channel.frequency == judged.frequency && channel.noise && isLevel(*channel.noise))
             return channel.noise;
     }
     return std::nullopt;
@@ -86,7 +78,7 @@ std::map<CountryCode, std::set<MacAddress>> countryWitnesses(const Facts& facts,
     if (!facts.nearby) return witnesses;
     for (const AccessPoint& each : *facts.nearby) {
         if (!each.says.country || each.directOnly || each.address == judged.address) continue;
-        if (!each.signal || *each.signal < kWeakestCountrySignal) continue;
+        if (!each.signal || !isLevel(*each.signal) || *each.signal < kWeakestCountrySignal) continue;
         witnesses[*each.says.country].insert(each.address);
     }
     return witnesses;
@@ -128,7 +120,7 @@ Outcome signalIsPoor(const Facts& facts) {
     if (!judged) return judged.error();
     const Known<int> signal = signalOf(facts, **judged);
     if (!signal) return signal.error();
-    if (!isSensible(*signal))
+    if (!isLevel(*signal))
         return failure(Reason::malformed, "the driver names a signal of " + std::to_string(*signal) + " dBm");
     Dictionary::Entries info{{"RSSI", std::int64_t{*signal}}};
     const std::optional<int> noise = noiseOf(facts, **judged);

@@ -484,6 +484,27 @@ TEST_F(Driver, WithoutASwitchIsNoGuess) {
               "the driver mt7921e does not tell whether it shares airtime with Bluetooth (code 5)");
 }
 
+TEST(Switch, OfTheInterfacesRadioTellsWhyItIsDown) {
+    const fakes::TemporaryFolder root;
+    const std::string folder = "/sys/class/net/wlan0/phy80211/rfkill3/";
+    EXPECT_FALSE(isSwitchedOff("wlan0", root.path()));
+    root.write(folder + "soft", "0\n");
+    root.write(folder + "hard", "0\n");
+    EXPECT_FALSE(isSwitchedOff("wlan0", root.path()));
+    root.write(folder + "soft", "1\n");
+    EXPECT_TRUE(isSwitchedOff("wlan0", root.path()));
+    EXPECT_FALSE(isSwitchedOff("wlan1", root.path()));
+    root.write(folder + "soft", "0\n");
+    root.write(folder + "hard", "1\n");
+    EXPECT_TRUE(isSwitchedOff("wlan0", root.path()));
+
+    Link link = notJoined();
+    link.up = false;
+    EXPECT_EQ("lo is down (code 1)", isDown(link).text());
+    link.switchedOff = true;
+    EXPECT_EQ("lo is down: Wi-Fi is switched off (code 1)", isDown(link).text());
+}
+
 /// The names in the order of use, of interfaces named after what they are.
 std::string inOrderOfUse(const std::vector<std::string>& names) {
     std::vector<RadioInterface> interfaces;

@@ -112,16 +112,81 @@ TEST(RadioMessages, TellAHiddenNeighbourByItsBeacon) {
                                     [](const AccessPoint& each) { return each.says.hidesName == true; }));
 }
 
+/// One access point as the kernel tells it: its address, and what else `put` puts in.
+template <class Put>
+Buffer entryOf(Put put) {
+    return messageOf(NL80211_CMD_NEW_SCAN_RESULTS, [&](NetlinkRequest& request) {
+        const std::uint8_t address[6] = {2};
+        nlattr* const bss = request.beginNest(NL80211_ATTR_BSS);
+        request.put(NL80211_BSS_BSSID, address);
+        put(request);
+        request.endNest(bss);
+    });
+}
+
+template <class Put>
+AccessPoint accessPointOf(Put put) {
+    return readAccessPoints(entryOf(put), 0).at(0);
+}
+
+TEST(RadioMessages, TakeAFrameOfAnUntoldKindForABeaconWhereItHasATrafficMap) {
+    const Buffer name = {0, 4, 'C', 'a', 'f', 'e'}, trafficMap = {5, 4, 0, 3, 0, 0};
+    const auto told = [](const Buffer& elements, bool isAnswer = false) {
+        return accessPointOf([&](NetlinkRequest& request) {
+            request.put(NL80211_BSS_INFORMATION_ELEMENTS, elements);
+            if (isAnswer) request.put(NL80211_BSS_PRESP_DATA, Bytes());
+        });
+    };
+    Buffer beacon = name;
+    beacon.insert(beacon.end(), trafficMap.begin(), trafficMap.end());
+
+    EXPECT_EQ(false, told(beacon).says.hidesName);
+    EXPECT_EQ(3, told(beacon).says.dtimPeriod);
+    EXPECT_TRUE(told(beacon).beaconElements);
+    EXPECT_EQ(std::nullopt, told(name).says.hidesName);
+    EXPECT_FALSE(told(name).beaconElements);
+    EXPECT_EQ("Cafe", textFromName(told(name).says.name));
+    EXPECT_EQ(std::nullopt, told(beacon, true).says.hidesName);
+    EXPECT_EQ(true, told(trafficMap).says.hidesName);
+}
+
+TEST(RadioMessages, FindTheBeaconOfAnAnswerThatTheDriverKeepsApart) {
+    const auto entry = [](std::uint32_t frequency, const Buffer& elements) {
+        return entryOf([&](NetlinkRequest& request) {
+            request.put(NL80211_BSS_FREQUENCY, frequency);
+            request.put(NL80211_BSS_INFORMATION_ELEMENTS, elements);
+        });
+    };
+    Buffer dump;
+    for (const Buffer& each : {entry(2412, {0, 4, 'C', 'a', 'f', 'e'}), entry(2437, {0, 1, 'B'}),
+                               entry(2412, {0, 0, 5, 4, 0, 3, 0, 0})})
+        dump.insert(dump.end(), each.begin(), each.end());
+
+    const auto accessPoints = readAccessPoints(dump, 0);
+
+    EXPECT_EQ("Cafe", textFromName(accessPoints.at(0).says.name));
+    EXPECT_EQ(true, accessPoints.at(0).says.hidesName);
+    EXPECT_EQ(3, accessPoints.at(0).says.dtimPeriod);
+    EXPECT_EQ(std::nullopt, accessPoints.at(1).says.hidesName);
+}
+
+TEST(RadioMessages, TellTheLinksOfOneAccessPointByTheAddressOfTheWhole) {
+    const std::uint8_t whole[6] = {2, 0xE0};
+    const AccessPoint link = accessPointOf(
+        [&](NetlinkRequest& request) { request.put(NL80211_BSS_MLD_ADDR, Bytes(whole, sizeof whole)); });
+
+    EXPECT_EQ((MacAddress{2}), link.address);
+    EXPECT_EQ((MacAddress{2, 0xE0}), link.peer());
+    EXPECT_EQ((MacAddress{2}), accessPointOf([](NetlinkRequest&) {}).peer());
+}
+
 TEST(RadioMessages, TellAnAccessPointFromNodesOfAMeshAndAdHocNetworks) {
     const auto isDirectOnly = [](std::uint16_t capability) {
-        const Buffer message = messageOf(NL80211_CMD_NEW_SCAN_RESULTS, [&](NetlinkRequest& request) {
-            const std::uint8_t address[6] = {2};
-            nlattr* const bss = request.beginNest(NL80211_ATTR_BSS);
-            request.put(NL80211_BSS_BSSID, address);
-            request.put(NL80211_BSS_CAPABILITY, Bytes(reinterpret_cast<const std::uint8_t*>(&capability), 2));
-            request.endNest(bss);
-        });
-        return readAccessPoints(message, 0).at(0).directOnly;
+        return accessPointOf([&](NetlinkRequest& request) {
+                   request.put(NL80211_BSS_CAPABILITY,
+                               Bytes(reinterpret_cast<const std::uint8_t*>(&capability), 2));
+               })
+            .directOnly;
     };
 
     EXPECT_FALSE(isDirectOnly(0x0411));
@@ -138,6 +203,24 @@ TEST(RadioMessages, TellTheLink) {
     EXPECT_EQ(2, station->dtimPeriod);
     EXPECT_EQ(100, station->beaconInterval);
     EXPECT_FALSE(readStation(captured("not-joined-station")));
+}
+
+TEST(RadioMessages, TellOfALinkTheStrengthThatWasMeasured) {
+    using Levels = std::vector<std::pair<std::uint16_t, std::int8_t>>;
+    const auto signals = [](const Levels& levels) {
+        const Buffer message = messageOf(NL80211_CMD_NEW_STATION, [&](NetlinkRequest& request) {
+            nlattr* const info = request.beginNest(NL80211_ATTR_STA_INFO);
+            for (const auto& [type, level] : levels)
+                request.put(type, Bytes(reinterpret_cast<const std::uint8_t*>(&level), 1));
+            request.endNest(info);
+        });
+        return readStation(message)->signals;
+    };
+
+    EXPECT_EQ(std::vector{-61},
+              signals({{NL80211_STA_INFO_SIGNAL, -60}, {NL80211_STA_INFO_SIGNAL_AVG, -61}}));
+    EXPECT_EQ(std::vector{-60}, signals({{NL80211_STA_INFO_SIGNAL, -60}, {NL80211_STA_INFO_SIGNAL_AVG, 0}}));
+    EXPECT_TRUE(signals({{NL80211_STA_INFO_SIGNAL, 0}, {NL80211_STA_INFO_SIGNAL_AVG, 0}}).empty());
 }
 
 TEST(RadioMessages, TellTheMeasuredNoiseOfAChannel) {

@@ -117,6 +117,13 @@ TEST(RadioTests, TakeTheMiddleOfTheSamples) {
     EXPECT_EQ(Value(-61), infoOf(32, facts, "RSSI"));
 }
 
+TEST(RadioTests, TakeTheBeaconsStrengthWhereTheLinkTellsNone) {
+    Facts facts = joinedTo({heard(kName, 2412, -64)});
+    facts.station = Station{{}, 2, 100};
+
+    EXPECT_EQ(Value(-64), infoOf(32, facts, "RSSI"));
+}
+
 TEST(RadioTests, TakeTheScansStrengthOfANamedNetwork) {
     Facts facts = askedAbout("Northlight", {heard(kName, 2412, -80)});
     facts.station = Station{{-40}, {}, {}};
