@@ -24,13 +24,18 @@ bool overlaps(const AccessPoint& accessPoint, const Span& wanted) {
                        [&](const Span& span) { return span.low < wanted.high && wanted.low < span.high; });
 }
 
-/// The others that overlap the 20 MHz around the frequency.
+/// The others that overlap the 20 MHz around the frequency, each once: the kernel keeps one that hides twice, with and
+/// without its name.
 std::vector<const AccessPoint*> overlapping(std::uint32_t frequency, const std::vector<AccessPoint>& nearby,
                                             const AccessPoint* own) {
     const Span wanted{frequency - 10, frequency + 10};
     std::vector<const AccessPoint*> found;
-    for (const AccessPoint& each : nearby)
-        if (each.signal && !isOf(own, each) && overlaps(each, wanted)) found.push_back(&each);
+    for (const AccessPoint& each : nearby) {
+        const auto isSame = [&](const AccessPoint* other) { return other->address == each.address; };
+        const bool counts = each.signal && isLevel(*each.signal) && !isOf(own, each);
+        if (counts && overlaps(each, wanted) && std::none_of(found.begin(), found.end(), isSame))
+            found.push_back(&each);
+    }
     return found;
 }
 

@@ -57,11 +57,18 @@ bool scoreByAirtime(Candidates& candidates, const AirFacts& air) {
     return true;
 }
 
+/// Whether what was heard can be weighed: some drivers tell no strength in dBm.
+bool hasLevels(const std::vector<AccessPoint>& nearby) {
+    return nearby.empty() || std::ranges::any_of(nearby, [](const AccessPoint& each) {
+               return each.signal && isLevel(*each.signal);
+           });
+}
+
 /// Nothing where neither a survey nor a scan tells the channels apart.
 Candidates scored(const AirFacts& air, Band band, const AccessPoint* own) {
     Candidates candidates = candidatesOf(air, band);
     if (scoreByAirtime(candidates, air)) return candidates;
-    if (!air.nearby) return {};
+    if (!air.nearby || !hasLevels(*air.nearby)) return {};
     for (Candidate& candidate : candidates)
         candidate.score = overlapWeight(candidate.channel.frequency, *air.nearby, own);
     return candidates;
@@ -120,6 +127,8 @@ using Basis = ChannelJudgement::Basis;
 Known<ChannelJudgement> byOverlap(std::uint32_t frequency, const AirFacts& air, const AccessPoint* own,
                                   const CongestionLimits& limits) {
     if (!air.nearby) return air.nearby.error();
+    if (!hasLevels(*air.nearby))
+        return failure(Reason::unsupported, "the driver does not tell the signal strengths in dBm");
     const double weight = overlapWeight(frequency, *air.nearby, own);
     return ChannelJudgement{Basis::overlap, weight, weight >= limits.overlap};
 }

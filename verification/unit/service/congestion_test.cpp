@@ -105,6 +105,15 @@ TEST(ChannelLoad, TheOwnRadioDoesNotCompeteWithItselfUnderItsOtherNames) {
     EXPECT_DOUBLE_EQ(overlapWeight(2412, {home, neighbour}, &home), 1.0);
 }
 
+TEST(ChannelLoad, AnAccessPointThatIsKeptTwiceCountsOnce) {
+    const AccessPoint hidden = at(2412, -50);
+    AccessPoint named = hidden;
+    named.says.name = NetworkName();
+
+    EXPECT_DOUBLE_EQ(overlapWeight(2412, {hidden, named}, nullptr), 1.0);
+    EXPECT_EQ(strongOverlaps(2412, {hidden, named}, nullptr), 1U);
+}
+
 TEST(ChannelLoad, TheOwnAccessPointIsLeftOutWhereItHasChangedItsChannelMeanwhile) {
     const AccessPoint before = at(2412, -40);
     AccessPoint after = before;
@@ -141,6 +150,18 @@ TEST(Congestion, TheOverlapCountDecidesWhereNothingWasMeasured) {
     EXPECT_TRUE(found(channelIsCongested(judged, facts, nullptr)));
     facts.nearby = failure(Reason::timeout, "no scan");
     EXPECT_TRUE(cannotTell(channelIsCongested(judged, facts, nullptr), Reason::timeout));
+}
+
+TEST(Congestion, CannotBeToldWhereTheDriverTellsNoStrengths) {
+    AirFacts unweighed = air({at(2412, 0), at(2412, 0), at(2437, 0)});
+    unweighed.nearby->back().signal.reset();
+    const AccessPoint own = at(2412, -40);
+
+    EXPECT_TRUE(cannotTell(channelIsCongested(own, unweighed, &own), Reason::unsupported));
+    EXPECT_TRUE(cannotTell(band2IsCongested(unweighed, &own), Reason::unsupported));
+    EXPECT_FALSE(recommend(unweighed, &own).ghz2);
+    unweighed.nearby->back().signal = -90;
+    EXPECT_FALSE(found(channelIsCongested(own, unweighed, &own)));
 }
 
 TEST(Congestion, ABandIsCongestedOnlyWhereNoChannelIsLeft) {
