@@ -52,12 +52,15 @@ Store fromAddressed(const Gathering& g, Known<T> Facts::*place, Gather gather) {
     return fromLink(g, place, [&](const Link& found) -> Known<T> { return gather(addressed(found)); });
 }
 
-/// The same of what is asked over the network, which must be asked by this interface.
+/// The same of what is asked over the network, which must be asked by this interface. What the network answered, or did
+/// not, says nothing of it where the device has lost it meanwhile.
 template <class T, class Gather>
 Store overNetwork(const Gathering& g, Known<T> Facts::*place, Gather gather) {
     return fromLink(g, place, [&](const Link& found) -> Known<T> {
         if (found.master && found.master->sendsElsewhere) return leavesByAnother(found);
-        return gather(addressed(found));
+        Known<T> told = gather(addressed(found));
+        if (!hasLostNetwork(found, g.until)) return told;
+        return failure(Reason::notJoined, found.interfaceName + " has lost its network meanwhile");
     });
 }
 

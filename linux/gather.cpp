@@ -31,6 +31,8 @@ constexpr milliseconds kFirstLook{100};
 // While a scan goes on the radio is at home for a fifth of the time. Should that be less, what it counted has to do.
 constexpr milliseconds kLongestCount{8000};
 constexpr milliseconds kBetweenCounts{20};
+// The kernel answers within a few milliseconds.
+constexpr milliseconds kShortLook{500};
 
 bool isUp(const std::string& interfaceName) {
     const Descriptor any(socket(AF_INET, SOCK_DGRAM | SOCK_CLOEXEC, 0));
@@ -176,6 +178,15 @@ bool isSwitchedOff(const std::string& interfaceName, const std::string& root) {
             if (readSmallFile(each->path().string() + kind, 64).value_or("").starts_with("1")) return true;
     }
     return false;
+}
+
+bool hasLostNetwork(const Link& link, const Until& until) {
+    // What took until the deadline is asked about too.
+    const Until shortly{until.stop, Clock::now() + kShortLook};
+    Known<RadioSocket> radio = RadioSocket::open(shortly);
+    if (!link.joined || !radio) return false;
+    const auto joined = radio->joined(link.interfaceIndex, shortly);
+    return joined ? !*joined : joined.error().code == static_cast<int>(Reason::noInterface);
 }
 
 Error isDown(const Link& link) {

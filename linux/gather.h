@@ -21,6 +21,9 @@ Known<Link> gatherLink(const std::optional<std::string>& wantedInterface, const 
 Link addressed(const Link& link);
 /// Whether a switch, of software or of hardware, keeps the interface's radio off. \param root a root folder
 bool isSwitchedOff(const std::string& interfaceName, const std::string& root = "");
+/// Whether the interface has left the network that it was joined to, has gone down or is gone. That it roamed to another
+/// access point is no loss.
+bool hasLostNetwork(const Link& link, const Until& until);
 /// The reason why nothing can be told of an interface that is down.
 Error isDown(const Link& link);
 
