@@ -58,7 +58,7 @@ class Reader {
             for (auto path = words.begin() + 1; path != words.end() && into_.includes.size() < kMostIncludes;
                  ++path)
                 into_.includes.push_back({*path, first == "source-directory"});
-        } else if (first == "iface") {
+        } else if (first == "iface" || first == "template") {
             hasStanza_ = into_.stanzas.size() < kMostStanzas;
             if (hasStanza_) into_.stanzas.push_back(stanzaFrom(words));
             return;
@@ -72,10 +72,13 @@ class Reader {
   private:
     void readOption(const std::string& line, const std::string& name) {
         if (!hasStanza_) return;
+        const std::string_view given = trimmed(trimmed(line).substr(name.size()));
+        // ifupdown-ng's.
+        if (name == "inherit") into_.stanzas.back().parent = given;
         std::string& value = into_.stanzas.back().options[name];
         // An option may be given more than once.
         if (!value.empty()) value += ' ';
-        value += trimmed(trimmed(line).substr(name.size()));
+        value += given;
     }
 
     InterfacesFile& into_;
@@ -107,21 +110,32 @@ std::string methodOf(const InterfaceStanza& stanza) {
     return name == "ipv4ll" ? "link-local" : "";
 }
 
+std::string_view optionOf(const InterfaceStanza& stanza, const char* name) {
+    const auto option = stanza.options.find(name);
+    return option == stanza.options.end() ? std::string_view() : option->second;
+}
+
+/// ifupdown-ng names neither family nor method, but addresses of both and programs to use.
+void addFreely(const InterfaceStanza& stanza, InterfacePlan& plan) {
+    const auto used = wordsOf(optionOf(stanza, "use"));
+    if (plan.ipv4.method.empty() && std::ranges::find(used, "dhcp") != used.end()) plan.ipv4.method = "auto";
+    for (const IPAddress& each : addressesIn(optionOf(stanza, "address"))) {
+        FamilyPlan& family = each.isIPv4() ? plan.ipv4 : plan.ipv6;
+        family.method = "manual";
+        add(family.addresses, {each});
+    }
+}
+
 void addStanza(const InterfaceStanza& stanza, FamilyPlan& plan) {
     const std::string method = methodOf(stanza);
     // What was entered by hand counts beside what comes by itself.
     if (plan.method.empty() || method == "manual") plan.method = method;
-    if (method != "manual") return;
-    const auto address = stanza.options.find("address");
-    if (address == stanza.options.end()) return;
-    add(plan.addresses, addressesIn(address->second));
+    if (method == "manual") add(plan.addresses, addressesIn(optionOf(stanza, "address")));
 }
 
 void addServers(const InterfaceStanza& stanza, std::vector<IPAddress>& servers) {
-    for (const char* name : {"dns-nameservers", "dns-nameserver"}) {
-        const auto option = stanza.options.find(name);
-        if (option != stanza.options.end()) add(servers, addressesIn(option->second));
-    }
+    for (const char* name : {"dns-nameservers", "dns-nameserver"})
+        add(servers, addressesIn(optionOf(stanza, name)));
 }
 
 }  // namespace
@@ -138,6 +152,7 @@ InterfacePlan planIn(const InterfacesFile& file, const std::string& logicalName)
         const InterfaceStanza stanza = whole(file, each);
         if (stanza.family == "inet") addStanza(stanza, plan.ipv4);
         if (stanza.family == "inet6") addStanza(stanza, plan.ipv6);
+        if (stanza.family.empty()) addFreely(stanza, plan);
         addServers(stanza, plan.servers);
     }
     return plan;

@@ -9,10 +9,11 @@
 
 namespace wp {
 
-/// One "iface" of `/etc/network/interfaces`, as ifupdown and busybox read that file.
+/// One "iface" of `/etc/network/interfaces`, as ifupdown, busybox and ifupdown-ng read that file.
 struct InterfaceStanza {
-    std::string name;    ///< of a logical interface, often that of the real one
-    std::string family;  ///< "inet" or "inet6"; empty where it is inherited together with the method
+    std::string name;  ///< of a logical interface, often that of the real one
+    std::string
+        family;  ///< "inet" or "inet6"; empty where it is inherited together with the method, or ifupdown-ng's
     std::string method;
     std::string parent;  ///< whose options it inherits; empty where it inherits none
     std::map<std::string, std::string> options;

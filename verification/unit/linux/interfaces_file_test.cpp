@@ -76,6 +76,17 @@ TEST(InterfacesFile, AStanzaInheritsOptionsAndWithoutAMethodThatToo) {
     EXPECT_EQ(planOf("iface a inherits b\niface b inherits a\niface wlan0 inet dhcp inherits a\n"), "auto||");
 }
 
+TEST(InterfacesFile, OfIfupdownNgNamesAddressesOfBothFamiliesAndProgramsToUse) {
+    EXPECT_EQ(planOf("iface wlan0\n  use wifi\n  use dhcp\n"), "auto||");
+    EXPECT_EQ(planOf("iface wlan0\n  address 10.0.0.7/24\n  address 2001:db8::7/64\n  gateway 10.0.0.1\n"
+                     "  dns-nameservers 9.9.9.9\n"),
+              "manual 10.0.0.7 |manual 2001:db8::7 |9.9.9.9 ");
+    EXPECT_EQ(planOf("template home\n  address 10.0.0.7\niface wlan0\n  inherit home\n  use dhcp\n"),
+              "manual 10.0.0.7 ||")
+        << "what was entered counts beside what comes by itself";
+    EXPECT_EQ(planOf("iface wlan0\n  use\n  address\n  inherit\n"), "||");
+}
+
 TEST(InterfacesFile, CutOrTwistedIsReadAsFarAsItGoes) {
     const std::string text =
         "auto /wlan*=home\nsource x/*\niface base inet static\n  address 10.0.0.1\\\n/24\n"
