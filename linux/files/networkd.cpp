@@ -119,11 +119,12 @@ std::optional<NetworkdLink> readNetworkdLink(unsigned interfaceIndex, const std:
         addServers(words, link.manualServers);
     if (const auto lease = readSmallFile(root + "/run/systemd/netif/leases/" + number))
         addLease(readAssignments(*lease), link);
-    // All servers of the link: besides those entered they are of a lease, or a router advertised them.
+    // All servers of the link. Those of IPv4 are of the lease, or a person told them at run time.
     if (const auto all = state.find("DNS"); all != state.end()) {
         std::vector<IPAddress> known;
         addServers(all->second, known);
-        add(link.offeredServers, without(known, link.manualServers));
+        for (const IPAddress& each : without(known, link.manualServers))
+            if (!each.isIPv4()) add(link.offeredServers, {each});
         link.advertisementsKnown = true;
     }
     // From its version 254 on: of DHCPv4, DHCPv6 or a router's advertisement.

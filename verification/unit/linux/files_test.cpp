@@ -301,7 +301,7 @@ TEST_F(Root, OfASystemWithNetworkdHasSettingsThatAddToAFile) {
 
 TEST_F(Root, OfASystemWithNetworkdTellsWhatWasAdvertisedAndTheVendorsText) {
     write("/run/systemd/netif/links/3",
-          "NETWORK_FILE=/etc/systemd/network/wlan0.network\nDNS=9.9.9.9 192.168.1.1 2001:db8::53#x "
+          "NETWORK_FILE=/etc/systemd/network/wlan0.network\nDNS=9.9.9.9 10.9.9.9 192.168.1.1 2001:db8::53#x "
           "fe80::1%3\n");
     write("/etc/systemd/network/wlan0.network", "[Network]\nDHCP=TRUE\nDNS=9.9.9.9\n");
     write("/run/systemd/netif/leases/3",
