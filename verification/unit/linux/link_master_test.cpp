@@ -5,6 +5,7 @@
 #include <linux/rtnetlink.h>
 
 #include "linux/gather.h"
+#include "linux/radio_messages.h"
 #include "verification/unit/linux/captured.h"
 
 namespace wp {
@@ -79,6 +80,15 @@ TEST(LinkMaster, IsTheBridgeOrBondThatAnInterfaceIsPartOf) {
         "bond0 7");
     EXPECT_EQ(masterIn(interfaceMessage(3, "wlan0", "", 7, "team") + interfaceMessage(7, "team0", "team")),
               "team0 7");
+}
+
+TEST(LinkMaster, IsToldByTheKernel) {
+    const auto part = readInterfaces(captured("part-of-a-bridge-interface")).at(0);
+    const auto master = readMaster(captured("part-of-a-bridge-link"), part.index);
+    ASSERT_TRUE(master);
+    EXPECT_EQ(master->name, "br0");
+    EXPECT_FALSE(master->sendsElsewhere);
+    EXPECT_FALSE(readMaster(captured("part-of-a-bridge-link"), master->index));
 }
 
 TEST(LinkMaster, IsNoneOfAnInterfaceThatKeepsItsAddresses) {
