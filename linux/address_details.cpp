@@ -63,21 +63,11 @@ Known<std::vector<AddressDetails>> gatherAddressDetails(std::uint32_t interfaceI
     return readAddressDetails(*messages, interfaceIndex);
 }
 
-Known<WaysOut> gatherWaysOut(std::uint32_t interfaceIndex, const Until& until) {
+Known<RouteSigns> gatherRouteSigns(std::uint32_t interfaceIndex, const Until& until) {
     const auto messages = routeDump<rtmsg>(RTM_GETROUTE, "routes", until);
     if (!messages) return messages.error();
-    WaysOut ways;
-    for (const Gateway& each : readGateways(*messages, interfaceIndex))
-        if (const auto address = IPAddress::fromBytes(each.bytes)) ways.gateways.push_back(*address);
-    ways.elsewhere = leadsElsewhere(*messages, interfaceIndex);
-    ways.advertised = hasAdvertisedRoute(*messages, interfaceIndex);
-    return ways;
-}
-
-Known<std::vector<IPAddress>> gatherGatewayAddresses(std::uint32_t interfaceIndex, const Until& until) {
-    auto ways = gatherWaysOut(interfaceIndex, until);
-    if (!ways) return ways.error();
-    return std::move(ways->gateways);
+    return RouteSigns{leadsElsewhere(*messages, interfaceIndex),
+                      hasAdvertisedRoute(*messages, interfaceIndex)};
 }
 
 }  // namespace wp

@@ -32,14 +32,11 @@ std::vector<AssignedAddress> assignedOf(const std::vector<AddressDetails>& detai
 /// Asks the kernel for them.
 Known<std::vector<AddressDetails>> gatherAddressDetails(std::uint32_t interfaceIndex, const Until& until);
 
-/// Where default routes lead.
-struct WaysOut {
-    std::vector<IPAddress> gateways;  ///< of the interface, those in use first, IPv4 before IPv6
-    bool elsewhere = false;           ///< whether there is one over another interface
-    bool advertised = false;          ///< whether a router advertised one of the interface's routes of IPv6
+/// What the routes of all tables give away.
+struct RouteSigns {
+    bool elsewhere = false;   ///< whether a default route leads over another interface
+    bool advertised = false;  ///< whether a router advertised one of the interface's routes of IPv6
 };
-Known<WaysOut> gatherWaysOut(std::uint32_t interfaceIndex, const Until& until);
-/// The gateways alone.
-Known<std::vector<IPAddress>> gatherGatewayAddresses(std::uint32_t interfaceIndex, const Until& until);
+Known<RouteSigns> gatherRouteSigns(std::uint32_t interfaceIndex, const Until& until);
 
 }  // namespace wp

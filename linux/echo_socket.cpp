@@ -11,6 +11,7 @@
 #include <ctime>
 #include <random>
 
+#include "linux/probe/ip_socket.h"
 #include "service/thresholds.h"
 
 namespace wp {
@@ -24,36 +25,8 @@ constexpr milliseconds kSilence{300};
 // Five visits and what goes between them are over by then.
 constexpr milliseconds kPatience{1500};
 
-struct SocketAddress {
-    sockaddr_storage storage{};
-    socklen_t size = 0;
-    sockaddr* get() { return reinterpret_cast<sockaddr*>(&storage); }
-};
-
-SocketAddress addressOf(const Gateway& target, std::uint32_t interfaceIndex) {
-    SocketAddress address;
-    if (target.family == Address::Family::ipv4) {
-        auto* const ipv4 = reinterpret_cast<sockaddr_in*>(&address.storage);
-        ipv4->sin_family = AF_INET;
-        std::memcpy(&ipv4->sin_addr, target.bytes.data(), sizeof ipv4->sin_addr);
-        address.size = sizeof *ipv4;
-    } else {
-        auto* const ipv6 = reinterpret_cast<sockaddr_in6*>(&address.storage);
-        ipv6->sin6_family = AF_INET6;
-        std::memcpy(&ipv6->sin6_addr, target.bytes.data(), sizeof ipv6->sin6_addr);
-        if (IN6_IS_ADDR_LINKLOCAL(&ipv6->sin6_addr)) ipv6->sin6_scope_id = interfaceIndex;
-        address.size = sizeof *ipv6;
-    }
-    return address;
-}
-
-bool isFrom(const sockaddr_storage& sender, const Gateway& target) {
-    if (target.family == Address::Family::ipv4) {
-        const auto* const ipv4 = reinterpret_cast<const sockaddr_in*>(&sender);
-        return ipv4->sin_family == AF_INET && std::memcmp(&ipv4->sin_addr, target.bytes.data(), 4) == 0;
-    }
-    const auto* const ipv6 = reinterpret_cast<const sockaddr_in6*>(&sender);
-    return ipv6->sin6_family == AF_INET6 && std::memcmp(&ipv6->sin6_addr, target.bytes.data(), 16) == 0;
+Address::Family familyOf(const IPAddress& address) {
+    return address.isIPv4() ? Address::Family::ipv4 : Address::Family::ipv6;
 }
 
 /// Leaves by this interface; unlike binding to a device it may be changed without any privilege.
@@ -68,11 +41,47 @@ std::uint16_t randomIdentifier() {
     return static_cast<std::uint16_t>(std::random_device()());
 }
 
+/// Whom a row of requests is for, and from which address it comes.
+struct EchoWay {
+    IPAddress target;
+    SocketAddress address;
+    std::optional<IPAddress> source;  ///< of IPv4 alone: the kernel itself takes that of IPv6 into account
+};
+
+EchoWay wayTo(const IPAddress& target, const std::string& interfaceName, std::uint32_t interfaceIndex) {
+    EchoWay way{target, SocketAddress::of(target, 0, interfaceIndex), std::nullopt};
+    if (target.isIPv4()) way.source = sourceToward(target, interfaceName);
+    return way;
+}
+
+/// A request that cannot be sent (no route, no neighbour) is one that nobody answers.
+void send(int descriptor, const EchoWay& way, const std::vector<std::uint8_t>& request) {
+    iovec content{const_cast<std::uint8_t*>(request.data()), request.size()};
+    alignas(cmsghdr) std::array<char, CMSG_SPACE(sizeof(in_pktinfo))> control{};
+    msghdr message{};
+    message.msg_name = const_cast<sockaddr*>(way.address.raw());
+    message.msg_namelen = way.address.size;
+    message.msg_iov = &content;
+    message.msg_iovlen = 1;
+    if (way.source) {
+        in_pktinfo origin{};
+        std::ranges::copy(way.source->bytes(), reinterpret_cast<std::uint8_t*>(&origin.ipi_spec_dst));
+        message.msg_control = control.data();
+        message.msg_controllen = control.size();
+        cmsghdr& part = *CMSG_FIRSTHDR(&message);
+        part.cmsg_level = IPPROTO_IP;
+        part.cmsg_type = IP_PKTINFO;
+        part.cmsg_len = CMSG_LEN(sizeof origin);
+        std::memcpy(CMSG_DATA(&part), &origin, sizeof origin);
+    }
+    (void)!::sendmsg(descriptor, &message, 0);
+}
+
 /// One row of requests and the answers to it.
 class EchoRow {
   public:
-    EchoRow(int descriptor, bool raw, const Gateway& target, SocketAddress address, HomeChannel::Stay& stay)
-        : descriptor_(descriptor), raw_(raw), target_(target), address_(address), stay_(stay) {}
+    EchoRow(int descriptor, bool raw, const EchoWay& way, HomeChannel::Stay& stay)
+        : descriptor_(descriptor), raw_(raw), way_(way), stay_(stay) {}
 
     /// Nothing, or why the row could not be completed.
     std::optional<Error> run(const Until& until) {
@@ -94,11 +103,8 @@ class EchoRow {
         for (std::size_t i = 0; i < kEchoRequests; ++i) {
             if (stay_.begin(patience) == Wait::stopped) return false;
             sent_[i] = Clock::now();
-            const std::vector<std::uint8_t> request =
-                echoRequest(target_.family, {identifier_, static_cast<std::uint16_t>(firstSequence_ + i)});
-            // A request that cannot be sent (no route, no neighbour) is one that nobody answers.
-            [[maybe_unused]] const ssize_t size =
-                sendto(descriptor_, request.data(), request.size(), 0, address_.get(), address_.size);
+            send(descriptor_, way_,
+                 echoRequest(family_, {identifier_, static_cast<std::uint16_t>(firstSequence_ + i)}));
             asked_ = i + 1;
             if (asked_ < kEchoRequests && !receiveUntil(sent_[i] + kApart, until)) return false;
         }
@@ -124,16 +130,15 @@ class EchoRow {
 
     void receive() {
         std::array<std::uint8_t, 2048> packet;
-        sockaddr_storage sender{};
-        socklen_t size = sizeof sender;
+        SocketAddress sender;
+        sender.size = sizeof sender.storage;
         const ssize_t received = recvfrom(descriptor_, packet.data(), packet.size(), MSG_DONTWAIT,
-                                          reinterpret_cast<sockaddr*>(&sender), &size);
+                                          reinterpret_cast<sockaddr*>(&sender.storage), &sender.size);
         const Clock::time_point now = Clock::now();
-        if (received < 0 || !isFrom(sender, target_)) return;
-        const bool framed = raw_ && target_.family == Address::Family::ipv4;
-        const auto tag =
-            readEchoReply(target_.family, framed ? EchoFraming::behindIPv4Header : EchoFraming::bare,
-                          {packet.data(), static_cast<std::size_t>(received)});
+        if (received < 0 || sender.address() != way_.target) return;
+        const bool framed = raw_ && family_ == Address::Family::ipv4;
+        const auto tag = readEchoReply(family_, framed ? EchoFraming::behindIPv4Header : EchoFraming::bare,
+                                       {packet.data(), static_cast<std::size_t>(received)});
         // The kernel puts a number of its own into what a datagram socket sends, and delivers its answers only.
         if (!tag || (raw_ && tag->identifier != identifier_)) return;
         const std::size_t index = static_cast<std::uint16_t>(tag->sequence - firstSequence_);
@@ -150,8 +155,8 @@ class EchoRow {
 
     int descriptor_;
     bool raw_;
-    const Gateway& target_;
-    SocketAddress address_;
+    const EchoWay& way_;
+    const Address::Family family_ = familyOf(way_.target);
     HomeChannel::Stay& stay_;
     std::uint16_t identifier_ = randomIdentifier();
     std::uint16_t firstSequence_ = randomIdentifier();
@@ -191,10 +196,11 @@ EchoSocket::End EchoSocket::open(Address::Family family) {
     return end;
 }
 
-Known<Echo> EchoSocket::ask(const Gateway& target, const std::string& interfaceName,
+Known<Echo> EchoSocket::ask(const IPAddress& target, const std::string& interfaceName,
                             std::uint32_t interfaceIndex, HomeChannel::Stay& stay, const Until& until) {
     const std::lock_guard lock(asking_);
-    const End& end = this->end(target.family);
+    const Address::Family family = familyOf(target);
+    const End& end = this->end(family);
     if (!end.descriptor) {
         if (end.error == EPERM || end.error == EACCES)
             return failure(Reason::notPermitted,
@@ -202,13 +208,14 @@ Known<Echo> EchoSocket::ask(const Gateway& target, const std::string& interfaceN
         return failure(Reason::unavailable,
                        std::string("no echo requests (ping): ") + std::strerror(end.error));
     }
-    if (!leaveBy(end.descriptor.number(), target.family, interfaceIndex)) {
+    if (!leaveBy(end.descriptor.number(), family, interfaceIndex)) {
         return failure(Reason::noInterface, interfaceName + " is gone");
     }
     const double startedAt = secondsSinceReference();
-    EchoRow row(end.descriptor.number(), end.raw, target, addressOf(target, interfaceIndex), stay);
+    const EchoWay way = wayTo(target, interfaceName, interfaceIndex);
+    EchoRow row(end.descriptor.number(), end.raw, way, stay);
     if (std::optional<Error> error = row.run(until)) return *error;
-    return Echo{interfaceName, textOf(target.family, target.bytes), row.roundTrips(), startedAt};
+    return Echo{interfaceName, target.text(), row.roundTrips(), startedAt};
 }
 
 }  // namespace wp

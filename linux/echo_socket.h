@@ -4,8 +4,8 @@
 
 #include "linux/echo_message.h"
 #include "linux/home_channel.h"
-#include "linux/route_messages.h"
 #include "linux/stop_signal.h"
+#include "service/ip_address.h"
 
 namespace wp {
 
@@ -21,7 +21,7 @@ class EchoSocket {
     /// channel between an answer and the next request, which waits for its return, but no longer than 1.5 s from the
     /// first one on. Where nothing at all has come 300 ms after the last request, more than a second after the first,
     /// the row seems to be lost: it ends its stay and waits on.
-    Known<Echo> ask(const Gateway& target, const std::string& interfaceName, std::uint32_t interfaceIndex,
+    Known<Echo> ask(const IPAddress& target, const std::string& interfaceName, std::uint32_t interfaceIndex,
                     HomeChannel::Stay& stay, const Until& until);
 
   private:

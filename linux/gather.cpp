@@ -15,6 +15,7 @@
 #include "linux/link_master.h"
 #include "linux/route_dump.h"
 #include "linux/route_messages.h"
+#include "linux/route_query.h"
 #include "service/ip_address.h"
 
 namespace wp {
@@ -274,11 +275,12 @@ bool answersAsNeighbour(const Link& link, const std::string& address, const Unti
 Known<Echo> gatherGatewayEcho(const Link& link, EchoSocket& socket, HomeChannel::Stay& stay,
                               const Until& until) {
     if (!link.joined) return notJoined(link);
-    const auto dump = routeDump<rtmsg>(RTM_GETROUTE, "routes", until);
-    if (!dump) return dump.error();
-    const std::vector<Gateway> gateways = readGateways(*dump, link.interfaceIndex);
-    if (gateways.empty()) return failure(Reason::notJoined, link.interfaceName + " has no default route");
-    return socket.ask(gateways.front(), link.interfaceName, link.interfaceIndex, stay, until);
+    const auto ways = gatherWaysOut(link, until);
+    if (!ways) return ways.error();
+    if (ways->empty()) return failure(Reason::notJoined, link.interfaceName + " has no default route");
+    const auto way = std::ranges::find_if(*ways, [](const WayOut& each) { return each.router.has_value(); });
+    if (way == ways->end()) return failure(Reason::notJoined, link.interfaceName + kNoRouter);
+    return socket.ask(*way->router, link.interfaceName, link.interfaceIndex, stay, until);
 }
 
 }  // namespace wp

@@ -13,6 +13,7 @@
 #include "linux/probe/translation_probes.h"
 #include "linux/probe/web_client.h"
 #include "linux/probe/web_place.h"
+#include "linux/route_query.h"
 
 namespace wp {
 namespace {
@@ -30,10 +31,15 @@ Error notJoined(const Link& link) {
     return failure(Reason::notJoined, link.interfaceName + " is not joined to a network");
 }
 
-Gateway asTarget(const IPAddress& address) {
-    const Bytes bytes = address.bytes();
-    return {
-        address.isIPv4() ? Address::Family::ipv4 : Address::Family::ipv6, {bytes.begin(), bytes.end()}, 0};
+/// The way out by IPv4, with its router where that is one of IPv4 itself; else why there is none.
+Known<WayOut> wayOutByIPv4(const Link& link, const Until& until) {
+    const auto ways = gatherWaysOut(link, until);
+    if (!ways) return ways.error();
+    if (ways->empty() || !ways->front().isIPv4)
+        return failure(Reason::notJoined, link.interfaceName + " has no default route for IPv4");
+    WayOut way = ways->front();
+    if (way.router && !way.router->isIPv4()) way.router.reset();
+    return way;
 }
 
 /// A resolver on the device itself cannot be reached over the interface.
@@ -203,16 +209,12 @@ Known<IPAddress> askStun(const Link& link, const LinkSetup& setup, const Endpoin
 Known<Echo> gatherOutsideEcho(const Link& link, const Endpoints& endpoints, EchoSocket& socket,
                               HomeChannel::Stay& stay, const Until& until) {
     if (!link.joined) return notJoined(link);
-    const auto gateways = gatherGatewayAddresses(link.interfaceIndex, until);
-    if (!gateways) return gateways.error();
-    if (gateways->empty()) return failure(Reason::notJoined, link.interfaceName + " has no default route");
-    for (const bool ipv4 : {true, false}) {
-        const auto target = IPAddress::fromText(ipv4 ? endpoints.pingIPv4 : endpoints.pingIPv6);
-        const bool hasRoute =
-            std::ranges::any_of(*gateways, [ipv4](const IPAddress& each) { return each.isIPv4() == ipv4; });
-        if (target && hasRoute)
-            return socket.ask(asTarget(*target), link.interfaceName, link.interfaceIndex, stay, until);
-    }
+    const auto ways = gatherWaysOut(link, until);
+    if (!ways) return ways.error();
+    if (ways->empty()) return failure(Reason::notJoined, link.interfaceName + " has no default route");
+    for (const WayOut& each : *ways)
+        if (const auto target = IPAddress::fromText(each.isIPv4 ? endpoints.pingIPv4 : endpoints.pingIPv6))
+            return socket.ask(*target, link.interfaceName, link.interfaceIndex, stay, until);
     return notConfigured("the ping beyond the router");
 }
 
@@ -268,11 +270,10 @@ Known<VendorContacts> gatherVendorService(const Link& link, const LinkSetup& set
 
 Known<RouterAnswers> gatherRouter(const Link& link, const Until& until) {
     if (!link.joined) return notJoined(link);
-    const auto gateways = gatherGatewayAddresses(link.interfaceIndex, until);
-    if (!gateways) return gateways.error();
-    if (gateways->empty() || !gateways->front().isIPv4())
-        return failure(Reason::notJoined, link.interfaceName + " has no default route for IPv4");
-    return askRouter({gateways->front(), link.interfaceName}, until);
+    const auto way = wayOutByIPv4(link, until);
+    if (!way) return way.error();
+    if (!way->router) return failure(Reason::notJoined, link.interfaceName + kNoRouter);
+    return askRouter({*way->router, link.interfaceName}, until);
 }
 
 Known<TranslationEvidence> gatherTranslation(const Link& link, const LinkSetup& setup,
@@ -281,20 +282,19 @@ Known<TranslationEvidence> gatherTranslation(const Link& link, const LinkSetup& 
     if (!link.joined) return notJoined(link);
     const auto details = gatherAddressDetails(link.interfaceIndex, until);
     if (!details) return details.error();
-    const auto gateways = gatherGatewayAddresses(link.interfaceIndex, until);
-    if (!gateways) return gateways.error();
     TranslationEvidence evidence;
     for (const AddressDetails& each : *details)
         if (each.assigned.address.isIPv4() && !each.assigned.address.linkLocal())
             evidence.own.push_back({each.assigned.address, each.prefixLength});
     if (evidence.own.empty()) return failure(Reason::notJoined, link.interfaceName + " has no IPv4 address");
-    const auto router = std::ranges::find_if(*gateways, &IPAddress::isIPv4);
-    if (router == gateways->end()) return failure(Reason::notJoined, "there is no default route for IPv4");
+    const auto way = wayOutByIPv4(link, until);
+    if (!way) return way.error();
 
     const Until each = until.within(kTranslationTime);
     auto external = beside([&] {
-        return askExternalAddress(*router, kPortMappingPort, evidence.own.front().address, link.interfaceName,
-                                  each);
+        if (!way->router) return Known<IPAddress>(failure(Reason::notJoined, link.interfaceName + kNoRouter));
+        return askExternalAddress(*way->router, kPortMappingPort, evidence.own.front().address,
+                                  link.interfaceName, each);
     });
     auto mapped = beside([&] { return askStun(link, setup, endpoints, each); });
     const auto target = IPAddress::fromText(endpoints.pingIPv4);

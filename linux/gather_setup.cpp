@@ -15,6 +15,7 @@
 #include "linux/files/proxy_settings.h"
 #include "linux/probe/portal_api.h"
 #include "linux/radio_socket.h"
+#include "linux/route_query.h"
 #include "linux/unmanaged_setup.h"
 #include "service/plain_text.h"
 
@@ -78,8 +79,8 @@ LinkSetup setupFromNetworkManager(Known<Bus>& bus, const Link& link, const Netwo
 
 /// Whether another interface may have brought name servers along.
 bool leadsElsewhere(const Link& link, const Until& until) {
-    const auto ways = gatherWaysOut(link.interfaceIndex, until);
-    return ways && ways->elsewhere;
+    const auto signs = gatherRouteSigns(link.interfaceIndex, until);
+    return signs && signs->elsewhere;
 }
 
 LinkSetup setupFromNetworkd(Known<Bus>& bus, const Link& link, const NetworkdLink& managed,
@@ -156,10 +157,9 @@ Known<WebProxyPlaces> allProxies(const Known<std::string>& ofManager) {
 
 /// Where there is no default route either family may be one of a network that is an island.
 FamiliesOut familiesOut(const Link& link, const Until& until) {
-    const auto gateways = gatherGatewayAddresses(link.interfaceIndex, until);
-    if (!gateways || gateways->empty()) return {};
-    const auto any = std::ranges::count_if(*gateways, &IPAddress::isIPv4);
-    return {any > 0, any < std::ssize(*gateways)};
+    const auto ways = gatherWaysOut(link, until);
+    if (!ways || ways->empty()) return {};
+    return {ways->front().isIPv4, !ways->back().isIPv4};
 }
 
 Known<ConnmanLink> connmanLink(Known<Bus>& bus, const Link& link, const Until& until) {

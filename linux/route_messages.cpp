@@ -1,12 +1,12 @@
 #include "linux/route_messages.h"
 
-#include <arpa/inet.h>
 #include <linux/if_addr.h>
 #include <linux/neighbour.h>
 #include <linux/rtnetlink.h>
+#include <sys/socket.h>
 
 #include <algorithm>
-#include <array>
+#include <utility>
 
 namespace wp {
 namespace {
@@ -36,51 +36,34 @@ std::optional<Address> addressOf(const ifaddrmsg& header, const Attributes& attr
                    (flags & (IFA_F_TENTATIVE | IFA_F_DADFAILED | passed)) == 0};
 }
 
-/// The next hop; one of the other family stands behind two bytes that name it.
-std::optional<Gateway> nextHop(Address::Family family, const Attributes& attributes) {
+/// The router's address; one of the other family stands behind two bytes that name it.
+std::optional<IPAddress> routerIn(const Attributes& attributes) {
     std::optional<Bytes> bytes = attributes.find(RTA_GATEWAY);
-    if (!bytes) {
-        const std::optional<Bytes> via = attributes.find(RTA_VIA);
-        if (!via || via->size() < 2) return std::nullopt;
-        const std::optional<Address::Family> named = familyOf((*via)[0]);
-        if (!named) return std::nullopt;
-        family = *named;
-        bytes = via->subspan(2);
-    }
-    if (bytes->size() != sizeOf(family)) return std::nullopt;
-    return Gateway{family, {bytes->begin(), bytes->end()}, 0};
+    if (const auto via = attributes.find(RTA_VIA); !bytes && via && via->size() > 2) bytes = via->subspan(2);
+    return bytes ? IPAddress::fromBytes(*bytes) : std::nullopt;
 }
 
 /// A route with several next hops names each behind a header of its own.
-std::optional<Gateway> nextHopAmong(Address::Family family, Bytes hops, std::uint32_t interfaceIndex) {
+std::vector<NextHop> hopsAmong(Bytes hops) {
+    std::vector<NextHop> found;
     rtnexthop header;
     while (hops.size() >= sizeof header) {
         std::memcpy(&header, hops.data(), sizeof header);
-        if (header.rtnh_len < sizeof header || header.rtnh_len > hops.size()) return std::nullopt;
+        if (header.rtnh_len < sizeof header || header.rtnh_len > hops.size()) break;
         const Attributes attributes(hops.subspan(sizeof header, header.rtnh_len - sizeof header));
-        if (header.rtnh_ifindex == static_cast<int>(interfaceIndex)) return nextHop(family, attributes);
+        found.push_back({static_cast<std::uint32_t>(header.rtnh_ifindex), routerIn(attributes)});
         hops = hops.subspan(std::min<std::size_t>((header.rtnh_len + 3U) & ~3U, hops.size()));
     }
-    return std::nullopt;
+    return found;
 }
 
-bool isDefaultRoute(const rtmsg& header) {
-    return header.rtm_dst_len == 0 && header.rtm_type == RTN_UNICAST;
-}
-
-std::optional<Gateway> gatewayOf(const rtmsg& header, const Attributes& attributes,
-                                 std::uint32_t interfaceIndex) {
-    const std::optional<Address::Family> family = familyOf(header.rtm_family);
-    const std::uint32_t table = attributes.number<std::uint32_t>(RTA_TABLE).value_or(header.rtm_table);
-    if (!isDefaultRoute(header) || !family || table != RT_TABLE_MAIN) return std::nullopt;
-    std::optional<Gateway> gateway;
-    if (const auto hops = attributes.find(RTA_MULTIPATH)) {
-        gateway = nextHopAmong(*family, *hops, interfaceIndex);
-    } else if (attributes.number<std::uint32_t>(RTA_OIF) == interfaceIndex) {
-        gateway = nextHop(*family, attributes);
-    }
-    if (gateway) gateway->metric = attributes.number<std::uint32_t>(RTA_PRIORITY).value_or(0);
-    return gateway;
+Route routeOf(const rtmsg& header, const Attributes& attributes) {
+    Route route{{}, header.rtm_dst_len};
+    if (const auto hops = attributes.find(RTA_MULTIPATH))
+        route.hops = hopsAmong(*hops);
+    else if (const auto out = attributes.number<std::uint32_t>(RTA_OIF))
+        route.hops = {{*out, routerIn(attributes)}};
+    return route;
 }
 
 template <class Visit>
@@ -99,26 +82,28 @@ Addresses readAddresses(Bytes buffer, std::uint32_t interfaceIndex) {
     return addresses;
 }
 
-std::vector<Gateway> readGateways(Bytes buffer, std::uint32_t interfaceIndex) {
-    std::vector<Gateway> gateways;
+const NextHop* Route::over(std::uint32_t interfaceIndex) const {
+    const auto hop = std::ranges::find(hops, interfaceIndex, &NextHop::interfaceIndex);
+    return hop == hops.end() ? nullptr : &*hop;
+}
+
+std::optional<Route> readRoute(Bytes buffer) {
+    std::optional<Route> first;
+    bool isFirst = true;
     forEachRoute(buffer, [&](const rtmsg& header, const Attributes& attributes) {
-        std::optional<Gateway> gateway = gatewayOf(header, attributes, interfaceIndex);
-        if (gateway) gateways.push_back(std::move(*gateway));
+        if (std::exchange(isFirst, false) && header.rtm_type == RTN_UNICAST)
+            first = routeOf(header, attributes);
     });
-    std::ranges::stable_sort(gateways, [](const Gateway& left, const Gateway& right) {
-        return left.family != right.family ? left.family == Address::Family::ipv4
-                                           : left.metric < right.metric;
-    });
-    return gateways;
+    return first;
 }
 
 bool leadsElsewhere(Bytes buffer, std::uint32_t interfaceIndex) {
     bool found = false;
     forEachRoute(buffer, [&](const rtmsg& header, const Attributes& attributes) {
-        if (!isDefaultRoute(header)) return;
-        const auto out = attributes.number<std::uint32_t>(RTA_OIF);
-        // A route with several next hops leads over several interfaces as a rule.
-        found |= out ? *out != interfaceIndex : attributes.has(RTA_MULTIPATH);
+        if (header.rtm_dst_len != 0 || header.rtm_type != RTN_UNICAST) return;
+        found |= std::ranges::any_of(routeOf(header, attributes).hops, [&](const NextHop& each) {
+            return each.interfaceIndex != interfaceIndex;
+        });
     });
     return found;
 }
@@ -126,10 +111,8 @@ bool leadsElsewhere(Bytes buffer, std::uint32_t interfaceIndex) {
 bool hasAdvertisedRoute(Bytes buffer, std::uint32_t interfaceIndex) {
     bool found = false;
     forEachRoute(buffer, [&](const rtmsg& header, const Attributes& attributes) {
-        if (header.rtm_family != AF_INET6 || header.rtm_protocol != RTPROT_RA) return;
-        const auto hops = attributes.find(RTA_MULTIPATH);
-        found |= hops ? nextHopAmong(Address::Family::ipv6, *hops, interfaceIndex).has_value()
-                      : attributes.number<std::uint32_t>(RTA_OIF) == interfaceIndex;
+        found |= header.rtm_family == AF_INET6 && header.rtm_protocol == RTPROT_RA &&
+                 routeOf(header, attributes).over(interfaceIndex) != nullptr;
     });
     return found;
 }
@@ -142,13 +125,6 @@ bool isReachable(Bytes buffer, std::uint32_t interfaceIndex, Bytes address) {
         found |= of && std::ranges::equal(*of, address) && (header.ndm_state & NUD_REACHABLE) != 0;
     });
     return found;
-}
-
-std::string textOf(Address::Family family, Bytes address) {
-    std::array<char, INET6_ADDRSTRLEN> text{};
-    if (address.size() != sizeOf(family)) return {};
-    inet_ntop(family == Address::Family::ipv4 ? AF_INET : AF_INET6, address.data(), text.data(), text.size());
-    return text.data();
 }
 
 }  // namespace wp

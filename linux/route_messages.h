@@ -5,6 +5,7 @@
 
 #include "linux/netlink_reader.h"
 #include "service/facts.h"
+#include "service/ip_address.h"
 
 namespace wp {
 
@@ -14,15 +15,23 @@ namespace wp {
 /// The addresses of one interface.
 Addresses readAddresses(Bytes buffer, std::uint32_t interfaceIndex);
 
-/// A default route's next hop.
-struct Gateway {
-    Address::Family family = Address::Family::ipv4;
-    std::vector<std::uint8_t> bytes;  ///< 4 or 16
-    std::uint32_t metric = 0;         ///< the lowest is used
+/// Where a route leads next.
+struct NextHop {
+    std::uint32_t interfaceIndex = 0;
+    std::optional<IPAddress> router;  ///< absent: the destination is looked for on the link itself
 };
 
-/// The next hops of the interface's default routes in the main table, the ones in use first, IPv4 before IPv6.
-std::vector<Gateway> readGateways(Bytes buffer, std::uint32_t interfaceIndex);
+/// A route to other machines.
+struct Route {
+    std::vector<NextHop> hops;  ///< several share what is sent
+    unsigned prefixLength = 0;  ///< of the destinations that it is for; 0 for a default route
+
+    /// The hop over the interface; null where it does not lead over that.
+    const NextHop* over(std::uint32_t interfaceIndex) const;
+};
+
+/// The first route in the buffer, as the kernel's answer holds it; nothing where that leads to no other machine.
+std::optional<Route> readRoute(Bytes buffer);
 
 /// Whether a default route, of whatever table, leads over another interface: a cable's, or a tunnel's.
 bool leadsElsewhere(Bytes buffer, std::uint32_t interfaceIndex);
@@ -33,8 +42,5 @@ bool hasAdvertisedRoute(Bytes buffer, std::uint32_t interfaceIndex);
 
 /// Whether the kernel has lately heard from the neighbour of this address on the interface, though it may ignore pings.
 bool isReachable(Bytes buffer, std::uint32_t interfaceIndex, Bytes address);
-
-/// "10.0.0.1", "fe80::1". *Any* thread.
-std::string textOf(Address::Family family, Bytes address);
 
 }  // namespace wp

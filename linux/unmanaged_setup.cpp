@@ -13,6 +13,7 @@
 #include "linux/files/iwd_settings.h"
 #include "linux/files/key_value_file.h"
 #include "linux/files/resolver_records.h"
+#include "linux/route_query.h"
 
 namespace wp {
 namespace {
@@ -53,7 +54,8 @@ ClientLeases readClientLeases(const Link& link, const std::vector<AddressDetails
 /// All that tells how the interface was set up.
 struct Evidence {
     std::vector<AssignedAddress> assigned;
-    Known<WaysOut> ways;
+    Known<RouteSigns> signs;
+    std::vector<IPAddress> routers;
     bool isIwds = false;
     ClientLeases leases;
     DhcpClients clients;
@@ -92,12 +94,15 @@ Known<Evidence> gatherEvidence(Known<Bus>& bus, const Link& link, const Until& u
     const auto details = gatherAddressDetails(link.interfaceIndex, until);
     if (!details) return details.error();
     Evidence evidence;
-    evidence.ways = gatherWaysOut(link.interfaceIndex, until);
+    evidence.signs = gatherRouteSigns(link.interfaceIndex, until);
+    if (const auto ways = gatherWaysOut(link, until))
+        for (const WayOut& each : *ways)
+            if (each.router) evidence.routers.push_back(*each.router);
     evidence.isIwds = iwdSetsAddresses(bus, link, until);
     evidence.clients = dhcpClientsOf(link.interfaceName, bus ? Connman::answers : Connman::silent);
     evidence.leases = readClientLeases(link, *details);
     const bool byClient = evidence.isIwds || evidence.clients.asksRouters;
-    evidence.assigned = assignedOf(*details, byClient && evidence.ways && evidence.ways->advertised,
+    evidence.assigned = assignedOf(*details, byClient && evidence.signs && evidence.signs->advertised,
                                    evidence.leases.ipv6 ? evidence.leases.ipv6->addresses : Servers());
     readPlans(link, evidence);
     evidence.records = resolverRecords(link.interfaceName);
@@ -133,14 +138,15 @@ NameServers serversFrom(const Evidence& evidence, const AskedServers& asked) {
     names.offerKnown = leases.ipv4 || records.offerKnown;
     // What a router advertised is written down nowhere.
     names.advertisementsKnown = false;
-    if (!evidence.ways) return names;
-    names.routers = evidence.ways->gateways;
+    names.routers = evidence.routers;
+    if (!evidence.signs) return names;
     // Another interface may have brought along what is not explained here, unless records tell the interfaces apart.
-    if (evidence.ways->elsewhere && !asked.ofLinkAlone && records.elsewhere.empty()) names.offerKnown = false;
+    if (evidence.signs->elsewhere && !asked.ofLinkAlone && records.elsewhere.empty())
+        names.offerKnown = false;
     if (names.offerKnown) return names;
     // Nobody offers anything to an interface that was set up by hand; another one may have brought the servers along.
     names.offerKnown = names.advertisementsKnown =
-        !evidence.clients.any && !evidence.ways->elsewhere && allSetByHand(evidence.assigned);
+        !evidence.clients.any && !evidence.signs->elsewhere && allSetByHand(evidence.assigned);
     return names;
 }
 

@@ -1,5 +1,6 @@
 #include "linux/probe/ip_socket.h"
 
+#include <net/if.h>
 #include <netinet/in.h>
 
 #include <algorithm>
@@ -20,6 +21,20 @@ bool receiveNext(const Descriptor& socket, const AcceptDatagram& accept) {
     const ssize_t size = ::recvfrom(socket.number(), buffer.data(), buffer.size(), MSG_DONTWAIT,
                                     reinterpret_cast<sockaddr*>(&from.storage), &from.size);
     return size >= 0 && from.address() && accept({buffer.data(), static_cast<std::size_t>(size)}, from);
+}
+
+/// Bound to the interface alone.
+Known<Descriptor> boundSocket(int type, const IPAddress& address, const std::string& interfaceName) {
+    const int family = address.isIPv4() ? AF_INET : AF_INET6;
+    Descriptor socket(::socket(family, type | SOCK_CLOEXEC | SOCK_NONBLOCK, 0));
+    if (!socket)
+        return failure(Reason::unsupported, std::string("no socket of this family: ") + std::strerror(errno));
+    const auto size = static_cast<socklen_t>(interfaceName.size());
+    if (size != 0 &&
+        ::setsockopt(socket.number(), SOL_SOCKET, SO_BINDTODEVICE, interfaceName.c_str(), size) != 0)
+        return failure(errno == EPERM ? Reason::notPermitted : Reason::noInterface,
+                       "cannot send over " + interfaceName + ": " + std::strerror(errno));
+    return socket;
 }
 
 }  // namespace
@@ -63,21 +78,34 @@ bool SocketAddress::isSame(const SocketAddress& other) const {
 }
 
 Known<Descriptor> ipSocket(int type, const IPAddress& address, const std::string& interfaceName) {
-    const int family = address.isIPv4() ? AF_INET : AF_INET6;
-    Descriptor socket(::socket(family, type | SOCK_CLOEXEC | SOCK_NONBLOCK, 0));
-    if (!socket)
-        return failure(Reason::unsupported, std::string("no socket of this family: ") + std::strerror(errno));
-    const auto size = static_cast<socklen_t>(interfaceName.size());
-    if (size != 0 &&
-        ::setsockopt(socket.number(), SOL_SOCKET, SO_BINDTODEVICE, interfaceName.c_str(), size) != 0)
-        return failure(errno == EPERM ? Reason::notPermitted : Reason::noInterface,
-                       "cannot send over " + interfaceName + ": " + std::strerror(errno));
+    Known<Descriptor> socket = boundSocket(type, address, interfaceName);
+    if (!socket || type != SOCK_DGRAM || interfaceName.empty()) return socket;
+    // Without it the datagrams go where those go that come from nowhere in particular.
+    if (const auto source = sourceToward(address, interfaceName)) {
+        const SocketAddress own = SocketAddress::of(*source, 0, ::if_nametoindex(interfaceName.c_str()));
+        (void)::bind(socket->number(), own.raw(), own.size);
+    }
     return socket;
+}
+
+std::optional<IPAddress> sourceToward(const IPAddress& destination, const std::string& interfaceName) {
+    constexpr std::uint16_t kAnyPort = 9;
+    const auto socket = boundSocket(SOCK_DGRAM, destination, interfaceName);
+    if (!socket) return std::nullopt;
+    const SocketAddress target =
+        SocketAddress::of(destination, kAnyPort, ::if_nametoindex(interfaceName.c_str()));
+    SocketAddress own;
+    own.size = sizeof own.storage;
+    // That only chooses the way; nothing is sent.
+    if (::connect(socket->number(), target.raw(), target.size) != 0 ||
+        ::getsockname(socket->number(), reinterpret_cast<sockaddr*>(&own.storage), &own.size) != 0)
+        return std::nullopt;
+    return own.address();
 }
 
 std::optional<Error> refusalOf(const std::string& interfaceName) {
     if (interfaceName.empty()) return std::nullopt;
-    const auto socket = ipSocket(SOCK_DGRAM, *IPAddress::fromText("0.0.0.0"), interfaceName);
+    const auto socket = boundSocket(SOCK_DGRAM, IPAddress(), interfaceName);
     return socket ? std::nullopt : std::optional(socket.error());
 }
 

@@ -27,10 +27,14 @@ struct SocketAddress {
     const sockaddr* raw() const { return reinterpret_cast<const sockaddr*>(&storage); }
 };
 
-/// A socket of the family of `address` that never blocks, bound to the interface where one is named. Being refused
-/// the interface is `notPermitted`.
+/// A socket of the family of `address` that never blocks, bound to the interface where one is named; one for datagrams
+/// also to the source that the kernel takes there. Being refused the interface is `notPermitted`.
 /// \param type SOCK_DGRAM or SOCK_STREAM
 Known<Descriptor> ipSocket(int type, const IPAddress& address, const std::string& interfaceName);
+
+/// The interface's address from which the kernel sends to that one over it. A socket that is not connected is led on before
+/// it has one, past the rules of routes that go by it. Nothing where no address is reached so. *Any* thread.
+std::optional<IPAddress> sourceToward(const IPAddress& destination, const std::string& interfaceName);
 
 /// Why no socket can be bound to the interface; nothing where one can, or where none is named. Kernels before 5.7 want
 /// CAP_NET_RAW for it. Whoever leaves this out tells of a network that was never asked. *Any* thread.

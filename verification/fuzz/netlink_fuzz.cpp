@@ -16,7 +16,9 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     readAbilities(buffer, 0);
     readScanEvents(buffer);
     readAddresses(buffer, 3);
-    readGateways(buffer, 3);
+    readRoute(buffer);
+    leadsElsewhere(buffer, 3);
+    hasAdvertisedRoute(buffer, 3);
     readMaster(buffer, 3);
     return 0;
 }

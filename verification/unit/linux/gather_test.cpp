@@ -12,6 +12,8 @@
 #include "linux/fact_table.h"
 #include "linux/gather_reach.h"
 #include "linux/gather_setup.h"
+#include "linux/probe/ip_socket.h"
+#include "linux/route_query.h"
 #include "verification/unit/fakes/temporary_folder.h"
 #include "verification/unit/linux/fakes/loopback_socket.h"
 #include "verification/unit/linux/fakes/refusing_kernel.h"
@@ -120,15 +122,14 @@ TEST(GatherEcho, NeedsARouter) {
 }
 
 /// Who of five echo requests to an address was answered.
-Known<Echo> echoFrom(std::vector<std::uint8_t> address, HomeChannel::Stay& stay) {
+Known<Echo> echoFrom(const char* address, HomeChannel::Stay& stay) {
     EchoSocket socket;
-    return socket.ask({Address::Family::ipv4, std::move(address), 0}, "lo", loopback().interfaceIndex, stay,
-                      patience());
+    return socket.ask(*IPAddress::fromText(address), "lo", loopback().interfaceIndex, stay, patience());
 }
 
-const std::vector<std::uint8_t> kAnswering = {127, 0, 0, 1};
+constexpr const char* kAnswering = "127.0.0.1";
 // Of documentation (RFC 5737): what leaves for it by the loopback interface reaches nobody.
-const std::vector<std::uint8_t> kSilent = {192, 0, 2, 1};
+constexpr const char* kSilent = "192.0.2.1";
 
 bool isAnswered(const std::optional<double>& roundTrip) {
     return roundTrip.has_value();
@@ -182,10 +183,41 @@ TEST(EchoSocket, LetsVisitsHappenBetweenAnAnswerAndTheNextRequest) {
     EXPECT_TRUE(wasVisited);
 }
 
+TEST(RouteQuery, LeadsOverLoopbackToNobodyElse) {
+    const auto outside = routeOver(loopback(), *IPAddress::fromText("192.0.2.1"), patience());
+    const auto itself = routeFor({*IPAddress::fromText("127.0.0.1")}, patience());
+    const auto ways = gatherWaysOut(loopback(), patience());
+
+    ASSERT_TRUE(outside && itself && ways);
+    EXPECT_FALSE(outside->has_value());
+    EXPECT_FALSE(itself->has_value());
+    EXPECT_TRUE(ways->empty());
+}
+
+TEST(RouteQuery, EndsWhenItIsStopped) {
+    const auto stop = std::make_shared<StopSignal>();
+    stop->raise();
+    EXPECT_EQ(textOf(gatherWaysOut(loopback(), patience(std::chrono::seconds(20), stop))),
+              "cancelled (code 8)");
+}
+
+TEST(IpSocket, OfDatagramsHasTheAddressThatTheKernelSendsFrom) {
+    const IPAddress here = *IPAddress::fromText("127.0.0.7");
+    const auto socket = ipSocket(SOCK_DGRAM, here, "lo");
+    ASSERT_TRUE(socket);
+    SocketAddress own;
+    own.size = sizeof own.storage;
+    ASSERT_EQ(0, getsockname(socket->number(), reinterpret_cast<sockaddr*>(&own.storage), &own.size));
+
+    EXPECT_EQ(sourceToward(here, "lo"), own.address());
+    EXPECT_TRUE(own.address()->loopback());
+    EXPECT_EQ(std::nullopt, sourceToward(here, "no-such-wifi"));
+}
+
 TEST(GatherReach, WithoutARouterNothingIsSearched) {
     EXPECT_EQ(textOf(gatherRouter(loopback(), patience())), "lo has no default route for IPv4 (code 2)");
     EXPECT_EQ(textOf(gatherTranslation(loopback(), {}, std::nullopt, {}, patience())),
-              "there is no default route for IPv4 (code 2)");
+              "lo has no default route for IPv4 (code 2)");
 }
 
 TEST(GatherReach, EndpointsThatAreEmptyCannotBeTold) {

@@ -23,7 +23,7 @@ std::uint32_t interfaceIn(const std::string& scenario) {
 std::vector<std::string> texts(const Addresses& addresses) {
     std::vector<std::string> texts;
     for (const Address& each : addresses) {
-        if (each.global && each.usable) texts.push_back(textOf(each.family, each.bytes));
+        if (each.global && each.usable) texts.push_back(IPAddress::fromBytes(each.bytes)->text());
     }
     return texts;
 }
@@ -98,18 +98,16 @@ TEST(RouteMessages, TellANeighbourThatWasHeardOf) {
         EXPECT_FALSE(isReachable(Bytes(reachable).first(size), 3, address));
 }
 
-TEST(RouteMessages, TellTheGateway) {
-    const auto gateways = readGateways(captured("good-home-route"), interfaceIn("good-home"));
-
-    ASSERT_FALSE(gateways.empty());
-    EXPECT_EQ("10.0.0.1", textOf(gateways[0].family, gateways[0].bytes));
-}
-
 TEST(RouteMessages, TellWhetherAnotherInterfaceLeadsOut) {
     const auto routes = captured("good-home-route");
 
     EXPECT_FALSE(leadsElsewhere(routes, interfaceIn("good-home")));
     EXPECT_TRUE(leadsElsewhere(routes, 4711));
+}
+
+std::vector<std::uint8_t> wholeOf(NetlinkRequest& message) {
+    const auto* bytes = reinterpret_cast<const std::uint8_t*>(&message.message());
+    return {bytes, bytes + message.message().nlmsg_len};
 }
 
 /// The kernel's message on a route over interface 3 to 2001:db8::/64.
@@ -119,8 +117,63 @@ std::vector<std::uint8_t> routeMessage(unsigned char family, unsigned char proto
     message.header<rtmsg>() = {family, 64, 0, 0, RT_TABLE_MAIN, protocol, RT_SCOPE_UNIVERSE, RTN_UNICAST, 0};
     message.put(RTA_DST, network);
     message.put(RTA_OIF, std::uint32_t{3});
-    const auto* bytes = reinterpret_cast<const std::uint8_t*>(&message.message());
-    return {bytes, bytes + message.message().nlmsg_len};
+    return wholeOf(message);
+}
+
+/// On a default route of IPv4 of that type over interface 3. \param router its attribute, and what stands in it
+std::vector<std::uint8_t> defaultRouteMessage(unsigned char type, std::uint16_t router = 0,
+                                              std::vector<std::uint8_t> content = {}) {
+    NetlinkRequest message(RTM_NEWROUTE, 0);
+    message.header<rtmsg>() = {AF_INET, 0, 0, 0, RT_TABLE_MAIN, RTPROT_DHCP, RT_SCOPE_UNIVERSE, type, 0};
+    message.put(RTA_OIF, std::uint32_t{3});
+    if (router != 0) message.put(router, content);
+    return wholeOf(message);
+}
+
+/// Prefix, then each hop's interface and router.
+std::string textOf(const std::optional<Route>& route) {
+    if (!route) return "none";
+    std::string text = "/" + std::to_string(route->prefixLength);
+    for (const NextHop& each : route->hops)
+        text += " " + std::to_string(each.interfaceIndex) + (each.router ? " " + each.router->text() : "");
+    return text;
+}
+
+TEST(RouteMessages, TellARouteAndItsRouter) {
+    const std::vector<std::uint8_t> router = {10, 0, 0, 1};
+    const std::vector<std::uint8_t> ofIPv6 = {AF_INET6, 0, 0xFE, 0x80, 0, 0, 0, 0, 0,
+                                              0,        0, 0,    0,    0, 0, 0, 0, 1};
+    EXPECT_EQ("/0 3 10.0.0.1", textOf(readRoute(defaultRouteMessage(RTN_UNICAST, RTA_GATEWAY, router))));
+    EXPECT_EQ("/0 3 fe80::1", textOf(readRoute(defaultRouteMessage(RTN_UNICAST, RTA_VIA, ofIPv6))));
+    EXPECT_EQ("/0 3", textOf(readRoute(defaultRouteMessage(RTN_UNICAST)))) << "on the link itself";
+    EXPECT_EQ("/64 3", textOf(readRoute(routeMessage(AF_INET6, RTPROT_RA))));
+    EXPECT_EQ("none", textOf(readRoute(defaultRouteMessage(RTN_LOCAL))));
+    EXPECT_EQ("none", textOf(readRoute(defaultRouteMessage(RTN_UNREACHABLE))));
+    EXPECT_EQ("none", textOf(readRoute({})));
+}
+
+TEST(RouteMessages, TellEachHopOfARouteThatHasSeveral) {
+    struct Hop {
+        rtnexthop header;
+        nlattr attribute;
+        std::uint8_t router[4];
+    };
+    const Hop hops[] = {{{sizeof(Hop), 0, 0, 3}, {8, RTA_GATEWAY}, {10, 0, 0, 1}},
+                        {{sizeof(Hop), 0, 0, 4}, {8, RTA_GATEWAY}, {10, 0, 1, 1}}};
+    const auto* const bytes = reinterpret_cast<const std::uint8_t*>(hops);
+    NetlinkRequest message(RTM_NEWROUTE, 0);
+    message.header<rtmsg>() = {AF_INET, 0, 0, 0, RT_TABLE_MAIN, 0, RT_SCOPE_UNIVERSE, RTN_UNICAST, 0};
+    message.put(RTA_MULTIPATH, Bytes(bytes, sizeof hops));
+    const auto whole = wholeOf(message);
+    const auto route = readRoute(whole);
+
+    EXPECT_EQ("/0 3 10.0.0.1 4 10.0.1.1", textOf(route));
+    ASSERT_TRUE(route && route->over(4));
+    EXPECT_EQ("10.0.1.1", route->over(4)->router->text());
+    EXPECT_EQ(nullptr, route->over(5));
+    EXPECT_TRUE(leadsElsewhere(whole, 3));
+    for (std::size_t size = 0; size < whole.size(); ++size)
+        EXPECT_EQ("none", textOf(readRoute(Bytes(whole).first(size))));
 }
 
 TEST(RouteMessages, TellWhetherARouterAdvertisedARoute) {
@@ -132,18 +185,6 @@ TEST(RouteMessages, TellWhetherARouterAdvertisedARoute) {
     EXPECT_FALSE(hasAdvertisedRoute(routeMessage(AF_INET, RTPROT_RA), 3));
     for (std::size_t size = 0; size < advertised.size(); ++size)
         EXPECT_FALSE(hasAdvertisedRoute(Bytes(advertised).first(size), 3));
-}
-
-TEST(RouteMessages, TellAnIPv6GatewayWhereThereIsNoOther) {
-    const auto gateways = readGateways(captured("ipv6-only-route"), interfaceIn("ipv6-only"));
-
-    ASSERT_FALSE(gateways.empty());
-    EXPECT_EQ(Address::Family::ipv6, gateways[0].family);
-}
-
-TEST(RouteMessages, TellNoGatewayWithoutARoute) {
-    EXPECT_TRUE(readGateways(captured("not-joined-route"), interfaceIn("not-joined")).empty());
-    EXPECT_TRUE(readGateways(captured("good-home-route"), 4711).empty());
 }
 
 /// Address, length of its network, and what is special: it lasts forever, the kernel made it
@@ -205,7 +246,8 @@ TEST(RouteMessages, SurviveAnyCutOfADump) {
     for (std::size_t size = 0; size <= dump.size(); ++size) {
         const std::vector<std::uint8_t> prefix(dump.begin(),
                                                dump.begin() + static_cast<std::ptrdiff_t>(size));
-        EXPECT_LE(readGateways(prefix, 3).size(), 4U);
+        readRoute(prefix);
+        leadsElsewhere(prefix, 3);
         EXPECT_LE(readAddresses(prefix, 3).size(), 16U);
     }
 }
