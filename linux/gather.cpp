@@ -13,6 +13,7 @@
 
 #include "linux/files/key_value_file.h"
 #include "linux/link_master.h"
+#include "linux/reverse_path_filter.h"
 #include "linux/route_dump.h"
 #include "linux/route_messages.h"
 #include "linux/route_query.h"
@@ -272,6 +273,16 @@ bool answersAsNeighbour(const Link& link, const std::string& address, const Unti
     return dump && wanted && isReachable(*dump, link.interfaceIndex, wanted->bytes());
 }
 
+Known<Echo> askForEcho(const Link& link, const IPAddress& target, EchoSocket& socket, HomeChannel::Stay& stay,
+                       const Until& until) {
+    Known<Echo> echo = socket.ask(target, link.interfaceName, link.interfaceIndex, stay, until);
+    const bool isSilent =
+        echo && std::ranges::none_of(echo->roundTrips, [](const auto& each) { return each.has_value(); });
+    if (!isSilent) return echo;
+    const auto dropped = droppedByFilter(link, {target}, until);
+    return dropped ? Known<Echo>(*dropped) : echo;
+}
+
 Known<Echo> gatherGatewayEcho(const Link& link, EchoSocket& socket, HomeChannel::Stay& stay,
                               const Until& until) {
     if (!link.joined) return notJoined(link);
@@ -280,7 +291,7 @@ Known<Echo> gatherGatewayEcho(const Link& link, EchoSocket& socket, HomeChannel:
     if (ways->empty()) return failure(Reason::notJoined, link.interfaceName + " has no default route");
     const auto way = std::ranges::find_if(*ways, [](const WayOut& each) { return each.router.has_value(); });
     if (way == ways->end()) return failure(Reason::notJoined, link.interfaceName + kNoRouter);
-    return socket.ask(*way->router, link.interfaceName, link.interfaceIndex, stay, until);
+    return askForEcho(link, *way->router, socket, stay, until);
 }
 
 }  // namespace wp

@@ -32,6 +32,11 @@ Known<Station> gatherStation(const Link& link, const Until& until);
 Known<Survey> gatherSurvey(const Link& link, const Until& until);
 Known<Regulation> gatherRegulation(const Link& link, const Until& until);
 Known<Addresses> gatherAddresses(const Link& link, const Until& until);
+/// Echo requests to the address over the link. Where all stay unanswered because this device drops the answers, that is the
+/// error.
+Known<Echo> askForEcho(const Link& link, const IPAddress& target, EchoSocket& socket, HomeChannel::Stay& stay,
+                       const Until& until);
+/// Those to the router.
 Known<Echo> gatherGatewayEcho(const Link& link, EchoSocket& socket, HomeChannel::Stay& stay,
                               const Until& until);
 

@@ -6,6 +6,7 @@
 #include <system_error>
 
 #include "linux/address_details.h"
+#include "linux/gather.h"
 #include "linux/probe/name_lookup.h"
 #include "linux/probe/port_mapping.h"
 #include "linux/probe/portal_api.h"
@@ -13,6 +14,7 @@
 #include "linux/probe/translation_probes.h"
 #include "linux/probe/web_client.h"
 #include "linux/probe/web_place.h"
+#include "linux/reverse_path_filter.h"
 #include "linux/route_query.h"
 
 namespace wp {
@@ -51,6 +53,15 @@ NameServerSet serversOf(const Link& link, const LinkSetup& setup) {
             .leadsOut = setup.leadsOut};
 }
 
+/// Asks the link's name servers. Where none says anything because this device drops what they say, that is the error.
+Known<NameAnswer> askForName(const std::string& name, const Link& link, const LinkSetup& setup,
+                             const Until& until) {
+    auto answer = lookUpName(name, serversOf(link, setup), until.within(kNameTime));
+    if (!answer || answer->heard) return answer;
+    const auto dropped = droppedByFilter(link, setup.servers, until);
+    return dropped ? Known<NameAnswer>(*dropped) : answer;
+}
+
 /// Where a host can be asked, whose name may be an address itself; else why it cannot.
 Known<NameAnswer> lookUpHost(const std::string& host, const Link& link, const LinkSetup& setup,
                              const Until& until) {
@@ -59,7 +70,7 @@ Known<NameAnswer> lookUpHost(const std::string& host, const Link& link, const Li
         literal.addresses = {*address};
         return literal;
     }
-    auto answer = lookUpName(host, serversOf(link, setup), until.within(kNameTime));
+    auto answer = askForName(host, link, setup, until);
     if (!answer) return answer;
     auto places = placesOf(*answer);
     if (places.empty()) answer->why = whyNowhere(*answer);
@@ -101,6 +112,13 @@ PortalAnswer portalAnswer(const WebAnswer& answer, const WebRequest& request) {
     portal.clockOffset = answer.clockOffset;
     portal.bodyIsWhole = answer.bodyCame == WebAnswer::Body::whole;
     return portal;
+}
+
+/// Why no server could be connected to that may well be there: this device drops what it says.
+std::optional<Error> droppedAnswer(const WebRequest& request, const WebAnswer& answer, const Link& link,
+                                   const Until& until) {
+    if (answer.end != WebAnswer::End::failed || answer.steps.connect) return std::nullopt;
+    return droppedByFilter(link, request.addresses, until);
 }
 
 /// What the network declares. An API is believed only over a secure connection.
@@ -175,6 +193,7 @@ Known<ServiceContact> contact(const std::string& url, bool connectOnly, const Li
     // Without them nothing can be said of the network.
     if (answers->front().end == WebAnswer::End::noAuthorities)
         return failure(Reason::badConfiguration, answers->front().why);
+    if (const auto dropped = droppedAnswer(*request, answers->front(), link, until)) return *dropped;
     return contactOf(answers->front());
 }
 
@@ -214,7 +233,7 @@ Known<Echo> gatherOutsideEcho(const Link& link, const Endpoints& endpoints, Echo
     if (ways->empty()) return failure(Reason::notJoined, link.interfaceName + " has no default route");
     for (const WayOut& each : *ways)
         if (const auto target = IPAddress::fromText(each.isIPv4 ? endpoints.pingIPv4 : endpoints.pingIPv6))
-            return socket.ask(*target, link.interfaceName, link.interfaceIndex, stay, until);
+            return askForEcho(link, *target, socket, stay, until);
     return notConfigured("the ping beyond the router");
 }
 
@@ -226,7 +245,7 @@ Known<NameAnswer> gatherNameAnswer(const Link& link, const LinkSetup& setup, con
         endpoints.nameWildcard.empty() ? endpoints.name : freshName(endpoints.nameWildcard);
     const NameServerSet servers = serversOf(link, setup);
     auto each = beside([&] { return askEachServer(name, servers, until.within(kNameTime)); });
-    Known<NameAnswer> answer = lookUpName(name, servers, until.within(kNameTime));
+    Known<NameAnswer> answer = askForName(name, link, setup, until);
     const auto answers = each.get();
     if (answer && answers) answer->servers = *answers;
     return answer;
@@ -252,6 +271,10 @@ Known<PortalEvidence> gatherPortal(const Link& link, const LinkSetup& setup, con
     if (!declared) return declared.error();
     if (plainUrl.empty() && !declared->captive && !declared->unrestricted)
         return notConfigured("the captive portal's probe");
+    if (!declared->captive && !declared->unrestricted) {
+        if (const auto dropped = droppedAnswer(*plain, (*answers)[0], link, until)) return *dropped;
+        if (const auto dropped = droppedAnswer(*secure, (*answers)[1], link, until)) return *dropped;
+    }
     return PortalEvidence{*declared, portalAnswer((*answers)[0], *plain),
                           portalAnswer((*answers)[1], *secure)};
 }

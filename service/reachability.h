@@ -27,6 +27,7 @@ struct NameAnswer {
     std::string why;  ///< where there is no address: what the servers said
     std::chrono::milliseconds took{0};
     std::vector<NameServerAnswer> servers{};  ///< the same question to each server, for the details alone
+    bool heard = true;  ///< whether a server said anything at all, or there was none to be asked
 };
 
 /// Over which families an interface leads beyond its own network.

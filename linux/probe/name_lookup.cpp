@@ -42,6 +42,7 @@ struct Lookup {
     std::vector<IPAddress> addresses;
     std::string why;
     int running = 0;
+    bool heard = false;  ///< whether a server said anything
 };
 
 enum class Zones { told, leftOut };
@@ -101,10 +102,39 @@ Known<Channel> openChannel(const NameServerSet& whom, int tries, int moreFlags =
     return channel;
 }
 
+/// What a status of the library says about the server.
+std::string codeOf(int status) {
+    switch (status) {
+        case ARES_SUCCESS:
+            return "NOERROR";
+        case ARES_ENODATA:
+            return "NODATA";
+        case ARES_ENOTFOUND:
+            return "NXDOMAIN";
+        case ARES_ESERVFAIL:
+            return "SERVFAIL";
+        case ARES_EREFUSED:
+            return "REFUSED";
+        case ARES_EFORMERR:
+            return "FORMERR";
+        case ARES_ENOTIMP:
+            return "NOTIMP";
+        case ARES_ECONNREFUSED:
+            return "unreachable";
+        default:
+            return "timeout";
+    }
+}
+
+bool isAnswer(const std::string& code) {
+    return code != "timeout" && code != "unreachable";
+}
+
 template <RecordType kType>
 void keepAnswer(void* place, int status, int, unsigned char* answer, int size) {
     auto& lookup = *static_cast<Lookup*>(place);
     --lookup.running;
+    lookup.heard |= isAnswer(codeOf(status));
     if (status == ARES_SUCCESS)
         std::ranges::copy(addressesFromAnswer(kType, {answer, static_cast<std::size_t>(size)}),
                           std::back_inserter(lookup.addresses));
@@ -195,35 +225,11 @@ struct Asking {
     Channel channel;  // last: it answers to the others when it goes
 };
 
-/// What a status of the library says about the server.
-std::string codeOf(int status) {
-    switch (status) {
-        case ARES_SUCCESS:
-            return "NOERROR";
-        case ARES_ENODATA:
-            return "NODATA";
-        case ARES_ENOTFOUND:
-            return "NXDOMAIN";
-        case ARES_ESERVFAIL:
-            return "SERVFAIL";
-        case ARES_EREFUSED:
-            return "REFUSED";
-        case ARES_EFORMERR:
-            return "FORMERR";
-        case ARES_ENOTIMP:
-            return "NOTIMP";
-        case ARES_ECONNREFUSED:
-            return "unreachable";
-        default:
-            return "timeout";
-    }
-}
-
 void keepServerAnswer(void* place, int status, int, unsigned char*, int) {
     auto& asking = *static_cast<Asking*>(place);
     asking.running = false;
     asking.answer.code = codeOf(status);
-    asking.answer.answered = asking.answer.code != "timeout" && asking.answer.code != "unreachable";
+    asking.answer.answered = isAnswer(asking.answer.code);
     asking.answer.took = std::chrono::duration<double, std::milli>(Clock::now() - asking.start).count();
 }
 
@@ -262,6 +268,7 @@ Known<NameAnswer> lookUpName(const std::string& name, const NameServerSet& whom,
     }
     answer.took =
         std::chrono::duration_cast<std::chrono::milliseconds>(usableAt.value_or(Clock::now()) - start);
+    answer.heard = lookup.heard;
     answer.addresses = lookup.addresses;
     if (lookup.addresses.empty())
         answer.why = lookup.why.empty() ? "no name server answered in time" : lookup.why;

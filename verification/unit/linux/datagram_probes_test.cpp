@@ -202,6 +202,7 @@ TEST(NameLookup, ANameThatDoesNotExistIsAnAnswer) {
     ASSERT_TRUE(answer);
     EXPECT_TRUE(answer->addresses.empty());
     EXPECT_EQ(answer->why, "Domain name not found");
+    EXPECT_TRUE(answer->heard);
 }
 
 TEST(NameLookup, OneFamilyWithoutRecordsIsNoFailure) {
@@ -242,6 +243,7 @@ TEST(NameLookup, ADeadServerAndNoServerAreAnswersWithoutAddresses) {
     ASSERT_TRUE(dead && none);
     EXPECT_TRUE(dead->addresses.empty());
     EXPECT_EQ(dead->why, "no name server answered in time");
+    EXPECT_FALSE(dead->heard);
     EXPECT_EQ(none->why, "there is no name server");
 }
 
