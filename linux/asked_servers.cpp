@@ -7,6 +7,7 @@
 #include "linux/files/dnsmasq.h"
 #include "linux/files/key_value_file.h"
 #include "linux/files/leases.h"
+#include "linux/route_query.h"
 
 namespace wp {
 namespace {
@@ -49,9 +50,19 @@ AskedServers behindResolver(Known<Bus>& bus, const Link& link, const Servers& na
     return united(*resolved);
 }
 
-}  // namespace
+/// Whether a route over another interface leads there that is for fewer addresses than any over this one. A default route
+/// is no such route, be it in two halves; a cable may have the preferred one.
+bool isElsewhere(const IPAddress& server, const Link& link, const Until& until) {
+    constexpr unsigned kHalf = 1;
+    if (server.loopback() || server.linkLocal()) return false;
+    const auto best = routeFor({server}, until);
+    if (!best || !*best || (*best)->over(link.interfaceIndex) != nullptr || (*best)->prefixLength <= kHalf)
+        return false;
+    const auto own = routeOver(link, server, until);
+    return own && (!*own || (*own)->prefixLength < (*best)->prefixLength);
+}
 
-AskedServers askedServers(Known<Bus>& bus, const Link& link, const Servers& ofManager, const Until& until) {
+AskedServers serversInUse(Known<Bus>& bus, const Link& link, const Servers& ofManager, const Until& until) {
     const auto file = readSmallFile("/etc/resolv.conf");
     AskedServers asked{file ? serversFromResolverFile(*file) : Servers(), {}};
     if (isResolvedsFile())
@@ -65,6 +76,16 @@ AskedServers askedServers(Known<Bus>& bus, const Link& link, const Servers& ofMa
     add(asked.all, behind.all);
     behind.all = std::move(asked.all);
     return behind;
+}
+
+}  // namespace
+
+AskedServers askedServers(Known<Bus>& bus, const Link& link, const Servers& ofManager, const Until& until) {
+    AskedServers asked = serversInUse(bus, link, ofManager, until);
+    if (asked.ofLinkAlone) return asked;
+    for (const IPAddress& each : asked.all)
+        if (!contains(ofManager, each) && isElsewhere(each, link, until)) asked.elsewhere.push_back(each);
+    return asked;
 }
 
 }  // namespace wp

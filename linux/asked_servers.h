@@ -13,6 +13,7 @@ struct AskedServers {
     Servers all;
     Servers entered;           ///< those that stand in the settings of a resolver on the device
     bool ofLinkAlone = false;  ///< but for those entered; else another interface may have brought some along
+    Servers elsewhere{};       ///< those of all that a route over another interface leads to, as to a VPN's
 };
 
 /// Those of the resolver's file; in place of a resolver on the device (systemd-resolved, dnsmasq), and of the file that

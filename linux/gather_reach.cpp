@@ -56,6 +56,10 @@ NameServerSet serversOf(const Link& link, const LinkSetup& setup) {
 /// Asks the link's name servers. Where none says anything because this device drops what they say, that is the error.
 Known<NameAnswer> askForName(const std::string& name, const Link& link, const LinkSetup& setup,
                              const Until& until) {
+    if (setup.servers.empty() && !setup.serversElsewhere.empty())
+        return failure(Reason::unavailable, "no name server of " + link.interfaceName + " is known: to " +
+                                                setup.serversElsewhere.front().text() +
+                                                " another interface leads");
     auto answer = lookUpName(name, serversOf(link, setup), until.within(kNameTime));
     if (!answer || answer->heard) return answer;
     const auto dropped = droppedByFilter(link, setup.servers, until);

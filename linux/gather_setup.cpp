@@ -52,7 +52,7 @@ Known<NameServers> managedNameServers(Known<Bus>& bus, const Link& link, const N
     const auto elsewhere = networkManagerServersElsewhere(*bus, link.interfaceName, until);
     const AskedServers asked = askedServers(bus, link, managed.servers, until);
     add(names.manual, without(asked.entered, names.offered));
-    names.effective = without(asked.all, elsewhere ? *elsewhere : Servers());
+    names.effective = without(without(asked.all, asked.elsewhere), elsewhere ? *elsewhere : Servers());
     names.offerKnown = managed.offerRead && elsewhere;
     return names;
 }
@@ -94,12 +94,13 @@ LinkSetup setupFromNetworkd(Known<Bus>& bus, const Link& link, const NetworkdLin
     const AskedServers asked = askedServers(bus, link, own, until);
     add(names.manual, without(asked.entered, names.offered));
     names.effective = asked.all;
-    names.offerKnown = asked.ofLinkAlone || !leadsElsewhere(link, until);
+    names.offerKnown = asked.ofLinkAlone || (asked.elsewhere.empty() && !leadsElsewhere(link, until));
     // Where it does not tell, servers of a router's advertisement stand nowhere but in the list that is asked.
     if (!managed.advertisementsKnown && *managed.methods.ipv6 == "auto")
         for (const IPAddress& each : names.effective)
             if (!each.isIPv4()) names.offered.push_back(each);
-    setup.servers = own.empty() ? names.effective : own;
+    setup.servers = own.empty() ? without(asked.all, asked.elsewhere) : own;
+    setup.serversElsewhere = asked.elsewhere;
     setup.nameServers = std::move(names);
     setup.portalApi = managed.portalApi;
     setup.leaseText = failure(Reason::unavailable, "systemd-networkd has no lease of IPv4");
@@ -116,8 +117,9 @@ LinkSetup setupFromConnman(Known<Bus>& bus, const Link& link, const ConnmanLink&
     const AskedServers asked = askedServers(bus, link, managed.servers, until);
     NameServers names{managed.manualServers, {}, managed.offeredServers, true};
     add(names.manual, without(asked.entered, names.offered));
-    names.effective = without(asked.all, managed.serversElsewhere);
+    names.effective = without(without(asked.all, asked.elsewhere), managed.serversElsewhere);
     if (setup.servers.empty()) setup.servers = names.effective;
+    setup.serversElsewhere = asked.elsewhere;
     setup.nameServers = std::move(names);
     setup.leaseText = failure(Reason::unavailable, "ConnMan does not tell its lease");
     return setup;
@@ -142,7 +144,9 @@ LinkSetup setupOfSilentManager(Known<Bus>& bus, const Link& link, const Error& w
     setup.methods = {why, why};
     setup.nameServers = why;
     setup.leaseText = why;
-    setup.servers = askedServers(bus, link, {}, until).all;
+    const AskedServers asked = askedServers(bus, link, {}, until);
+    setup.servers = without(asked.all, asked.elsewhere);
+    setup.serversElsewhere = asked.elsewhere;
     return setup;
 }
 

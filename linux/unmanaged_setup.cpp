@@ -141,12 +141,12 @@ NameServers serversFrom(const Evidence& evidence, const AskedServers& asked) {
     names.routers = evidence.routers;
     if (!evidence.signs) return names;
     // Another interface may have brought along what is not explained here, unless records tell the interfaces apart.
-    if (evidence.signs->elsewhere && !asked.ofLinkAlone && records.elsewhere.empty())
-        names.offerKnown = false;
+    const bool isBrought = evidence.signs->elsewhere || !asked.elsewhere.empty();
+    if (isBrought && !asked.ofLinkAlone && records.elsewhere.empty()) names.offerKnown = false;
     if (names.offerKnown) return names;
     // Nobody offers anything to an interface that was set up by hand; another one may have brought the servers along.
     names.offerKnown = names.advertisementsKnown =
-        !evidence.clients.any && !evidence.signs->elsewhere && allSetByHand(evidence.assigned);
+        !evidence.clients.any && !isBrought && allSetByHand(evidence.assigned);
     return names;
 }
 
@@ -161,7 +161,8 @@ Known<LinkSetup> setupWithoutManager(Known<Bus>& bus, const Link& link, const Un
     setup.methods = methodsFrom(*evidence, link.interfaceName);
     const AskedServers asked = askedServers(bus, link, {}, until);
     NameServers names = serversFrom(*evidence, asked);
-    setup.servers = names.effective.empty() ? asked.all : names.effective;
+    setup.servers = without(names.effective.empty() ? asked.all : names.effective, asked.elsewhere);
+    setup.serversElsewhere = asked.elsewhere;
     if (leases.ipv4 && !leases.ipv4->servers.empty()) setup.servers = leases.ipv4->servers;
     setup.nameServers = std::move(names);
     setup.leaseText = failure(Reason::unavailable,

@@ -20,10 +20,11 @@ struct LinkSetup {
     AddressMethods methods;
     Known<NameServers> nameServers;
     Known<WebProxyPlaces> proxies;
-    std::vector<IPAddress> servers;  ///< whom to ask for names over this interface
-    FamiliesOut leadsOut;            ///< by its default routes; over both where it has none
-    std::string portalApi;           ///< what the lease names; empty where it names none
-    Known<std::string> leaseText;    ///< the vendor's text in the lease, empty where it has none
+    std::vector<IPAddress> servers;             ///< whom to ask for names over this interface
+    std::vector<IPAddress> serversElsewhere{};  ///< whom the device asks over another one
+    FamiliesOut leadsOut;                       ///< by its default routes; over both where it has none
+    std::string portalApi;                      ///< what the lease names; empty where it names none
+    Known<std::string> leaseText;               ///< the vendor's text in the lease, empty where it has none
 };
 
 /// What the router says of itself on the local network.

@@ -245,6 +245,17 @@ TEST(GatherReach, AnEndpointThatIsEmptyIsNotLookedUp) {
     EXPECT_EQ(textOf(evidence), "known");
 }
 
+TEST(GatherReach, ALinkWhoseServersAreAllAnotherInterfacesCannotTell) {
+    LinkSetup setup;
+    setup.serversElsewhere = {*IPAddress::fromText("10.8.0.1")};
+    const std::string reason = "no name server of lo is known: to 10.8.0.1 another interface leads (code 4)";
+    EXPECT_EQ(textOf(gatherNameAnswer(loopback(), setup, {}, patience())), reason);
+    EXPECT_EQ(textOf(gatherPortal(loopback(), setup, {}, patience())), reason);
+    const auto contacts = gatherVendorService(loopback(), setup, {}, patience());
+    ASSERT_TRUE(contacts);
+    EXPECT_EQ(textOf(contacts->reach), reason);
+}
+
 TEST(GatherReach, ALinkWithoutNameServersHasNoAnswer) {
     const auto answer = gatherNameAnswer(loopback(), {}, {}, patience());
     ASSERT_TRUE(answer);
