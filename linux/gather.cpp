@@ -1,6 +1,7 @@
 #include "linux/gather.h"
 
 #include <linux/neighbour.h>
+#include <linux/nl80211.h>
 #include <linux/rtnetlink.h>
 #include <net/if.h>
 #include <sys/ioctl.h>
@@ -44,16 +45,32 @@ bool isUp(const std::string& interfaceName) {
     return ioctl(any.number(), SIOCGIFFLAGS, &request) == 0 && (request.ifr_flags & IFF_UP) != 0;
 }
 
-Known<RadioInterface> chooseInterface(const std::vector<RadioInterface>& stations,
-                                      const std::optional<std::string>& wanted) {
-    if (wanted) {
-        const auto named = std::ranges::find(stations, *wanted, &RadioInterface::name);
-        if (named == stations.end())
-            return failure(Reason::noInterface, "no Wi-Fi interface named " + *wanted);
-        return *named;
+/// The one of that name, else the first; nothing where there is none.
+std::optional<RadioInterface> chooseInterface(const std::vector<RadioInterface>& stations,
+                                              const std::optional<std::string>& wanted) {
+    const auto chosen =
+        wanted ? std::ranges::find(stations, *wanted, &RadioInterface::name) : stations.begin();
+    return chosen == stations.end() ? std::nullopt : std::optional(*chosen);
+}
+
+/// What an interface is that joins no networks.
+const char* wordOf(std::uint32_t type) {
+    switch (type) {
+        case NL80211_IFTYPE_AP:
+        case NL80211_IFTYPE_AP_VLAN:
+            return "an access point";
+        case NL80211_IFTYPE_MONITOR:
+            return "a monitor";
+        case NL80211_IFTYPE_P2P_CLIENT:
+        case NL80211_IFTYPE_P2P_GO:
+            return "a direct link";
+        case NL80211_IFTYPE_MESH_POINT:
+            return "a node of a mesh";
+        case NL80211_IFTYPE_ADHOC:
+            return "part of an ad-hoc network";
+        default:
+            return "of another kind";
     }
-    if (stations.empty()) return failure(Reason::noInterface, "no Wi-Fi interface");
-    return stations.front();
 }
 
 /// Waits until the radio has been at home for so long from now on.
@@ -138,6 +155,16 @@ Known<std::vector<RadioInterface>> gatherStationInterfaces(const Until& until) {
     return stationInterfaces(*radio, until);
 }
 
+Error noStation(const std::vector<RadioInterface>& all, const std::optional<std::string>& wanted) {
+    std::string others;
+    for (const RadioInterface& each : all)
+        if (!each.isStation() && each.name == wanted.value_or(each.name))
+            others += (others.empty() ? "" : ", ") + each.name + " is " + wordOf(each.type);
+    std::string text = "no Wi-Fi interface" + (wanted ? " named " + *wanted : std::string());
+    if (!others.empty()) text += " that joins networks: " + others;
+    return failure(Reason::noInterface, text);
+}
+
 void putInUseFirst(std::vector<RadioInterface>& interfaces,
                    const std::function<Use(const RadioInterface&)>& useOf) {
     std::map<std::uint32_t, Use> uses;
@@ -150,8 +177,11 @@ Known<Link> gatherLink(const std::optional<std::string>& wantedInterface, const 
     if (!radio) return radio.error();
     const Known<std::vector<RadioInterface>> stations = stationInterfaces(*radio, until);
     if (!stations) return stations.error();
-    const Known<RadioInterface> chosen = chooseInterface(*stations, wantedInterface);
-    if (!chosen) return chosen.error();
+    const std::optional<RadioInterface> chosen = chooseInterface(*stations, wantedInterface);
+    if (!chosen) {
+        const Known<std::vector<RadioInterface>> all = radio->interfaces(until);
+        return noStation(all ? *all : std::vector<RadioInterface>(), wantedInterface);
+    }
     Link link{chosen->name, chosen->index, chosen->radio, isUp(chosen->name), std::nullopt};
     if (const auto links = routeDump<ifinfomsg>(RTM_GETLINK, "interfaces", until))
         link.master = readMaster(*links, link.interfaceIndex);

@@ -50,6 +50,8 @@ Known<Airtime> gatherAirtime(const Link& link, HomeChannel::Stay& stay, const Un
 Known<AllowedChannels> gatherAllowedChannels(const Link& link, const Until& until);
 AllowedChannels allowedAmong(const std::vector<RadioChannel>& channels);
 
+/// Why there is no interface, or none of that name, that joins networks: one may be an access point, or listen only.
+Error noStation(const std::vector<RadioInterface>& all, const std::optional<std::string>& wanted);
 /// All station interfaces of this machine, those in use first.
 Known<std::vector<RadioInterface>> gatherStationInterfaces(const Until& until);
 /// What an interface is used for, the most first.

@@ -1,6 +1,7 @@
 #include "linux/gather.h"
 
 #include <gtest/gtest.h>
+#include <linux/nl80211.h>
 #include <net/if.h>
 #include <poll.h>
 #include <stdlib.h>
@@ -546,6 +547,19 @@ TEST(Switch, OfTheInterfacesRadioTellsWhyItIsDown) {
     EXPECT_EQ("lo is down (code 1)", isDown(link).text());
     link.switchedOff = true;
     EXPECT_EQ("lo is down: Wi-Fi is switched off (code 1)", isDown(link).text());
+}
+
+TEST(Interfaces, ThatJoinNoNetworksAreNamedWhereNoneDoes) {
+    const std::vector<RadioInterface> all = {{"wlan0", 3, 0, NL80211_IFTYPE_MONITOR, {}},
+                                             {"wlan1", 4, 0, NL80211_IFTYPE_STATION, {}},
+                                             {"wlan2", 5, 0, NL80211_IFTYPE_AP, {}}};
+
+    EXPECT_EQ("no Wi-Fi interface named eth0 (code 1)", noStation(all, "eth0").text());
+    EXPECT_EQ("no Wi-Fi interface named wlan0 that joins networks: wlan0 is a monitor (code 1)",
+              noStation(all, "wlan0").text());
+    EXPECT_EQ("no Wi-Fi interface that joins networks: wlan0 is a monitor, wlan2 is an access point (code 1)",
+              noStation(all, std::nullopt).text());
+    EXPECT_EQ("no Wi-Fi interface (code 1)", noStation({}, std::nullopt).text());
 }
 
 /// The names in the order of use, of interfaces named after what they are.
