@@ -13,8 +13,8 @@ namespace wp {
 namespace {
 
 constexpr const char* kFile = "/etc/network/interfaces";
-// ifupdown's, busybox's and ifupdown-ng's.
-constexpr const char* kStateFiles[] = {"/run/network/ifstate", "/run/ifstate"};
+// ifupdown's, ifupdown-ng's and busybox's: small images have a folder of its own there.
+constexpr const char* kStateFiles[] = {"/run/network/ifstate", "/run/ifstate", "/var/run/ifstate"};
 
 /// A folder's files count whose names are words; editors and packages leave others there.
 bool isPlainName(const std::string& name) {

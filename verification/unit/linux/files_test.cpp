@@ -26,6 +26,7 @@ class Root : public ::testing::Test {
     const std::string& root_ = folder_.path();
 };
 
+/// A process of a program with arguments, as /proc shows it.
 std::string commandOf(const std::vector<std::string>& words) {
     std::string command;
     for (const std::string& word : words) command += word + '\0';
@@ -361,7 +362,6 @@ TEST_F(Root, KeepsALeaseWhereItsClientPutsIt) {
     EXPECT_FALSE(findLease("wlan0", {}, kSixThirtyPm, root_));
 }
 
-/// A process of a program with arguments, as /proc shows it.
 /// A root where ConnMan, should it run, cannot be asked about its interfaces.
 class DhcpClientsIn : public Root {
   protected:

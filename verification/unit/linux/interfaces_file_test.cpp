@@ -132,6 +132,8 @@ TEST_F(Ifupdown, GoesByTheNameUnderWhichItStartedAnInterface) {
     EXPECT_EQ(plan(), "||") << "it never ran";
     write("/run/network/ifstate", "lo=lo\nwlan01=away\n");
     EXPECT_EQ(plan(), "||") << "it leaves the interface alone";
+    write("/var/run/ifstate", "wlan0=home\n");
+    EXPECT_EQ(plan(), "manual 10.0.0.7 ||") << "as busybox keeps it where /var/run is no link to /run";
     write("/run/ifstate", "lo=lo\nwlan0=away 1\n");
     EXPECT_EQ(plan(), "auto||");
     write("/run/network/ifstate", "lo=lo\nwlan01=away\nwlan0=home\n");
