@@ -58,7 +58,9 @@ std::string scaleOf(const BandPicture& picture) {
             // 14 lies apart from the other channels of 2.4 GHz and is used in one country for 802.11b alone.
             if (channel < 1 || (picture.band == HeardBand::ghz2 && channel > 13)) continue;
             std::string label = std::to_string(channel);
-            const int column = start + at * stretch.columns;
+            // Above the middle, where there is room for that.
+            const int room = std::max(stretch.columns - static_cast<int>(label.size()), 0);
+            const int column = start + at * stretch.columns + room / 2;
             const auto place = static_cast<std::size_t>(column);
             if (place + label.size() <= scale.size()) scale.replace(place, label.size(), label);
         }

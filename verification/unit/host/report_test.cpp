@@ -455,7 +455,7 @@ TEST(ChannelChart, ANetworkIsDrawnOverTheChannelsThatItOccupies) {
 
     EXPECT_EQ(
         channelChart(evidence, Texts("en")),
-        (std::vector<std::string>{"2.4 GHz", "        1  2  3  4  5  6  7  8  9  10 11 12 13",
+        (std::vector<std::string>{"2.4 GHz", "         1  2  3  4  5  6  7  8  9 10 11 12 13",
                                   "                  #############                           -50 *Home",
                                   "   -------------------------                              -70  (hidden)",
                                   "", "5 GHz", "  36  44  52  60  100 108 116 124 132 140 149 157 165 173",
