@@ -275,7 +275,9 @@ Known<PortalEvidence> gatherPortal(const Link& link, const LinkSetup& setup, con
     if (!declared) return declared.error();
     if (plainUrl.empty() && !declared->captive && !declared->unrestricted)
         return notConfigured("the captive portal's probe");
-    if (!declared->captive && !declared->unrestricted) {
+    const bool isTold =
+        declared->captive || declared->unrestricted || (*answers)[0].end == WebAnswer::End::answered;
+    if (!isTold) {
         if (const auto dropped = droppedAnswer(*plain, (*answers)[0], link, until)) return *dropped;
         if (const auto dropped = droppedAnswer(*secure, (*answers)[1], link, until)) return *dropped;
     }
