@@ -132,9 +132,7 @@ Store addresses(const Gathering& g) {
 Store gatewayEcho(const Gathering& g) {
     return overNetwork(g, &Facts::gatewayEcho, [&](const Link& found) {
         Known<Echo> echo = gatherGatewayEcho(found, g.sources.gatewayEcho, *g.stay, g.until);
-        const bool isSilent =
-            echo && std::ranges::none_of(echo->roundTrips, [](auto& each) { return each.has_value(); });
-        if (isSilent && answersAsNeighbour(found, echo->target, g.until))
+        if (echo && !echo->isAnswered() && answersAsNeighbour(found, echo->target, g.until))
             g.sources.notes.once("the router " + echo->target +
                                  " is there, but ignores echo requests (ping)");
         return echo;

@@ -306,9 +306,7 @@ bool answersAsNeighbour(const Link& link, const std::string& address, const Unti
 Known<Echo> askForEcho(const Link& link, const IPAddress& target, EchoSocket& socket, HomeChannel::Stay& stay,
                        const Until& until) {
     Known<Echo> echo = socket.ask(target, link.interfaceName, link.interfaceIndex, stay, until);
-    const bool isSilent =
-        echo && std::ranges::none_of(echo->roundTrips, [](const auto& each) { return each.has_value(); });
-    if (!isSilent) return echo;
+    if (!echo || echo->isAnswered()) return echo;
     const auto dropped = droppedByFilter(link, {target}, until);
     return dropped ? Known<Echo>(*dropped) : echo;
 }

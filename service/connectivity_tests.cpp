@@ -57,9 +57,7 @@ PingStatistics statisticsOf(const Echo& echo) {
 
 Outcome gatewayAnswers(const Facts& facts) {
     if (!facts.gatewayEcho) return facts.gatewayEcho.error();
-    const bool answered =
-        std::ranges::any_of(facts.gatewayEcho->roundTrips, [](auto& time) { return time.has_value(); });
-    return works(answered,
+    return works(facts.gatewayEcho->isAnswered(),
                  {{"PingResult", std::make_shared<PingStatistics>(statisticsOf(*facts.gatewayEcho))}});
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <optional>
 #include <string>
 #include <vector>
@@ -70,6 +71,11 @@ struct Echo {
     std::string target;                             ///< for the log
     std::vector<std::optional<double>> roundTrips;  ///< ms, one for each request; absent: no answer
     double startedAt = 0;                           ///< seconds since 2001-01-01 00:00:00 UTC
+
+    /// Whether any request was answered.
+    bool isAnswered() const {
+        return std::ranges::any_of(roundTrips, [](const auto& each) { return each.has_value(); });
+    }
 };
 
 /// All that the tests of one phase go by. What was not gathered, or could not be, says why.

@@ -46,9 +46,7 @@ Known<std::string> leaseTextOf(const Facts& facts) {
 
 Outcome outsideAnswers(const Facts& facts) {
     if (!facts.outsideEcho) return facts.outsideEcho.error();
-    const bool answered =
-        std::ranges::any_of(facts.outsideEcho->roundTrips, [](const auto& time) { return time.has_value(); });
-    return works(answered,
+    return works(facts.outsideEcho->isAnswered(),
                  {{"PingResult", std::make_shared<PingStatistics>(statisticsOf(*facts.outsideEcho))}});
 }
 

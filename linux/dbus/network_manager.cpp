@@ -1,5 +1,7 @@
 #include "linux/dbus/network_manager.h"
 
+#include <strings.h>
+
 #include <algorithm>
 #include <functional>
 
@@ -16,10 +18,9 @@ const BusObject kSettings{kService, "/org/freedesktop/NetworkManager/Settings"};
 /// Beyond these a store is broken rather than full.
 constexpr std::size_t kMostConnections = 2000;
 
-std::string inUpperCase(std::string text) {
-    for (char& each : text)
-        if (each >= 'a' && each <= 'z') each = static_cast<char>(each - 'a' + 'A');
-    return text;
+/// Whether two texts name one hardware address, in capitals or not.
+bool isSameHardware(const std::string& one, const std::string& other) {
+    return ::strcasecmp(one.c_str(), other.c_str()) == 0;
 }
 
 bool isPath(const std::string& path) {
@@ -100,14 +101,14 @@ void addManual(const BusValue& family, std::vector<IPAddress>& servers) {
     }
 }
 
-/// The radio's own hardware address, in upper case: the one in use may be made up anew each time. Empty where it is not known.
+/// The radio's own hardware address: the one in use may be made up anew each time. Empty where it is not known.
 Known<std::string> permanentAddress(Bus& bus, const std::string& interfaceName, const Until& until) {
     const auto device = deviceOf(bus, interfaceName, until);
     if (!device) return device.error();
     const auto address = bus.property(*device, kService + ".Device.Wireless", "PermHwAddress", until);
     if (!address && address.error().code == static_cast<int>(Reason::notFound)) return std::string();
     if (!address) return address.error();
-    return inUpperCase(address->text());
+    return address->text();
 }
 
 bool allowsOnlyFirstWpa(const BusValue& protocols) {
@@ -229,12 +230,12 @@ bool isBoundElsewhere(const BusValue& settings, const std::string& interfaceName
     MacAddress address{};
     if (wanted.size() == address.size()) {
         std::ranges::copy(wanted, address.begin());
-        if (inUpperCase(textOf(address)) != hardwareAddress) return true;
+        if (!isSameHardware(textOf(address), hardwareAddress)) return true;
     }
     // The second is the name of newer versions, which tell both.
     for (const char* list : {"mac-address-blacklist", "mac-address-denylist"})
         for (const BusValue& each : wireless[list].list())
-            if (inUpperCase(each.text()) == hardwareAddress) return true;
+            if (isSameHardware(each.text(), hardwareAddress)) return true;
     return false;
 }
 

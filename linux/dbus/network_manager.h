@@ -43,7 +43,7 @@ Known<std::vector<IPAddress>> networkManagerServersElsewhere(Bus& bus, const std
 
 /// Whether the settings of a connection bind it to another interface, by name or hardware, or exclude this one: it is never joined
 /// on it.
-/// \param hardwareAddress the interface's permanent one as an upper-case text; empty where it is not known
+/// \param hardwareAddress the interface's permanent one; empty where it is not known
 bool isBoundElsewhere(const BusValue& settings, const std::string& interfaceName,
                       const std::string& hardwareAddress);
 /// All Wi-Fi networks that NetworkManager remembers for the interface, without those that are bound elsewhere. *Any* thread.
